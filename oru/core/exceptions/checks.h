@@ -1,0 +1,42 @@
+// The check macros: a failed check throws InternalException with the checked text.
+#pragma once
+
+#include "oru/core/exceptions/internalexception.h"
+
+#include <string>
+
+// The macros are variadic only so that an expression may hold commas (template arguments). A
+// passing check costs its comparison: what throws is one function, out of line and marked cold.
+
+#if defined(__GNUC__)
+#define ORU_COLD __attribute__((cold, noinline))
+#else
+#define ORU_COLD __declspec(noinline)
+#endif
+
+namespace ORU_private {
+
+/// Throws `ORU::InternalException(file, line, message)`.
+[[noreturn]] ORU_API ORU_COLD void ThrowInternal(char const *file, int line, char const *message);
+
+[[noreturn]] ORU_API ORU_COLD void ThrowInternal(char const *file, int line,
+                                                 std::string const &message);
+
+} // namespace ORU_private
+
+/// Throws `InternalException` with the expression's source text when the expression is false; with
+/// a negated literal (`ORU_ASSERT(!"Unknown target.")`) it marks a branch that nothing reaches.
+#define ORU_ASSERT(...)                                                                            \
+    ((__VA_ARGS__) ? void(0) : ::ORU_private::ThrowInternal(__FILE__, __LINE__, #__VA_ARGS__))
+
+/// As `ORU_ASSERT`, the text prefixed "Enforce ": for demands on the caller.
+#define ORU_ENFORCE(...)                                                                           \
+    ((__VA_ARGS__) ? void(0)                                                                       \
+                   : ::ORU_private::ThrowInternal(__FILE__, __LINE__, "Enforce " #__VA_ARGS__))
+
+/// Throws `InternalException` with the call's source text when its HRESULT is negative.
+#define ORU_ASSERT_SUCCEEDED(...)                                                                  \
+    ((__VA_ARGS__) >= 0 ? void(0) : ::ORU_private::ThrowInternal(__FILE__, __LINE__, #__VA_ARGS__))
+
+/// Throws `InternalException` with a text: a literal, or a string (see `ComposeText`).
+#define ORU_THROW_INTERNAL(text) ::ORU_private::ThrowInternal(__FILE__, __LINE__, text)

@@ -1,0 +1,48 @@
+// The base of every failure the library reports: where it happened and why.
+#pragma once
+
+#include "oru/core/exceptions/exceptionbase.h"
+
+namespace ORU {
+
+/// A failure with its source position and message.
+///
+/// Never thrown itself: it is what a caller catches to receive failed checks, OpenGL errors and
+/// OpenCL errors alike.
+class ORU_API LogicalException : public ExceptionBase {
+public:
+    /// Makes an exception with file and message "Undefined" and line 0.
+    LogicalException();
+
+    /// Makes an exception with what-text "ORU logical exception".
+    /// @param file, message copied; "Undefined" stands in for a null pointer
+    /// @param line one-based source line
+    LogicalException(char const *file, int line, char const *message);
+
+    LogicalException(LogicalException const &) = default;
+    LogicalException &operator=(LogicalException const &) = default;
+    ~LogicalException() override;
+
+    /// Source file of the failure, valid as long as the object lives.
+    char const *file() const { return file_.c_str(); }
+
+    /// Source line of the failure.
+    int line() const { return line_; }
+
+    /// What failed, valid as long as the object lives.
+    char const *message() const { return message_.c_str(); }
+
+    ExceptionBase *clone() const override;
+
+    /// Writes "what file:line (message)".
+    void write(std::ostream &os) const override;
+
+private:
+    void initialize(char const *file, int line, char const *message);
+
+    std::string file_;
+    int line_ = 0;
+    std::string message_;
+};
+
+} // namespace ORU
