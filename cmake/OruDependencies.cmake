@@ -1,0 +1,31 @@
+# Finds the third-party libraries. Cross-building, they stand in the private prefix that tools/setup
+# fills; on a Windows machine its package manager provides them.
+include_guard(GLOBAL)
+
+find_package(TBB CONFIG REQUIRED COMPONENTS tbb)
+find_package(Python3 REQUIRED COMPONENTS Interpreter)
+
+# oru_find_headers(<target> <file>): a header-only package as a target, found by one of its files.
+function(oru_find_headers target file)
+    string(MAKE_C_IDENTIFIER "ORU_${target}_INCLUDE_DIR" variable)
+    find_path(${variable} "${file}" REQUIRED)
+    add_library(${target} INTERFACE IMPORTED GLOBAL)
+    target_include_directories(${target} SYSTEM INTERFACE "${${variable}}")
+endfunction()
+
+oru_find_headers(deps::boost boost/format.hpp)
+oru_find_headers(deps::opencl CL/cl.h)
+
+if(ORU_BUILD_TESTS)
+    find_package(GTest CONFIG REQUIRED)
+endif()
+if(ORU_BUILD_BENCHMARKS)
+    find_package(benchmark CONFIG REQUIRED)
+    oru_find_headers(deps::openclhpp CL/opencl.hpp)
+endif()
+if(ORU_BUILD_APPS)
+    set(ZLIB_USE_STATIC_LIBS ON)
+    find_package(PNG REQUIRED)
+    find_package(JPEG REQUIRED)
+    oru_find_headers(deps::cli11 CLI/CLI.hpp)
+endif()

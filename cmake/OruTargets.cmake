@@ -1,0 +1,57 @@
+# The functions that the CMakeLists.txt of each folder use.
+include_guard(GLOBAL)
+include(GoogleTest)
+
+# oru_add_subdirectories(): adds every folder below the current one that has a CMakeLists.txt.
+function(oru_add_subdirectories)
+    file(GLOB lists CONFIGURE_DEPENDS RELATIVE "${CMAKE_CURRENT_SOURCE_DIR}" */CMakeLists.txt)
+    foreach(list IN LISTS lists)
+        get_filename_component(folder "${list}" DIRECTORY)
+        add_subdirectory("${folder}")
+    endforeach()
+endfunction()
+
+# oru_add_test(<name> SOURCES <file>... [LIBRARIES <target>...] [ENVIRONMENT <VAR=value>...]
+#              [TIMEOUT <seconds>] [INTERNAL])
+# A GoogleTest program, each of its cases a test of CTest, run with ENVIRONMENT and ended after TIMEOUT
+# (60 s unless told). INTERNAL links the library's objects instead of the DLL, to reach what it does not
+# export.
+function(oru_add_test name)
+    cmake_parse_arguments(arg "INTERNAL" "TIMEOUT" "SOURCES;LIBRARIES;ENVIRONMENT" ${ARGN})
+    if(arg_UNPARSED_ARGUMENTS)
+        message(FATAL_ERROR "oru_add_test(${name}): unknown arguments ${arg_UNPARSED_ARGUMENTS}")
+    endif()
+    if(NOT arg_TIMEOUT)
+        set(arg_TIMEOUT 60)
+    endif()
+    add_executable(${name} ${arg_SOURCES})
+    if(arg_INTERNAL)
+        target_link_libraries(${name} PRIVATE oru_static)
+    else()
+        target_link_libraries(${name} PRIVATE oru)
+    endif()
+    target_link_libraries(${name} PRIVATE ${arg_LIBRARIES} GTest::gmock GTest::gtest_main)
+
+    set(properties TIMEOUT ${arg_TIMEOUT})
+    if(arg_ENVIRONMENT)
+        # The list travels through a script that CTest reads: its separators need one more escape.
+        list(JOIN arg_ENVIRONMENT "\\;" environment)
+        list(APPEND properties ENVIRONMENT "${environment}")
+    endif()
+    gtest_discover_tests(${name}
+        DISCOVERY_MODE PRE_TEST
+        DISCOVERY_TIMEOUT 60
+        NO_PRETTY_TYPES NO_PRETTY_VALUES
+        PROPERTIES ${properties})
+endfunction()
+
+# oru_add_benchmark(<name> SOURCES <file>... [LIBRARIES <target>...])
+# A Google Benchmark program; tools/bench runs every one.
+function(oru_add_benchmark name)
+    cmake_parse_arguments(arg "" "" "SOURCES;LIBRARIES" ${ARGN})
+    add_executable(${name} ${arg_SOURCES})
+    target_link_libraries(${name} PRIVATE oru ${arg_LIBRARIES} benchmark::benchmark_main)
+    set_target_properties(${name} PROPERTIES
+        RUNTIME_OUTPUT_DIRECTORY "${CMAKE_RUNTIME_OUTPUT_DIRECTORY}")
+    set_property(GLOBAL APPEND PROPERTY ORU_BENCHMARKS ${name})
+endfunction()
