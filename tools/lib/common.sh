@@ -22,13 +22,13 @@ die() {
 show_help() { sed -n '2,/^[^#]/ { s/^# \{0,1\}//p }' "$0"; }
 
 # logged NAME WHAT COMMAND...: runs a long step with its output in a log; a failure ends the script with
-# what failed, the log's last lines and where the log is.
+# what failed, the log's last lines and where the log is. (Descriptors 8 and 9 are locks of the scripts.)
 logged() {
     local log=$ORU_LOG_DIR/$1.log what=$2
     shift 2
     mkdir -p "$ORU_LOG_DIR"
     say "$what"
-    if ! "$@" >"$log" 2>&1 </dev/null; then
+    if ! "$@" >"$log" 2>&1 </dev/null 8>&- 9>&-; then
         tail -n 15 "$log" >&2
         die "failed: $what (whole log: $log)"
     fi
