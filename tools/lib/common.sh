@@ -9,7 +9,7 @@ case $ORU_BUILD_DIR in
 esac
 export ORU_BUILD_DIR
 ORU_DEPS_DIR=$ORU_ROOT/build/deps
-ORU_LOG_DIR=$ORU_ROOT/build/logs
+ORU_LOG_DIR=$ORU_BUILD_DIR/logs
 
 say() { printf '==> %s\n' "$*"; }
 
@@ -29,24 +29,30 @@ logged() {
     mkdir -p "$ORU_LOG_DIR"
     say "$what"
     if ! "$@" >"$log" 2>&1 </dev/null 8>&- 9>&-; then
-        tail -n 15 "$log" >&2
-        die "failed: $what (whole log: $log)"
+        tail -n 30 "$log" >&2
+        die "failed: $what (whole log: $(shown_path "$log"))"
     fi
 }
 
-# configure [PRESET]: configures the build folder when it is not configured yet. Ninja itself configures
-# anew when a CMake file changed.
+# configure: configures the build folder when it is not configured yet. Later Ninja itself does it when a
+# CMake file changed.
 configure() {
-    [ -f "$ORU_BUILD_DIR/build.ninja" ] && return
-    logged configure "Configuring $(shown_path "$ORU_BUILD_DIR")" \
-        cmake -S "$ORU_ROOT" --preset "${1:-mingw}" -B "$ORU_BUILD_DIR"
+    [ -f "$ORU_BUILD_DIR/build.ninja" ] ||
+        logged configure "Configuring $(shown_path "$ORU_BUILD_DIR")" \
+            cmake -S "$ORU_ROOT" --preset "${ORU_PRESET:-mingw}" -B "$ORU_BUILD_DIR"
 }
 
-# compile [TARGET...]: builds, showing Ninja's output only when it fails.
+# compile [TARGET...]: builds, with Ninja's progress on a terminal and with a log elsewhere.
 compile() {
-    local arguments=()
-    [ $# -eq 0 ] || arguments=(--target "$@")
-    logged build "Building ${*:-everything}" cmake --build "$ORU_BUILD_DIR" "${arguments[@]}"
+    local what="Building ${*:-everything} in $(shown_path "$ORU_BUILD_DIR")"
+    local command=(cmake --build "$ORU_BUILD_DIR")
+    [ $# -eq 0 ] || command+=(--target "$@")
+    if [ -t 1 ]; then
+        say "$what"
+        "${command[@]}" || die "failed: $what"
+    else
+        logged build "$what" "${command[@]}"
+    fi
 }
 
 # shown_path PATH: relative to the repository where it lies inside.
