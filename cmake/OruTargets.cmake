@@ -32,17 +32,18 @@ function(oru_add_test name)
     endif()
     target_link_libraries(${name} PRIVATE ${arg_LIBRARIES} GTest::gmock GTest::gtest_main)
 
-    set(properties TIMEOUT ${arg_TIMEOUT})
-    if(arg_ENVIRONMENT)
-        # The list travels through a script that CTest reads: its separators need one more escape.
-        list(JOIN arg_ENVIRONMENT "\\;" environment)
-        list(APPEND properties ENVIRONMENT "${environment}")
-    endif()
     gtest_discover_tests(${name}
         DISCOVERY_MODE PRE_TEST
         DISCOVERY_TIMEOUT 60
         NO_PRETTY_TYPES NO_PRETTY_VALUES
-        PROPERTIES ${properties})
+        PROPERTIES TIMEOUT ${arg_TIMEOUT})
+    if(arg_ENVIRONMENT)
+        # A property that is a list does not survive gtest_discover_tests: set it once the tests are known.
+        set(script "${CMAKE_CURRENT_BINARY_DIR}/${name}_environment.cmake")
+        file(CONFIGURE OUTPUT "${script}" @ONLY CONTENT
+            "set_tests_properties(\${@name@_TESTS} PROPERTIES ENVIRONMENT [==[@arg_ENVIRONMENT@]==])\n")
+        set_property(DIRECTORY APPEND PROPERTY TEST_INCLUDE_FILES "${script}")
+    endif()
 endfunction()
 
 # oru_add_benchmark(<name> SOURCES <file>... [LIBRARIES <target>...])

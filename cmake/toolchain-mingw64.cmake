@@ -17,8 +17,8 @@ set(CMAKE_FIND_ROOT_PATH_MODE_PACKAGE ONLY)
 
 # The release configuration of this toolchain: no debug data, whose paths would differ from machine to
 # machine, and no assertions of third parties. The library's own checks do not depend on NDEBUG.
-set(CMAKE_CXX_FLAGS_RELEASE_INIT "-O2 -g0 -DNDEBUG")
-set(CMAKE_C_FLAGS_RELEASE_INIT "-O2 -g0 -DNDEBUG")
+set(CMAKE_CXX_FLAGS_RELEASE "-O2 -g0 -DNDEBUG" CACHE STRING "Flags of the release configuration")
+set(CMAKE_C_FLAGS_RELEASE "-O2 -g0 -DNDEBUG" CACHE STRING "Flags of the release configuration")
 
 get_filename_component(ORU_WINE_RUN "${CMAKE_CURRENT_LIST_DIR}/../tools/wine-run" ABSOLUTE)
 set(CMAKE_CROSSCOMPILING_EMULATOR "${ORU_WINE_RUN}")
