@@ -1,0 +1,198 @@
+"""Emits the OpenGL function layer: enumeration, function table, loaders, interceptor operations, error checker."""
+from gl_catalogue import Catalogue
+
+FOLDER = "oru/oru_ogl/extensionator"
+SOURCE = "catalogue/gl_entry_points.tsv and gl_extensions.tsv by emit_gl.py"
+
+# Written by hand in openglerrorchecker.cpp: they keep or read the begin/end state.
+HAND_CHECKED = {"glBegin", "glEnd", "glGetError"}
+
+# Names that the generated bodies use themselves; a parameter of that name would hide them.
+RESERVED_NAMES = {"file", "line", "check", "value_"}
+
+
+def emit(folder, writer):
+    catalogue = Catalogue(folder)
+    for entry in catalogue.entry_points:
+        clash = RESERVED_NAMES.intersection(p.name for p in entry.parameters)
+        if clash:
+            raise ValueError(f"{entry.name}: the parameter name {clash.pop()} is used by the generated code")
+    outputs = {
+        "openglextension.h": enumeration(catalogue),
+        "functiontable.h": function_table(catalogue),
+        "gloperations.inc": operations(catalogue),
+        "extensionmanagerogl_loaders.inc": loader_declarations(catalogue),
+        "extensionmanagerogl_loaders.cpp": loaders(catalogue),
+        "prototypechecks.cpp": prototype_checks(catalogue),
+    }
+    for title, entries in catalogue.chunks():
+        outputs[f"openglerrorchecker_{title}.cpp"] = error_checker(entries)
+    for name, text in outputs.items():
+        writer.write(f"{FOLDER}/{name}", text, SOURCE)
+
+
+def enumeration(catalogue):
+    rows = "\n".join(f"    {x.enumerator} = {x.value}," for x in catalogue.extensions)
+    undefs = "\n".join(f"#undef {x.enumerator}" for x in catalogue.extensions if x.is_version)
+    unknown = len(catalogue.extensions)
+    return f"""#pragma once
+
+// glext.h defines the version enumerators' names as macros. A host that includes it first gets them
+// removed here; the version macros are only glext.h's own include guards and carry no information.
+{undefs}
+
+namespace ORU {{
+namespace OGL {{
+
+/// The capabilities an OpenGL implementation can have: versions, GL extensions, WGL extensions.
+enum OpenGLExtension : unsigned int {{
+{rows}
+    UNKNOWN_OPENGL_EXTENSION = {unknown} ///< the answer for any other name; never stored
+}};
+
+}} // namespace OGL
+}} // namespace ORU
+"""
+
+
+def function_table(catalogue):
+    blocks = []
+    for group, entries in catalogue.groups.items():
+        rows = "\n".join(f"    {e.result} (ORU_APIENTRY *{e.name})({e.declarations}) = nullptr;"
+                         for e in entries)
+        blocks.append(f"    // {group}\n{rows}")
+    return f"""#pragma once
+
+#include "oru/oru_ogl/gltypes.h"
+
+namespace ORU {{
+namespace OGL {{
+
+/// The addresses of one context's OpenGL entry points beyond OpenGL 1.1, in catalogue order.
+///
+/// An entry is null until its group's loader found it (`ExtensionManager::init_...`); test support
+/// (`ExtensionManager::isSupported`) before calling one.
+struct FunctionTable {{
+{chr(10).join(blocks)}
+}};
+
+}} // namespace OGL
+}} // namespace ORU
+"""
+
+
+def operations(catalogue):
+    rows = "\n".join(f"ORU_GL_OPERATION({e.result}, {e.name[2:]}, ({e.full_declarations}), "
+                     f"({e.full_arguments}))" for e in catalogue.entry_points)
+    return f"""// One line per wrapped OpenGL entry point, in slot order. Define
+//     ORU_GL_OPERATION(Result, Name, Parameters, Arguments)
+// and include this file where the expansions belong (it undefines the macro at its end):
+//     #define ORU_GL_OPERATION(Result, Name, Parameters, Arguments) Result cgm##Name Parameters override;
+{rows}
+#undef ORU_GL_OPERATION
+"""
+
+
+def loader_declarations(catalogue):
+    return "\n".join(f"bool init_{x.string}();" for x in catalogue.extensions if not x.is_wgl) + "\n"
+
+
+def loaders(catalogue):
+    names = "\n".join(f'    "{e.name}",' for e in catalogue.extended)
+    bodies, dispatch, position = [], [], {}
+    for index, entry in enumerate(catalogue.extended):
+        position.setdefault(entry.group, index)
+    for extension in catalogue.extensions:
+        if extension.is_wgl:
+            continue
+        entries = catalogue.groups.get(extension.string)
+        body = f"loadGroup({position[extension.string]}, {len(entries)})" if entries else "true"
+        bodies.append(f"bool ExtensionManager::init_{extension.string}() {{ return {body}; }}")
+        dispatch.append(f"    &ExtensionManager::init_{extension.string},")
+    strings = "\n".join(f'    "{x.string}",' for x in catalogue.extensions)
+    return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
+
+#include "oru/oru_ogl/extensionator/catalogueogl.h"
+
+namespace ORU {{
+namespace OGL {{
+
+char const *const kEntryPointNames[{len(catalogue.extended)}] = {{
+{names}
+}};
+
+char const *const kExtensionStrings[{len(catalogue.extensions)}] = {{
+{strings}
+}};
+
+{chr(10).join(bodies)}
+
+ExtensionManager::GroupLoader const ExtensionManager::sGroupLoaders_[{len(dispatch)}] = {{
+{chr(10).join(dispatch)}
+}};
+
+}} // namespace OGL
+}} // namespace ORU
+"""
+
+
+def prototype_checks(catalogue):
+    def upper_type(entry):
+        return f"PFN{entry.name.upper()}PROC"
+
+    core = "\n".join(f"static_assert(std::is_same<decltype(&::{e.name}), "
+                     f"{e.result}(ORU_APIENTRY *)({e.declarations})>::value, \"{e.name}\");"
+                     for e in catalogue.core)
+    undeclared = "GL_APPLE_flush_render"  # declared in no platform header
+    extended = "\n".join(f"static_assert(std::is_same<decltype(FunctionTable::{e.name}), "
+                         f"{upper_type(e)}>::value, \"{e.name}\");"
+                         for e in catalogue.extended if e.group != undeclared)
+    offsets = "\n".join(f"static_assert(offsetof(FunctionTable, {e.name}) == {i} * sizeof(void *), "
+                        f"\"{e.name}\");" for i, e in enumerate(catalogue.extended))
+    return f"""#include "oru/oru_ogl/extensionator/functiontable.h"
+#include "oru/oru_ogl/platformgl.h"
+
+#include <cstddef>
+#include <type_traits>
+
+// The catalogue's prototypes against the platform headers' own, and the table's layout, which the
+// loaders rely on: entry i lies i pointers from the start.
+{core}
+
+namespace ORU {{
+namespace OGL {{
+
+{extended}
+
+static_assert(sizeof(FunctionTable) == {len(catalogue.extended)} * sizeof(void *), "FunctionTable");
+{offsets}
+
+}} // namespace OGL
+}} // namespace ORU
+"""
+
+
+def error_checker(entries):
+    bodies = []
+    for entry in entries:
+        if entry.name in HAND_CHECKED:
+            continue
+        target = f"::{entry.name}" if entry.is_core else f"ExtensionManager::CurrentTable().{entry.name}"
+        call = f"{target}({entry.arguments})"
+        if entry.result == "void":
+            lines = f"    {call};\n    check(file, line);"
+        else:
+            lines = f"    {entry.result} const value_ = {call};\n    check(file, line);\n    return value_;"
+        bodies.append(f"{entry.result} OpenGLErrorChecker::{entry.operation}({entry.full_declarations}) {{\n"
+                      f"{lines}\n}}")
+    return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
+#include "oru/oru_ogl/extensionator/openglerrorcheck.h"
+
+namespace ORU {{
+namespace OGL {{
+
+{chr(10).join(bodies)}
+
+}} // namespace OGL
+}} // namespace ORU
+"""

@@ -1,0 +1,34 @@
+// The exception of a failed OpenGL call.
+#pragma once
+
+#include "oru/core/exceptions/logicalexception.h"
+
+namespace ORU {
+namespace OGL {
+
+/// An OpenGL call failed: `message()` names the GL error, `file()` and `line()` the call.
+class ORU_API ExceptionOGL : public LogicalException {
+public:
+    /// @param file, line source position of the failed call
+    /// @param message the GL error's name
+    /// @param errorNumber the value that `glGetError` gave, 0 for an unbalanced begin or end
+    ExceptionOGL(char const *file, unsigned int line, char const *message,
+                 unsigned int errorNumber);
+    ExceptionOGL(ExceptionOGL const &other);
+    ExceptionOGL(ExceptionOGL &&other);
+    ~ExceptionOGL() override;
+
+    ExceptionOGL &operator=(ExceptionOGL const &other);
+    ExceptionOGL &operator=(ExceptionOGL &&other);
+
+    ExceptionBase *clone() const override;
+
+    /// The OpenGL error enumeration value.
+    unsigned int errorNumber() const { return errorNumber_; }
+
+private:
+    unsigned int errorNumber_;
+};
+
+} // namespace OGL
+} // namespace ORU

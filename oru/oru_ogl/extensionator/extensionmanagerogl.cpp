@@ -1,0 +1,357 @@
+// The capability record of an OpenGL implementation: what is read from it and what it answers.
+#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/versionstring.h"
+#include "oru/oru_ogl/extensionator/catalogueogl.h"
+#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/functioncast.h"
+#include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
+#include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/ogl/context.h"
+#include "oru/oru_ogl/platformgl.h"
+
+#include <algorithm>
+#include <array>
+#include <cstring>
+#include <initializer_list>
+#include <ostream>
+
+namespace ORU {
+namespace OGL {
+
+namespace {
+
+/// A step of the version ladder: an OpenGL version and the capabilities that belong to it.
+struct Rung {
+    unsigned int major;
+    unsigned int minor;
+    OpenGLExtension version;
+    std::initializer_list<OpenGLExtension> extensions;
+};
+
+// Every version holds the ones below it, so a version's rung is where the climb down starts.
+Rung const kLadder[] = {
+    {4,
+     1,
+     GL_VERSION_4_1,
+     {GL_ARB_ES2_COMPATIBILITY, GL_ARB_GET_PROGRAM_BINARY, GL_ARB_SEPARATE_SHADER_OBJECTS,
+      GL_ARB_SHADER_PRECISION, GL_ARB_VERTEX_ATTRIB_64BIT, GL_ARB_VIEWPORT_ARRAY}},
+    {4,
+     0,
+     GL_VERSION_4_0,
+     {GL_ARB_TEXTURE_QUERY_LOD, GL_ARB_DRAW_INDIRECT, GL_ARB_GPU_SHADER5, GL_ARB_GPU_SHADER_FP64,
+      GL_ARB_SHADER_SUBROUTINE, GL_ARB_TESSELLATION_SHADER, GL_ARB_TEXTURE_BUFFER_OBJECT_RGB32,
+      GL_ARB_TEXTURE_CUBE_MAP_ARRAY, GL_ARB_TEXTURE_GATHER, GL_ARB_TRANSFORM_FEEDBACK2,
+      GL_ARB_TRANSFORM_FEEDBACK3}},
+    {3,
+     3,
+     GL_VERSION_3_3,
+     {GL_ARB_BLEND_FUNC_EXTENDED, GL_ARB_SAMPLER_OBJECTS, GL_ARB_EXPLICIT_ATTRIB_LOCATION,
+      GL_ARB_OCCLUSION_QUERY2, GL_ARB_SHADER_BIT_ENCODING, GL_ARB_TEXTURE_RGB10_A2UI,
+      GL_ARB_TEXTURE_SWIZZLE, GL_ARB_TIMER_QUERY, GL_ARB_VERTEX_TYPE_2_10_10_10_REV}},
+    {3,
+     2,
+     GL_VERSION_3_2,
+     {GL_ARB_DRAW_ELEMENTS_BASE_VERTEX, GL_ARB_PROVOKING_VERTEX, GL_ARB_SYNC,
+      GL_ARB_TEXTURE_MULTISAMPLE}},
+    {3, 1, GL_VERSION_3_1, {GL_ARB_COPY_BUFFER, GL_ARB_UNIFORM_BUFFER_OBJECT}},
+    {3,
+     0,
+     GL_VERSION_3_0,
+     {GL_ARB_FRAMEBUFFER_OBJECT, GL_ARB_MAP_BUFFER_RANGE, GL_ARB_VERTEX_ARRAY_OBJECT}},
+    {2, 1, GL_VERSION_2_1, {}},
+    {2, 0, GL_VERSION_2_0, {}},
+    {1, 5, GL_VERSION_1_5, {}},
+    {1, 4, GL_VERSION_1_4, {}},
+    {1, 3, GL_VERSION_1_3, {}},
+    {1, 2, GL_VERSION_1_2, {}},
+};
+
+OpenGLExtension const kFirstWGL = WGL_ARB_CREATE_CONTEXT;
+OpenGLExtension const kLastWGL = WGL_NV_RENDER_TEXTURE_RECTANGLE;
+
+/// The GL capabilities in the order of their strings, for binary search.
+class NameIndex {
+public:
+    NameIndex() {
+        for (std::size_t i = 0; i < order_.size(); ++i)
+            order_[i] = static_cast<OpenGLExtension>(i);
+        std::sort(order_.begin(), order_.end(), [](OpenGLExtension a, OpenGLExtension b) {
+            return std::strcmp(kExtensionStrings[a], kExtensionStrings[b]) < 0;
+        });
+    }
+
+    OpenGLExtension find(char const *name) const {
+        auto const found = std::lower_bound(order_.begin(), order_.end(), name,
+                                            [](OpenGLExtension e, char const *text) {
+                                                return std::strcmp(kExtensionStrings[e], text) < 0;
+                                            });
+        bool const equal = found != order_.end() && !std::strcmp(kExtensionStrings[*found], name);
+        return equal ? *found : UNKNOWN_OPENGL_EXTENSION;
+    }
+
+private:
+    std::array<OpenGLExtension, kFirstWGL> order_;
+};
+
+/// A GL string by the plain call: the interceptor chain needs the record that is being built.
+std::string GLString(GLenum name) {
+    auto const *text = reinterpret_cast<char const *>(::glGetString(name));
+    return text ? text : "";
+}
+
+} // namespace
+
+ExtensionManager::ExtensionManager(HGLRC rc)
+    : tableExt_(MakeShared(ORU_NEW FunctionTable())), initOptions_(CurrentInitOptions()) {
+    if (rc)
+        initialize();
+}
+
+ExtensionManager::ExtensionManager(Context *context)
+    : tableExt_(MakeShared(ORU_NEW FunctionTable())),
+      displayDeviceKey_(context->displayDeviceKey()), initOptions_(CurrentInitOptions()) {
+    context->makeCurrent();
+    initialize();
+}
+
+ExtensionManager::~ExtensionManager() = default;
+
+void ExtensionManager::initialize() {
+    readVendor();
+    readVersions();
+    climbVersionLadder();
+    readExtensions();
+    readWGLExtensions();
+    nonPowerOfTwo_ = isSupported(GL_ARB_TEXTURE_NON_POWER_OF_TWO) ||
+                     (vendor_ != VENDOR_NVIDIA && isSupported(GL_VERSION_2_0));
+}
+
+void ExtensionManager::readVendor() {
+    std::string text = GLString(GL_VENDOR);
+    for (char &c : text)
+        if (c >= 'a' && c <= 'z')
+            c = static_cast<char>(c - 'a' + 'A');
+    auto const names = [&text](char const *maker) { return text.find(maker) != std::string::npos; };
+    if (names("NVIDIA"))
+        vendor_ = VENDOR_NVIDIA;
+    else if (names("INTEL"))
+        vendor_ = VENDOR_INTEL;
+    else if (names("AMD") || names("ATI"))
+        vendor_ = VENDOR_AMD;
+}
+
+void ExtensionManager::readVersions() {
+    std::string const sVersionLong = GLString(GL_VERSION);
+    ORU_ASSERT(!sVersionLong.empty());
+    TokenizeVersionString(sVersionLong, majorVersion_, minorVersion_, releaseVersion_,
+                          additionalVersionInfo_);
+    if (majorVersion_ == 4 && minorVersion_ > 1)
+        minorVersion_ = 1;
+
+    std::string const glsl = GLString(GL_SHADING_LANGUAGE_VERSION);
+    int release;
+    std::string rest;
+    TokenizeVersionString(glsl.empty() ? "0.0" : glsl, glslMajorVersion_, glslMinorVersion_,
+                          release, rest);
+}
+
+void ExtensionManager::climbVersionLadder() {
+    bool reached = false;
+    for (Rung const &rung : kLadder) {
+        reached = reached || (majorVersion_ == rung.major && minorVersion_ == rung.minor);
+        if (!reached || !initializeGL(rung.version))
+            continue;
+        supported_.insert(rung.version);
+        for (OpenGLExtension const e : rung.extensions)
+            initialize(e);
+    }
+}
+
+void ExtensionManager::readExtensions() {
+    TokenizeExtensionString(getExtensionsString(), supportedNames_);
+    for (std::string const &name : supportedNames_) {
+        OpenGLExtension const e = nameToEnumGL(name.c_str());
+        if (e != UNKNOWN_OPENGL_EXTENSION && initializeGL(e))
+            supported_.insert(e);
+    }
+}
+
+void ExtensionManager::readWGLExtensions() {
+    InitializeWGLExtension(WGL_ARB_EXTENSIONS_STRING);
+    if (_wcgmGetExtensionsStringARB) {
+        char const *const text = _wcgmGetExtensionsStringARB(ORU_WGL0(GetCurrentDC));
+        std::vector<std::string> tokens;
+        TokenizeExtensionString(text ? text : "", tokens);
+        for (std::string const &token : tokens)
+            for (unsigned int value = kFirstWGL; value <= kLastWGL; ++value) {
+                auto const e = static_cast<OpenGLExtension>(value);
+                if (token != kExtensionStrings[e] || !InitializeWGLExtension(e))
+                    continue;
+                supported_.insert(e);
+                supportedNames_.push_back(token);
+            }
+    }
+
+    // Looked up again, not taken from the process-wide pointer, which another thread may rewrite.
+    auto const getExtensionsString = internal::FunctionCast<PFNWGLGETEXTENSIONSSTRINGARBPROC>(
+        ORU_WGL(GetProcAddress, "wglGetExtensionsStringARB"));
+    if (!getExtensionsString)
+        return;
+    char const *const text = getExtensionsString(ORU_WGL0(GetCurrentDC));
+    if (text && std::strstr(text, "WGL_ARB_create_context"))
+        createContextAttribs_ = internal::FunctionCast<CreateContextAttribs>(
+            ORU_WGL(GetProcAddress, "wglCreateContextAttribsARB"));
+}
+
+std::string ExtensionManager::getExtensionsString() const {
+    if (majorVersion_ < 3)
+        return GLString(GL_EXTENSIONS);
+    GLint count = 0;
+    ORU_GL(GetIntegerv, GL_NUM_EXTENSIONS, &count);
+    std::string names;
+    for (GLint i = 0; i < count; ++i) {
+        GLubyte const *const text =
+            tableExt_->glGetStringi ? tableExt_->glGetStringi(GL_EXTENSIONS, static_cast<GLuint>(i))
+                                    : nullptr;
+        std::string const anExtensionString = text ? reinterpret_cast<char const *>(text) : "";
+        ORU_ASSERT(!anExtensionString.empty());
+        if (i > 0)
+            names += ' ';
+        names += anExtensionString;
+    }
+    return names;
+}
+
+void ExtensionManager::TokenizeExtensionString(std::string const &text,
+                                               std::vector<std::string> &out) {
+    std::string::size_type end = 0;
+    for (;;) {
+        auto const begin = text.find_first_not_of(' ', end);
+        if (begin == std::string::npos)
+            return;
+        end = std::min(text.find(' ', begin), text.size());
+        out.push_back(text.substr(begin, end - begin));
+    }
+}
+
+bool ExtensionManager::loadGroup(std::size_t first, std::size_t count) {
+    // The table is nothing but pointers in catalogue order, as the prototype checks assert.
+    char *const entries = reinterpret_cast<char *>(tableExt_.get());
+    bool all = true;
+    for (std::size_t i = first; i < first + count; ++i) {
+        PROC const address = ::wglGetProcAddress(kEntryPointNames[i]);
+        std::memcpy(entries + i * sizeof address, &address, sizeof address);
+        all = all && address;
+    }
+    return all;
+}
+
+OpenGLExtension ExtensionManager::nameToEnumGL(char const *name) {
+    static NameIndex const index;
+    return index.find(name);
+}
+
+bool ExtensionManager::initializeGL(OpenGLExtension e) {
+    return e < kFirstWGL && (this->*sGroupLoaders_[e])();
+}
+
+bool ExtensionManager::initialize(OpenGLExtension e) {
+    if (isSupported(e))
+        return true;
+    if (!initializeGL(e) && !InitializeWGLExtension(e))
+        return false;
+    supported_.insert(e);
+    return true;
+}
+
+void ExtensionManager::tryInitializing(OpenGLExtension e, bool required) {
+    if (!initialize(e) && required)
+        ORU_THROW_INTERNAL("Attempted initialization of a required extension failed");
+}
+
+FunctionTable const &ExtensionManager::table() const {
+    ORU_ASSERT(tableExt_.get() != 0);
+    return *tableExt_;
+}
+
+unsigned int ExtensionManager::releaseVersion() const {
+    ORU_ASSERT(releaseVersion_ != -1);
+    return static_cast<unsigned int>(releaseVersion_);
+}
+
+std::string ExtensionManager::vendorString() const {
+    switch (vendor_) {
+    case VENDOR_AMD:
+        return "AMD";
+    case VENDOR_NVIDIA:
+        return "NVIDIA";
+    case VENDOR_INTEL:
+        return "INTEL";
+    default:
+        return "OTHER";
+    }
+}
+
+bool ExtensionManager::supportsClampToEdge() const {
+    return isSupported(GL_VERSION_1_2);
+}
+
+bool ExtensionManager::supportsTexture3D() const {
+    return isSupported(GL_VERSION_1_2) || isSupported(GL_EXT_TEXTURE3D);
+}
+
+bool ExtensionManager::supportsMultiTexture() const {
+    return isSupported(GL_VERSION_1_3) || isSupported(GL_ARB_MULTITEXTURE);
+}
+
+bool ExtensionManager::supportsDrawBuffers() const {
+    return isSupported(GL_VERSION_2_0) || isSupported(GL_ARB_DRAW_BUFFERS);
+}
+
+bool ExtensionManager::supportsFloatingPointTextures() const {
+    return isSupported(GL_ARB_TEXTURE_FLOAT) || isSupported(GL_ATI_TEXTURE_FLOAT) ||
+           isSupported(GL_APPLE_FLOAT_PIXELS);
+}
+
+bool ExtensionManager::supports16BitFloat() const {
+    return isSupported(GL_ARB_HALF_FLOAT_PIXEL) || isSupported(GL_APPLE_FLOAT_PIXELS);
+}
+
+bool ExtensionManager::supportsPixelBuffers() const {
+    return isSupported(WGL_ARB_PIXEL_FORMAT) && isSupported(WGL_ARB_PBUFFER);
+}
+
+bool ExtensionManager::supportsRenderToTexture() const {
+    return isSupported(WGL_ARB_RENDER_TEXTURE);
+}
+
+bool ExtensionManager::supportsRenderToTextureRectangle() const {
+    return isSupported(WGL_NV_RENDER_TEXTURE_RECTANGLE);
+}
+
+unsigned int ExtensionManager::numberOfTextureUnits() const {
+    GLint units = 1;
+    if (isSupported(GL_ARB_FRAGMENT_PROGRAM))
+        ORU_GL(GetIntegerv, GL_MAX_TEXTURE_IMAGE_UNITS, &units);
+    else if (supportsMultiTexture())
+        ORU_GL(GetIntegerv, GL_MAX_TEXTURE_UNITS, &units);
+    return static_cast<unsigned int>(units);
+}
+
+std::ostream &operator<<(std::ostream &os, ExtensionManager const &m) {
+    os << "ExtensionManager for context version " << m.majorVersion() << "." << m.minorVersion()
+       << "\n"
+       << "                        glsl version " << m.glslMajorVersion() << "."
+       << m.glslMinorVersion() << "\n"
+       << "Supported extensions:\n";
+    for (std::string const &name : m.supportedExtensionNames())
+        os << "    " << name << "\n";
+    if (m.supportedExtensionNames().empty())
+        os << "    NONE\n";
+    return os;
+}
+
+} // namespace OGL
+} // namespace ORU

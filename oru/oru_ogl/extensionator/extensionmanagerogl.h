@@ -1,0 +1,281 @@
+// The capability record of an OpenGL implementation, and the registries of records.
+#pragma once
+
+#include "oru/core/utility/export.h"
+#include "oru/core/utility/sharedptr.h"
+#include "oru/core/utility/windowsforward.h"
+#include "oru/oru_ogl/extensionator/functiontable.h"
+#include "oru/oru_ogl/extensionator/openglextension.h"
+#include "oru/oru_ogl/ogl/displaydevicekey.h"
+
+#include <cstddef>
+#include <iosfwd>
+#include <memory>
+#include <set>
+#include <string>
+#include <vector>
+
+namespace ORU {
+namespace OGL {
+
+class Context;
+class OpenGLInterceptorDecorator;
+class WGLInterceptorDecorator;
+
+/// The profile a host asks its contexts to have; recorded and handed back, the layer reads it not.
+enum OpenGLProfile : unsigned int {
+    OPENGLPROFILE_DEFAULT = 0,
+    OPENGLPROFILE_CORE = 1,
+    OPENGLPROFILE_COMPATIBILITY = 2
+};
+
+/// What one OpenGL implementation can do: versions, vendor, extensions, and its function table.
+///
+/// There is one record per display device, read once from a throw-away context of the device, and
+/// one per rendering context that the host made itself, read at its first call through the
+/// interceptor chain. Ask the current context's record before using a feature:
+///
+///     if (ExtensionManager::Instance()->isSupported(GL_ARB_PIXEL_BUFFER_OBJECT)) …
+///
+/// A record does not change once built (but for the two float-filtering answers, which are found
+/// out when first asked), so any thread may read it.
+class ORU_API ExtensionManager {
+public:
+    /// Who made the implementation.
+    enum Vendor : unsigned int { VENDOR_OTHER = 0, VENDOR_AMD, VENDOR_NVIDIA, VENDOR_INTEL };
+
+    /// The options that each new context and record copies; kept for the host, the layer acts on
+    /// none of them.
+    class InitOptions {
+    public:
+        bool throwOnNullContext() const { return throwOnNullContext_; }
+        void setThrowOnNullContext(bool value) { throwOnNullContext_ = value; }
+        bool flushOnMakeCurrentMacOnly() const { return flushOnMakeCurrentMacOnly_; }
+        void setFlushOnMakeCurrentMacOnly(bool value) { flushOnMakeCurrentMacOnly_ = value; }
+        OpenGLProfile openGLProfile() const { return profile_; }
+        void setOpenGLProfile(OpenGLProfile profile) { profile_ = profile; }
+
+    private:
+        bool throwOnNullContext_ = true;
+        bool flushOnMakeCurrentMacOnly_ = true;
+        OpenGLProfile profile_ = OPENGLPROFILE_DEFAULT;
+    };
+
+    /// Replaces the default options for a scope.
+    class ORU_API ScopedInitOptions {
+    public:
+        explicit ScopedInitOptions(InitOptions const &options);
+        ScopedInitOptions(ScopedInitOptions const &) = default;
+        ScopedInitOptions &operator=(ScopedInitOptions const &) = default;
+        /// Puts the options back that the constructor found.
+        ~ScopedInitOptions();
+
+    private:
+        InitOptions previous_;
+    };
+
+    ~ExtensionManager();
+    ExtensionManager(ExtensionManager const &) = delete;
+    ExtensionManager &operator=(ExtensionManager const &) = delete;
+
+    /// @name Records of rendering contexts
+    /// @{
+
+    /// The record of the calling thread's current context.
+    /// @return null when there is none and the library is initialized
+    /// @throws InternalException when there is none and the library is not initialized
+    static ExtensionManager *Instance();
+
+    /// The record of a rendering context; results and failures as above.
+    static ExtensionManager *Instance(HGLRC const &rc);
+
+    /// The record of a rendering context, made when it has none.
+    /// @param rc the calling thread's current context
+    static ExtensionManager *InstanceGuaranteed(HGLRC const &rc);
+
+    /// The function table of the calling thread's current context, whose record is made when it has
+    /// none (a context that the host created itself).
+    /// @throws InternalException when there is no record and the library is not initialized, or
+    ///         when the context does not even tell its version
+    static FunctionTable const &CurrentTable();
+
+    /// The same for a context that the caller knows to be current.
+    static FunctionTable const &CurrentTable(HGLRC const &rc);
+
+    /// Maps a context of the library to its device's record, building the record when it is the
+    /// device's first. A context that is mapped already stays so.
+    static void RegisterContext(Context const &context);
+
+    /// @throws InternalException when the context is not registered
+    static void UnRegisterContext(Context const &context);
+    /// @}
+
+    /// @name Records of display devices
+    /// @{
+
+    /// The record of a display device, built when it does not exist yet.
+    static ExtensionManager *Instance(DisplayDeviceKey const &key);
+
+    /// The record of a context's display device, built when it does not exist yet.
+    /// @return for a null context null
+    /// @throws InternalException for a null context while the library is not initialized
+    static ExtensionManager *Instance(Context const *context);
+
+    /// Forgets all contexts and destroys the records of all display devices.
+    static void Terminate();
+    /// @}
+
+    /// @name Options
+    /// @{
+
+    /// The options that new contexts and records copy.
+    static InitOptions const &CurrentInitOptions();
+    static void SetInitOptions(InitOptions const &options);
+
+    /// The options this record copied when it was made.
+    InitOptions const &initOptions() const { return initOptions_; }
+    /// @}
+
+    /// @name Interceptors
+    /// The same as the chain's own operations, after making sure that the chain exists.
+    /// @{
+    void addInterceptor(OpenGLInterceptorDecorator *decorator);
+    OpenGLInterceptorDecorator *popInterceptor();
+    void addWGLInterceptor(WGLInterceptorDecorator *decorator);
+    WGLInterceptorDecorator *popWGLInterceptor();
+    /// @}
+
+    /// @name What the implementation says of itself
+    /// @{
+
+    /// The OpenGL version. Every 4.x above 4.1 is recorded as 4.1, the highest wrapped here.
+    unsigned int majorVersion() const { return majorVersion_; }
+    unsigned int minorVersion() const { return minorVersion_; }
+
+    /// The version text's third number.
+    /// @throws InternalException when it has none
+    unsigned int releaseVersion() const;
+    bool hasReleaseVersion() const { return releaseVersion_ != -1; }
+
+    /// What follows the numbers in the version text.
+    std::string additionalVersionInfo() const { return additionalVersionInfo_; }
+
+    /// The shading-language version, 0.0 when the implementation has none.
+    unsigned int glslMajorVersion() const { return glslMajorVersion_; }
+    unsigned int glslMinorVersion() const { return glslMinorVersion_; }
+
+    Vendor vendor() const { return vendor_; }
+    /// "AMD", "NVIDIA", "INTEL" or "OTHER".
+    std::string vendorString() const;
+    /// @}
+
+    /// The device the record describes; empty in the record of a context that the host made.
+    DisplayDeviceKey const &displayDeviceKey() const { return displayDeviceKey_; }
+
+    /// @name Extensions and entry points
+    /// @{
+
+    /// Whether a capability is there with all its entry points.
+    bool isSupported(OpenGLExtension e) const { return supported_.count(e) != 0; }
+    std::set<OpenGLExtension> const &supportedExtensions() const { return supported_; }
+
+    /// Every GL extension that the implementation names, known here or not, then the WGL extensions
+    /// that were recognised and loaded.
+    std::vector<std::string> const &supportedExtensionNames() const { return supportedNames_; }
+
+    /// The capability of an exact GL extension string (not of a WGL one), or
+    /// UNKNOWN_OPENGL_EXTENSION.
+    OpenGLExtension nameToEnumGL(char const *name);
+
+    /// Loads a GL capability's entry points from the current context.
+    /// @return whether all were found; true for a GL capability without any, false for a WGL one
+    bool initializeGL(OpenGLExtension e);
+
+    /// Adds a GL or WGL capability to the supported ones when its entry points can be loaded.
+    bool initialize(OpenGLExtension e);
+
+    /// The entry points.
+    /// @throws InternalException when the record has no table
+    FunctionTable const &table() const;
+
+    // One loader per GL capability: asks for each entry point of its group with wglGetProcAddress,
+    // stores every answer and tells whether all were found.
+#include "oru/oru_ogl/extensionator/extensionmanagerogl_loaders.inc"
+    /// @}
+
+    /// @name Capability shortcuts
+    /// @{
+    bool supportsClampToEdge() const;
+    bool supportsTexture3D() const;
+    bool supportsMultiTexture() const;
+    bool supportsDrawBuffers() const;
+    bool supportsFloatingPointTextures() const;
+    bool supports16BitFloat() const;
+    bool supportsPixelBuffers() const;
+    bool supportsRenderToTexture() const;
+    bool supportsRenderToTextureRectangle() const;
+
+    /// Whether textures of any size work. On one vendor's implementations the version does not
+    /// promise that they work well, so there the extension must be named.
+    bool supportsNonPowerOfTwoTextures() const {
+        return nonPowerOfTwo_;
+    }
+
+    /// Number of texture image units of the current context, 1 without multitexturing.
+    /// @note glGetIntegerv through the chain
+    unsigned int numberOfTextureUnits() const;
+    /// @}
+
+private:
+    friend class Context;
+
+    using CreateContextAttribs = HGLRC(ORU_APIENTRY *)(HDC, HGLRC, int const *);
+    using GroupLoader = bool (ExtensionManager::*)();
+
+    explicit ExtensionManager(HGLRC rc);
+    explicit ExtensionManager(Context *context);
+
+    static ExtensionManager *Find(DisplayDeviceKey const &key);
+    static ExtensionManager *Create(DisplayDeviceKey const &key);
+    static ExtensionManager *Create(HGLRC rc);
+    static ExtensionManager *NullExtensionManager();
+
+    void initialize();
+    void readVendor();
+    void readVersions();
+    void climbVersionLadder();
+    void readExtensions();
+    void readWGLExtensions();
+    void tryInitializing(OpenGLExtension e, bool required);
+    bool loadGroup(std::size_t first, std::size_t count);
+    std::string getExtensionsString() const;
+    static void TokenizeExtensionString(std::string const &text, std::vector<std::string> &out);
+    CreateContextAttribs getWglCreateContextAttribsPtr() const {
+        return createContextAttribs_;
+    }
+
+    static GroupLoader const sGroupLoaders_[];
+    static InitOptions sInitOptions_;
+    static ExtensionManager *sCachedNullExtMgrInstance_;
+
+    CreateContextAttribs createContextAttribs_ = nullptr;
+    std::set<OpenGLExtension> supported_;
+    unsigned int majorVersion_ = 0;
+    unsigned int minorVersion_ = 0;
+    int releaseVersion_ = -1;
+    std::string additionalVersionInfo_;
+    Vendor vendor_ = VENDOR_OTHER;
+    bool nonPowerOfTwo_ = false;
+    std::shared_ptr<FunctionTable> tableExt_;
+    DisplayDeviceKey displayDeviceKey_;
+    std::vector<std::string> supportedNames_;
+    InitOptions initOptions_;
+    unsigned int glslMajorVersion_ = 0;
+    unsigned int glslMinorVersion_ = 0;
+};
+
+/// Prints the versions and the names of the supported extensions, one a line.
+ORU_API std::ostream &operator<<(std::ostream &os, ExtensionManager const &m);
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,23 @@
+// The error query after each OpenGL call, inlined into the generated operations.
+#pragma once
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/oru_ogl/extensionator/openglerrorchecker.h"
+#include "oru/oru_ogl/platformgl.h"
+
+namespace ORU {
+namespace OGL {
+
+/// Throws the ExceptionOGL of a GL error value.
+[[noreturn]] ORU_COLD void ThrowOpenGLError(char const *file, unsigned int line,
+                                            unsigned int error);
+
+inline void OpenGLErrorChecker::check(char const *file, unsigned int line) const {
+    if (insideBeginEnd_.load(std::memory_order_relaxed))
+        return;
+    if (GLenum const error = ::glGetError())
+        ThrowOpenGLError(file, line, error);
+}
+
+} // namespace OGL
+} // namespace ORU

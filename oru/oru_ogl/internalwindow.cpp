@@ -1,0 +1,68 @@
+// A hidden window that lends its device context to contexts that draw into no window.
+#include "oru/oru_ogl/internalwindow.h"
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/oru_ogl/platformgl.h"
+
+#include <boost/format.hpp>
+
+namespace ORU {
+namespace OGL {
+
+namespace {
+
+DWORD const kStyle = WS_OVERLAPPEDWINDOW;
+DWORD const kExtendedStyle = WS_EX_APPWINDOW | WS_EX_WINDOWEDGE;
+
+} // namespace
+
+InternalWindow::InternalWindow(short x, short y) : window_(nullptr) {
+    std::string const name = className();
+
+    WNDCLASSEXA windowClass = {};
+    windowClass.cbSize = sizeof windowClass;
+    windowClass.style = CS_CLASSDC;
+    windowClass.lpfnWndProc = ::DefWindowProcW;
+    windowClass.hInstance = ::GetModuleHandleW(nullptr);
+    windowClass.hCursor = ::LoadCursorW(nullptr, reinterpret_cast<LPCWSTR>(IDC_ARROW));
+    windowClass.lpszClassName = name.c_str();
+    if (!::RegisterClassExA(&windowClass))
+        ORU_THROW_INTERNAL("Unable to register window class");
+
+    RECT frame = {0, 0, 8, 8};
+    ::AdjustWindowRectEx(&frame, kStyle, FALSE, kExtendedStyle);
+    window_ = ::CreateWindowExA(kExtendedStyle, name.c_str(), nullptr,
+                                kStyle | WS_CLIPSIBLINGS | WS_CLIPCHILDREN, x, y,
+                                frame.right - frame.left, frame.bottom - frame.top, nullptr,
+                                nullptr, windowClass.hInstance, nullptr);
+    if (!window_) {
+        ::UnregisterClassA(name.c_str(), windowClass.hInstance);
+        ORU_THROW_INTERNAL("Unable to create window");
+    }
+}
+
+InternalWindow::~InternalWindow() {
+    try {
+        destroy();
+    } catch (...) {
+        // A destructor has nobody to report to.
+    }
+}
+
+void InternalWindow::destroy() {
+    HDC const hDC = ::GetDC(window_);
+    ORU_ASSERT(hDC != 0);
+    if (!::ReleaseDC(window_, hDC))
+        ORU_THROW_INTERNAL("Unable to release the device context");
+    ::DestroyWindow(window_);
+    if (!::UnregisterClassA(className().c_str(), ::GetModuleHandleW(nullptr)))
+        ORU_THROW_INTERNAL("Unable to unregister window class");
+}
+
+/// Unique among the live windows, as it carries the object's own address.
+std::string InternalWindow::className() const {
+    return (boost::format("OpenGL%p") % static_cast<void const *>(this)).str();
+}
+
+} // namespace OGL
+} // namespace ORU

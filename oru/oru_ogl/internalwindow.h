@@ -1,0 +1,35 @@
+// A hidden window that lends its device context to contexts that draw into no window.
+#pragma once
+
+#include "oru/core/utility/windowsforward.h"
+
+#include <string>
+
+namespace ORU {
+namespace OGL {
+
+/// An 8 by 8 window of its own class, never shown. Windows demands that the thread that made it
+/// destroys it.
+class InternalWindow {
+public:
+    /// @param x, y desktop position, which decides on which display the window lies
+    /// @throws InternalException when the class or the window cannot be made
+    InternalWindow(short x, short y);
+
+    /// Destroys the window and its class; a failure is dropped.
+    ~InternalWindow();
+
+    InternalWindow(InternalWindow const &) = delete;
+    InternalWindow &operator=(InternalWindow const &) = delete;
+
+    HWND hWnd() const { return window_; }
+
+private:
+    std::string className() const;
+    void destroy();
+
+    HWND window_;
+};
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,173 @@
+// The base of every OpenGL rendering context, and the display devices contexts live on.
+#pragma once
+
+#include "oru/core/math/tvec2.h"
+#include "oru/core/utility/export.h"
+#include "oru/core/utility/windowsforward.h"
+#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
+#include "oru/oru_ogl/ogl/bufferformat.h"
+#include "oru/oru_ogl/ogl/displaydevicekey.h"
+
+#include <cstddef>
+#include <string>
+
+namespace ORU {
+namespace OGL {
+
+/// An OpenGL rendering context on a device context of one display device.
+///
+/// Hosts make one of the derived kinds: ContextWindowed, ContextOffscreen, ContextWrapped. Making
+/// one leaves the thread's current context as it was; call `makeCurrent()` to use it. A context is
+/// used on one thread at a time.
+class ORU_API Context {
+public:
+    enum Buffering { BUFFERING_SINGLE = 0, BUFFERING_DOUBLE = 1 };
+
+    /// Samples per pixel; any value above 1 asks for a multisampled pixel format.
+    enum Multisampling { MULTISAMPLING_NONE = 1 };
+
+    /// What a pixel format must be able to draw to.
+    enum Windowing {
+        WINDOWING_PBUFFER = 0, ///< a pbuffer and not a window
+        WINDOWING_WINDOW = 1
+    };
+
+    /// Releases nothing: the derived kinds release what they made.
+    virtual ~Context();
+
+    Context(Context const &) = delete;
+    Context &operator=(Context const &) = delete;
+
+    /// Makes this context current on the calling thread.
+    /// @throws InternalException when the system refuses (it is current on another thread, say)
+    /// @note wglMakeCurrent
+    virtual void makeCurrent() const;
+
+    /// The calling thread's current rendering context, or null.
+    static HGLRC CurrentContext();
+
+    HGLRC renderContext() const { return renderContext_; }
+    HDC deviceContext() const { return deviceContext_; }
+
+    /// The display device the context lives on; empty for one made from a bare handle.
+    DisplayDeviceKey const &displayDeviceKey() const { return displayDeviceKey_; }
+
+    /// Shows the back buffer of a double-buffered window. @note SwapBuffers
+    void swapBuffers();
+
+    /// The bits per channel of the pixel format that was really chosen.
+    /// @note GetPixelFormat, DescribePixelFormat
+    void getBitDepths(int *red, int *green, int *blue, int *alpha, int *stencil, int *depth) const;
+
+    /// Whether objects of this context can be used in the calling thread's current context.
+    /// @return false also when no context is current
+    /// @throws InternalException when this context or the current one is in no share group
+    bool isSharingWithCurrentContext() const;
+
+    /// The profile of the options that were in force when the context was made.
+    OpenGLProfile openGLProfile() const { return initOptions_.openGLProfile(); }
+
+    /// Whether the current context can wait for the vertical retrace (WGL_EXT_swap_control).
+    static bool SupportsVerticalRetraceControl();
+
+    /// @name Display devices
+    /// May be called without a current context; each call asks the system anew.
+    /// @{
+
+    /// Number of adapters with an output on the desktop; 0 also on any failure.
+    static std::size_t NumDisplayDevice();
+
+    /// The key of an adapter and its first output on the desktop.
+    /// @param index the system's adapter index, which also counts adapters without outputs
+    /// @param key set on success only
+    /// @return false when there is no such adapter, it has no such output, or anything failed
+    static bool DisplayDevice(std::size_t index, DisplayDeviceKey &key);
+    /// @}
+
+protected:
+    /// For an adopted context; the device is not known.
+    explicit Context(HGLRC renderContext);
+    /// For a context to be made on a device.
+    explicit Context(DisplayDeviceKey const &key);
+
+    /// Sets a pixel format on a device context and makes this object's rendering context on it.
+    /// The thread's current context is restored at the end. Floating-point, multisampled and
+    /// deeper than 8-bit formats need WGL_ARB_pixel_format.
+    /// @param share context to share objects with, or null
+    /// @throws LogicalException when no context can be made; nothing is left behind
+    void initialize(HDC dc, BufferFormat const &format, Buffering buffering,
+                    Multisampling multisampling, Context const *share);
+
+    /// A pixel format by GDI. @throws InternalException when there is none
+    static int ChoosePixelFormat(HDC dc, BufferFormat const &format, bool doubleBuffered);
+
+    /// A pixel format by wglChoosePixelFormatARB, for which a context must be current.
+    /// @throws InternalException without that function or a suitable format
+    static int ChoosePixelFormat(HDC dc, BufferFormat const &format, Buffering buffering,
+                                 Multisampling multisampling, Windowing windowing);
+
+    void setPixelFormat(HDC dc, int pixelFormat);
+    HGLRC setupRenderingContext(HDC dc, BufferFormat const &format, bool doubleBuffered,
+                                Context const *share);
+
+    /// A rendering context that shares with `share`; of version 3.0 or later where attributes can
+    /// be asked for.
+    HGLRC createRenderingContext(HDC dc, Context const *share);
+
+    /// Shares this context's objects with another rendering context, from which they come.
+    void shareLists(HGLRC other);
+
+    /// Registers the new context and puts it into `share`'s group (or one of its own); destroys
+    /// the rendering context when that fails.
+    void publish(Context const *share);
+
+    /// Deletes the rendering context; another context that was current is current again.
+    void destroyContext();
+
+    void registerWithExtensionMgr();
+    void unregisterWithExtensionMgr();
+    ExtensionManager::InitOptions const &initOptions() const { return initOptions_; }
+
+    /// @name Share groups
+    /// Contexts of one group share all objects. The groups are process-wide and not locked.
+    /// @{
+
+    /// Joins a sibling's group, or makes a new one when it is null.
+    void addShareContext(Context const *sibling) const;
+    void registerSharedContext(Context const *sibling);
+    void unregisterSharedContext();
+
+    /// Finds the group of an adopted context by trying whether display lists are shared.
+    static void RegisterContextWrapped(Context const *context);
+    static void UnregisterShareContext(Context const *context);
+    /// @}
+
+    /// The key of the output that shows a window, and of its adapter.
+    static DisplayDeviceKey DisplayDeviceFromWindow(HWND const &window);
+
+    /// The key of the output at the desktop's origin, found out once.
+    static DisplayDeviceKey const &PrimaryDisplayDevice();
+
+    /// The desktop position of the first output of the adapter with this description.
+    /// @param defaultToZeroOnFailure whether a failing system call gives (0, 0) rather than throws
+    /// @throws InternalException when there is no such adapter, in any case
+    static ambra::lumo::TVec2<int> DisplayOrigin(std::string const &adapterName,
+                                                 bool defaultToZeroOnFailure);
+
+private:
+    static void SetThrowTestException(bool value) { sThrowTestException_ = value; }
+    static bool sThrowTestException_;
+
+    DisplayDeviceKey displayDeviceKey_;
+    ExtensionManager::InitOptions initOptions_;
+
+protected:
+    HDC deviceContext_ = nullptr;
+    HGLRC renderContext_ = nullptr; ///< the context is live while this is not null
+    int pixelFormat_ = 0;           ///< index set on the device context, 0 until then
+
+    void setDisplayDeviceKey(DisplayDeviceKey const &key) { displayDeviceKey_ = key; }
+};
+
+} // namespace OGL
+} // namespace ORU

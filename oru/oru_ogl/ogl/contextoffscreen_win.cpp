@@ -1,0 +1,45 @@
+// A context for drawing into OpenGL objects only.
+#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/oru_ogl/internalwindow.h"
+#include "oru/oru_ogl/ogl/internal/dropexceptions.h"
+#include "oru/oru_ogl/platformgl.h"
+
+namespace ORU {
+namespace OGL {
+
+namespace {
+
+DisplayDeviceKey const &KeyOf(Context const *pContext) {
+    ORU_ASSERT(pContext != NULL);
+    return pContext->displayDeviceKey();
+}
+
+} // namespace
+
+ContextOffscreen::ContextOffscreen(DisplayDeviceKey const &key) : Context(key) {
+    create(nullptr);
+}
+
+ContextOffscreen::ContextOffscreen(Context const *pContext) : Context(KeyOf(pContext)) {
+    create(pContext);
+}
+
+void ContextOffscreen::create(Context const *share) {
+    auto const origin = DisplayOrigin(displayDeviceKey().adapterName, true);
+    window_ = MakeScoped(
+        ORU_NEW InternalWindow(static_cast<short>(origin.x), static_cast<short>(origin.y)));
+    initialize(::GetDC(window_->hWnd()), BufferFormat(8, 8, 8, 0, 0, 0, false), BUFFERING_SINGLE,
+               MULTISAMPLING_NONE, share);
+    publish(share);
+}
+
+ContextOffscreen::~ContextOffscreen() {
+    internal::DropExceptions([this] { unregisterSharedContext(); });
+    internal::DropExceptions([this] { unregisterWithExtensionMgr(); });
+    internal::DropExceptions([this] { destroyContext(); });
+}
+
+} // namespace OGL
+} // namespace ORU

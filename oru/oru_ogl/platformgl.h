@@ -1,0 +1,18 @@
+// The platform's OpenGL and WGL headers, for sources that call it or need its constants.
+#pragma once
+
+#ifndef WIN32_LEAN_AND_MEAN
+#define WIN32_LEAN_AND_MEAN
+#endif
+#ifndef NOMINMAX
+#define NOMINMAX
+#endif
+#include <windows.h>
+
+#include <GL/gl.h>
+
+#include <GL/glext.h>
+#include <GL/wglext.h>
+
+// Brings the capability enumeration and removes the macros of glext.h that carry its names.
+#include "oru/oru_ogl/extensionator/openglextension.h"
