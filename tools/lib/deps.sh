@@ -91,8 +91,8 @@ cross_build() { # NAME SOURCE CMAKE_ARGUMENT...
         "-DCMAKE_TOOLCHAIN_FILE=$ORU_ROOT/cmake/toolchain-mingw64.cmake" \
         -DCMAKE_BUILD_TYPE=Release -DBUILD_SHARED_LIBS=OFF \
         "-DCMAKE_INSTALL_PREFIX=$ORU_DEPS_DIR" -DCMAKE_INSTALL_LIBDIR:STRING=lib \
-        "-DCMAKE_CXX_FLAGS=-ffile-prefix-map=$source/=$name/" \
-        "-DCMAKE_C_FLAGS=-ffile-prefix-map=$source/=$name/" \
+        "-DCMAKE_CXX_FLAGS=\"-ffile-prefix-map=$source/=$name/\"" \
+        "-DCMAKE_C_FLAGS=\"-ffile-prefix-map=$source/=$name/\"" \
         "$@" || return 1
     cmake --build "$build" || return 1
     cmake --install "$build" || return 1
