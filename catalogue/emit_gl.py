@@ -19,6 +19,7 @@ def emit(folder, writer):
             raise ValueError(f"{entry.name}: the parameter name {clash.pop()} is used by the generated code")
     outputs = {
         "openglextension.h": enumeration(catalogue),
+        "openglextension_undef.inc": undefinitions(catalogue),
         "functiontable.h": function_table(catalogue),
         "gloperations.inc": operations(catalogue),
         "extensionmanagerogl_loaders.inc": loader_declarations(catalogue),
@@ -31,15 +32,20 @@ def emit(folder, writer):
         writer.write(f"{FOLDER}/{name}", text, SOURCE)
 
 
+def undefinitions(catalogue):
+    undefs = "\n".join(f"#undef {x.enumerator}" for x in catalogue.extensions if x.is_version)
+    return f"""// glext.h defines the names of the version enumerators as macros, which are its own include guards
+// and carry no information. Include this after glext.h wherever the enumerators are used.
+{undefs}
+"""
+
+
 def enumeration(catalogue):
     rows = "\n".join(f"    {x.enumerator} = {x.value}," for x in catalogue.extensions)
-    undefs = "\n".join(f"#undef {x.enumerator}" for x in catalogue.extensions if x.is_version)
     unknown = len(catalogue.extensions)
     return f"""#pragma once
 
-// glext.h defines the version enumerators' names as macros. A host that includes it first gets them
-// removed here; the version macros are only glext.h's own include guards and carry no information.
-{undefs}
+#include "oru/oru_ogl/extensionator/openglextension_undef.inc"
 
 namespace ORU {{
 namespace OGL {{

@@ -14,5 +14,4 @@
 #include <GL/glext.h>
 #include <GL/wglext.h>
 
-// Brings the capability enumeration and removes the macros of glext.h that carry its names.
-#include "oru/oru_ogl/extensionator/openglextension.h"
+#include "oru/oru_ogl/extensionator/openglextension_undef.inc"

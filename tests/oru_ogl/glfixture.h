@@ -1,0 +1,86 @@
+// What tests on a real context share: the fixture, a decorator that counts calls, name bookkeeping.
+#pragma once
+
+#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/openglforwarder.h"
+#include "oru/oru_ogl/libraryogl.h"
+#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+#include "oru/oru_ogl/platformgl.h"
+
+#include <gtest/gtest.h>
+
+#include <map>
+#include <memory>
+#include <string>
+
+namespace oru_test {
+
+/// Counts the calls of every operation by name, and forwards them.
+class CountingForwarder : public ORU::OGL::OpenGLInterceptorDecorator {
+public:
+    /// Calls of one entry point, named without its `gl`.
+    int count(std::string const &name) const {
+        auto const found = counts_.find(name);
+        return found == counts_.end() ? 0 : found->second;
+    }
+
+    int total() const {
+        int sum = 0;
+        for (auto const &entry : counts_)
+            sum += entry.second;
+        return sum;
+    }
+
+    void reset() { counts_.clear(); }
+
+#define ORU_GL_OPERATION(Result, Name, Parameters, Arguments)                                      \
+    Result cgm##Name Parameters override {                                                         \
+        ++counts_[#Name];                                                                          \
+        return interceptor()->cgm##Name Arguments;                                                 \
+    }
+#include "oru/oru_ogl/extensionator/gloperations.inc"
+
+private:
+    std::map<std::string, int> counts_;
+};
+
+/// Pushes a decorator for a scope.
+template<class Decorator>
+class Pushed {
+public:
+    Pushed() { ORU::OGL::OpenGLInterceptor::Instance()->addInterceptor(&decorator_); }
+    ~Pushed() { ORU::OGL::OpenGLInterceptor::Instance()->popInterceptor(); }
+    Pushed(Pushed const &) = delete;
+    Pushed &operator=(Pushed const &) = delete;
+
+    Decorator *operator->() { return &decorator_; }
+    Decorator &operator*() { return decorator_; }
+
+private:
+    Decorator decorator_;
+};
+
+/// Every test runs in an open library with an offscreen context current, and must leave no GL error
+/// behind.
+class OffscreenTest : public ::testing::Test {
+protected:
+    void SetUp() override {
+        context_ = std::make_unique<ORU::OGL::ContextOffscreen>();
+        context_->makeCurrent();
+    }
+
+    void TearDown() override {
+        if (ORU::OGL::Context::CurrentContext()) {
+            EXPECT_EQ(static_cast<GLenum>(GL_NO_ERROR), ::glGetError());
+        }
+        context_.reset();
+    }
+
+    ORU::OGL::ContextOffscreen &context() { return *context_; }
+
+private:
+    ORU::OGL::AutoInitializer library_;
+    std::unique_ptr<ORU::OGL::ContextOffscreen> context_;
+};
+
+} // namespace oru_test
