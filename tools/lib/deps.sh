@@ -2,7 +2,7 @@
 # shellcheck shell=bash
 
 ORU_PACKAGES=(
-    ca-certificates cmake dpkg-dev ninja-build ccache python3 xz-utils
+    ca-certificates git cmake dpkg-dev ninja-build ccache python3 xz-utils
     g++-mingw-w64-x86-64-posix libz-mingw-w64-dev nasm
     clang clang-format clang-tidy
     libboost-dev libcli11-dev opencl-headers opencl-clhpp-headers googletest
