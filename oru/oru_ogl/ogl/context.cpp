@@ -131,12 +131,13 @@ bool Context::isSharingWithCurrentContext() const {
             if (indexSource == indexQuery)
                 return true;
             ++index;
-            // clang-format off: the checks' own texts are their messages
-            ORU_ASSERT(index < LARGE_INDEX - 1);
+            // The checks' own texts are their messages.
+            // clang-format off
+            ORU_ASSERT(index< LARGE_INDEX-1);
         }
     }
-    ORU_ASSERT(indexSource < LARGE_INDEX - 1);
-    ORU_ASSERT(indexQuery < LARGE_INDEX - 1);
+    ORU_ASSERT(indexSource < LARGE_INDEX-1);
+    ORU_ASSERT(indexQuery < LARGE_INDEX-1);
     // clang-format on
     return false;
 }

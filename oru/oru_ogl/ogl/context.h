@@ -24,7 +24,7 @@ public:
     enum Buffering { BUFFERING_SINGLE = 0, BUFFERING_DOUBLE = 1 };
 
     /// Samples per pixel; any value above 1 asks for a multisampled pixel format.
-    enum Multisampling { MULTISAMPLING_NONE = 1 };
+    enum Multisampling : int { MULTISAMPLING_NONE = 1 };
 
     /// What a pixel format must be able to draw to.
     enum Windowing {

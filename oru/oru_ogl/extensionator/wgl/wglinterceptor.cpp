@@ -19,8 +19,9 @@ WGLInterceptor *WGLInterceptor::CreateChecker() {
 void WGLInterceptor::Destroy() {
     if (!sInterceptor_)
         return;
-    // clang-format off: the check's own text is its message
-    ORU_ENFORCE(dynamic_cast<WGLErrorChecker *>(sInterceptor_) != NULL);
+    // The check's own text is its message, so it stands as hosts know it.
+    // clang-format off
+    ORU_ENFORCE(dynamic_cast<WGLErrorChecker*>(sInterceptor_) != NULL);
     // clang-format on
     ORUDeleter<WGLErrorChecker>()(static_cast<WGLErrorChecker *>(sInterceptor_));
     sInterceptor_ = nullptr;

@@ -1,0 +1,205 @@
+// The kinds of contexts: what is current before and after, threads, and what 200 of them leave
+// behind.
+#include "testwindow.h"
+
+#include "oru/core/exceptions/internalexception.h"
+#include "oru/oru_ogl/libraryogl.h"
+#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+#include "oru/oru_ogl/ogl/contextwindowed_win.h"
+#include "oru/oru_ogl/ogl/contextwrapped_win.h"
+#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <thread>
+
+using namespace ORU::OGL;
+using oru_test::ContextCounter;
+using oru_test::MessageOf;
+using oru_test::TestWindow;
+
+namespace {
+
+BufferFormat const kFormat(BufferFormat::FORMAT_RGBA8_D24);
+
+/// Draws one colour into the window's back buffer and reads a pixel of it.
+unsigned int DrawAndRead() {
+    ::glClearColor(1, 0.5f, 0, 1);
+    ::glClear(GL_COLOR_BUFFER_BIT);
+    unsigned int pixel = 0;
+    ::glReadPixels(1, 1, 1, 1, GL_RGBA, GL_UNSIGNED_BYTE, &pixel);
+    return pixel;
+}
+
+bool IsClass(std::string const &name) {
+    WNDCLASSEXA info = {};
+    info.cbSize = sizeof info;
+    return ::GetClassInfoExA(::GetModuleHandleW(nullptr), name.c_str(), &info) != FALSE;
+}
+
+} // namespace
+
+TEST(ContextKinds, KeepTheCurrentContext) {
+    AutoInitializer library;
+    ContextOffscreen first;
+    EXPECT_EQ(nullptr, Context::CurrentContext()) << "making a context makes none current";
+    first.makeCurrent();
+    {
+        TestWindow const window;
+        ContextOffscreen const shared(&first), other;
+        ContextWindowed const windowed(window.hwnd(), kFormat, Context::BUFFERING_DOUBLE,
+                                       Context::MULTISAMPLING_NONE, nullptr);
+        EXPECT_EQ(first.renderContext(), Context::CurrentContext());
+    }
+    EXPECT_EQ(first.renderContext(), Context::CurrentContext()) << "nor does destroying others";
+    {
+        ContextOffscreen const mine;
+        mine.makeCurrent();
+    }
+    EXPECT_EQ(nullptr, Context::CurrentContext()) << "destroying the current one leaves none";
+    EXPECT_EQ("pContext != NULL",
+              MessageOf([] { ContextOffscreen(static_cast<Context const *>(nullptr)); }));
+}
+
+TEST(ContextKinds, DrawIntoTheHostsWindow) {
+    AutoInitializer library;
+    TestWindow const window;
+    ContextWindowed context(window.hwnd(), kFormat, Context::BUFFERING_DOUBLE,
+                            Context::MULTISAMPLING_NONE, nullptr);
+    context.makeCurrent();
+    EXPECT_EQ(0xFF0080FFu, DrawAndRead() & 0xFFFFFFFFu);
+    context.swapBuffers();
+    EXPECT_TRUE(Context::SupportsVerticalRetraceControl());
+    EXPECT_NO_THROW(context.enableSyncToVerticalRetrace(true));
+    EXPECT_NO_THROW(context.enableSyncToVerticalRetrace(false));
+    EXPECT_EQ(static_cast<GLenum>(GL_NO_ERROR), ::glGetError());
+}
+
+TEST(ContextKinds, AdoptTheHostsContext) {
+    AutoInitializer library;
+    EXPECT_EQ("ContextWrapped::ctor invalid device", MessageOf([] { ContextWrapped(); }));
+    TestWindow const window;
+    auto owner = std::make_unique<ContextWindowed>(
+        window.hwnd(), kFormat, Context::BUFFERING_DOUBLE, Context::MULTISAMPLING_NONE, nullptr);
+    HDC const dc = owner->deviceContext();
+    HGLRC const rc = owner->renderContext();
+    EXPECT_EQ("ContextWrapped::ctor invalid rendering context",
+              MessageOf([=] { ContextWrapped(dc, nullptr, nullptr); }));
+    ContextWrapped const byWindow(dc, rc, window.hwnd());
+    EXPECT_EQ(owner->displayDeviceKey().deviceID, byWindow.displayDeviceKey().deviceID);
+    {
+        owner->makeCurrent();
+        ContextWrapped const current;
+        EXPECT_EQ(rc, current.renderContext());
+        EXPECT_EQ(owner->displayDeviceKey().displayName, current.displayDeviceKey().displayName);
+        EXPECT_TRUE(current.isSharingWithCurrentContext());
+    }
+    EXPECT_EQ(rc, Context::CurrentContext()) << "the adopted context is left as it is";
+    ReleaseOGLContext();
+    byWindow.makeCurrent();
+    EXPECT_EQ(rc, Context::CurrentContext());
+    owner.reset();
+    EXPECT_EQ("ContextWrapped Object leaked", MessageOf([&] { byWindow.makeCurrent(); }));
+}
+
+TEST(ContextKinds, BelongToOneThreadAtATime) {
+    AutoInitializer library;
+    ContextOffscreen context;
+    context.makeCurrent();
+    std::string message;
+    std::thread([&] { message = MessageOf([&] { context.makeCurrent(); }); }).join();
+    EXPECT_EQ(0u, message.find("Context::can't make this context current")) << message;
+    ReleaseOGLContext();
+    std::thread([&] {
+        message = MessageOf([&] {
+            context.makeCurrent();
+            ReleaseOGLContext();
+        });
+    }).join();
+    EXPECT_EQ("nothing was thrown", message);
+}
+
+TEST(ContextKinds, WorkOnSeveralThreadsAtOnce) {
+    AutoInitializer library;
+    ContextOffscreen parent;
+    std::vector<std::unique_ptr<ContextOffscreen>> contexts;
+    for (int i = 0; i < 6; ++i)
+        contexts.push_back(std::make_unique<ContextOffscreen>(&parent));
+    std::vector<unsigned int> pixels(contexts.size());
+    std::vector<std::thread> threads;
+    for (std::size_t i = 0; i < contexts.size(); ++i)
+        threads.emplace_back([&, i] {
+            contexts[i]->makeCurrent();
+            pixels[i] = DrawAndRead();
+            ReleaseOGLContext();
+        });
+    for (auto &thread : threads)
+        thread.join();
+    for (unsigned int pixel : pixels)
+        EXPECT_EQ(0x0080FFu, pixel & 0xFFFFFFu);
+}
+
+// 200 contexts of every kind, in changing order: no context, window, class or GDI object stays.
+TEST(ContextKinds, LeaveNothingBehind) {
+    AutoInitializer library;
+    {
+        ContextCounter const counter; // in place before the record learns how contexts are made
+        ContextOffscreen keep;
+        int const before = ContextCounter::Alive();
+        int const made = ContextCounter::Made();
+        TestWindow const window;
+        DWORD gdiObjects = 0;
+        std::string className;
+        for (int i = 0; i < 100; ++i) {
+            std::unique_ptr<Context> a = std::make_unique<ContextOffscreen>(&keep);
+            std::unique_ptr<Context> b;
+            if (i % 10 == 0)
+                b = std::make_unique<ContextWindowed>(
+                    window.hwnd(), kFormat, Context::BUFFERING_DOUBLE, Context::MULTISAMPLING_NONE,
+                    i % 20 ? &keep : nullptr);
+            else
+                b = std::make_unique<ContextOffscreen>(a.get());
+            (i % 3 ? a : b)->makeCurrent();
+            className = oru_test::InternalWindowClasses().front(); // the newest stands in front
+            if (i % 2)
+                a.reset();
+            b.reset();
+            a.reset();
+            ASSERT_EQ(nullptr, Context::CurrentContext());
+            if (i == 20)
+                gdiObjects = ::GetGuiResources(::GetCurrentProcess(), GR_GDIOBJECTS);
+        }
+        EXPECT_EQ(200, ContextCounter::Made() - made);
+        EXPECT_EQ(before, ContextCounter::Alive());
+        EXPECT_EQ(gdiObjects, ::GetGuiResources(::GetCurrentProcess(), GR_GDIOBJECTS));
+        EXPECT_EQ(1u, oru_test::InternalWindowClasses().size()) << "that of the context kept";
+        // A class goes with its window; that of the context kept is still there.
+        std::string const kept = oru_test::InternalWindowClasses().front();
+        ASSERT_NE(kept, className);
+        EXPECT_TRUE(IsClass(kept));
+        EXPECT_FALSE(IsClass(className));
+    }
+}
+
+TEST(CurrentContextScope, RestoresWhatItFound) {
+    AutoInitializer library;
+    ContextOffscreen first, second;
+    {
+        ScopedContextWrapper const scope;
+        first.makeCurrent();
+    }
+    EXPECT_EQ(nullptr, Context::CurrentContext());
+    first.makeCurrent();
+    {
+        ScopedContextWrapper const scope(false);
+        second.makeCurrent();
+    }
+    EXPECT_EQ(first.renderContext(), Context::CurrentContext());
+    {
+        ScopedContextWrapper const scope;
+        ReleaseOGLContext();
+        ReleaseOGLContext();
+    }
+    EXPECT_EQ(first.renderContext(), Context::CurrentContext());
+}

@@ -1,0 +1,110 @@
+// Display devices against what DXGI itself says.
+#include "testwindow.h"
+
+#include "oru/oru_ogl/libraryogl.h"
+#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+
+#include <dxgi.h>
+#include <gtest/gtest.h>
+#include <wrl/client.h>
+
+using namespace ORU::OGL;
+using Microsoft::WRL::ComPtr;
+using oru_test::MessageOf;
+
+namespace {
+
+struct Exposed : Context {
+    using Context::DisplayDeviceFromWindow;
+    using Context::DisplayOrigin;
+    using Context::PrimaryDisplayDevice;
+};
+
+std::string Narrow(wchar_t const *text) {
+    std::string result(256, '\0');
+    result.resize(static_cast<std::size_t>(
+        ::WideCharToMultiByte(CP_UTF8, 0, text, -1, &result[0], 256, nullptr, nullptr) - 1));
+    return result;
+}
+
+/// One adapter as DXGI lists it, with its first output on the desktop when it has one.
+struct Listed {
+    DXGI_ADAPTER_DESC adapter;
+    bool hasOutput;
+    DXGI_OUTPUT_DESC output;
+};
+
+std::vector<Listed> ListAdapters() {
+    std::vector<Listed> list;
+    ComPtr<IDXGIFactory1> factory;
+    ::CreateDXGIFactory1(IID_PPV_ARGS(factory.GetAddressOf()));
+    ComPtr<IDXGIAdapter> adapter;
+    for (UINT i = 0; factory->EnumAdapters(i, adapter.ReleaseAndGetAddressOf()) == S_OK; ++i) {
+        Listed listed = {};
+        adapter->GetDesc(&listed.adapter);
+        ComPtr<IDXGIOutput> output;
+        for (UINT j = 0;
+             !listed.hasOutput && adapter->EnumOutputs(j, output.ReleaseAndGetAddressOf()) == S_OK;
+             ++j) {
+            output->GetDesc(&listed.output);
+            listed.hasOutput = listed.output.AttachedToDesktop;
+        }
+        list.push_back(listed);
+    }
+    return list;
+}
+
+} // namespace
+
+TEST(DisplayDevices, AreThoseOfTheSystem) {
+    auto const adapters = ListAdapters();
+    std::size_t withOutput = 0;
+    for (std::size_t i = 0; i < adapters.size(); ++i) {
+        DisplayDeviceKey key("unchanged", "", "");
+        EXPECT_EQ(adapters[i].hasOutput, Context::DisplayDevice(i, key)) << i;
+        if (!adapters[i].hasOutput) {
+            EXPECT_EQ("unchanged", key.displayName);
+            continue;
+        }
+        ++withOutput;
+        EXPECT_EQ(Narrow(adapters[i].output.DeviceName), key.displayName);
+        EXPECT_EQ(Narrow(adapters[i].adapter.Description), key.adapterName);
+        EXPECT_EQ(std::to_string(adapters[i].adapter.DeviceId), key.deviceID);
+    }
+    EXPECT_EQ(withOutput, Context::NumDisplayDevice());
+    ASSERT_GE(withOutput, 1u);
+
+    DisplayDeviceKey key("unchanged", "a", "b");
+    for (std::size_t beyond : {adapters.size(), std::size_t(0x100000000), ~std::size_t(0)}) {
+        EXPECT_FALSE(Context::DisplayDevice(beyond, key));
+        EXPECT_EQ("unchanged", key.displayName);
+    }
+}
+
+TEST(DisplayDevices, PlaceWindowsAndOrigins) {
+    auto const &primary = Exposed::PrimaryDisplayDevice();
+    EXPECT_EQ(&primary, &Exposed::PrimaryDisplayDevice());
+    oru_test::TestWindow const window;
+    DisplayDeviceKey const shown = Exposed::DisplayDeviceFromWindow(window.hwnd());
+    EXPECT_EQ(primary.displayName, shown.displayName); // one output shows everything here
+    EXPECT_EQ(primary.deviceID, shown.deviceID);
+    EXPECT_EQ("GetWindowRect(theWindow, &windowRect)",
+              MessageOf([] { Exposed::DisplayDeviceFromWindow(nullptr); }));
+
+    auto const origin = Exposed::DisplayOrigin(primary.adapterName, false);
+    EXPECT_EQ(0, origin.x);
+    EXPECT_EQ(0, origin.y);
+    for (bool toZero : {false, true})
+        EXPECT_EQ("Adapter not found",
+                  MessageOf([=] { Exposed::DisplayOrigin("no such adapter", toZero); }));
+}
+
+TEST(DisplayDevices, NameTheDeviceOfEveryContext) {
+    AutoInitializer library;
+    ContextOffscreen const first, second(&first);
+    EXPECT_EQ(Exposed::PrimaryDisplayDevice().displayName, first.displayDeviceKey().displayName);
+    EXPECT_EQ(first.displayDeviceKey().deviceID, second.displayDeviceKey().deviceID);
+    EXPECT_EQ("Adapter not found", MessageOf([] {
+                  ContextOffscreen const nowhere(DisplayDeviceKey("", "no such adapter", "999"));
+              }));
+}

@@ -1,0 +1,154 @@
+// Share groups: who shares with whom, and how adopted contexts find their group.
+#include "testwindow.h"
+
+#include "oru/oru_ogl/libraryogl.h"
+#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+#include "oru/oru_ogl/ogl/contextwrapped_win.h"
+#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <thread>
+
+using namespace ORU::OGL;
+using oru_test::MessageOf;
+
+namespace {
+
+/// Opens the protected operations of a context.
+class Exposed : public ContextOffscreen {
+public:
+    using Context::addShareContext;
+    using Context::registerSharedContext;
+    using Context::UnregisterShareContext;
+    using Context::unregisterSharedContext;
+};
+
+/// A context of no kind: in no group until told.
+class Bare : public Context {
+public:
+    Bare() : Context(DisplayDeviceKey()) {}
+    using Context::addShareContext;
+    using Context::UnregisterShareContext;
+};
+
+/// A rendering context that the host makes on the window of another and shares with it.
+class HostSibling {
+public:
+    explicit HostSibling(Context const &context, bool share)
+        : rc_(::wglCreateContext(context.deviceContext())) {
+        if (share) {
+            EXPECT_TRUE(::wglShareLists(context.renderContext(), rc_));
+        }
+        ::wglMakeCurrent(context.deviceContext(), rc_);
+    }
+    ~HostSibling() {
+        ::wglMakeCurrent(nullptr, nullptr);
+        ::wglDeleteContext(rc_);
+    }
+
+private:
+    HGLRC rc_;
+};
+
+} // namespace
+
+TEST(ShareGroups, TellWhoShares) {
+    AutoInitializer library;
+    auto parent = std::make_unique<ContextOffscreen>();
+    ContextOffscreen const child(parent.get()), grandchild(&child), stranger;
+    EXPECT_FALSE(child.isSharingWithCurrentContext()) << "no context is current";
+    for (Context const *current :
+         {static_cast<Context const *>(parent.get()), static_cast<Context const *>(&child),
+          static_cast<Context const *>(&grandchild)}) {
+        current->makeCurrent();
+        EXPECT_TRUE(parent->isSharingWithCurrentContext());
+        EXPECT_TRUE(child.isSharingWithCurrentContext());
+        EXPECT_TRUE(grandchild.isSharingWithCurrentContext());
+        EXPECT_FALSE(stranger.isSharingWithCurrentContext());
+    }
+    // Objects are really shared, also after the parent's end.
+    parent->makeCurrent();
+    GLuint texture = 0;
+    ::glGenTextures(1, &texture);
+    ::glBindTexture(GL_TEXTURE_2D, texture);
+    parent.reset();
+    child.makeCurrent();
+    EXPECT_TRUE(::glIsTexture(texture));
+    EXPECT_TRUE(grandchild.isSharingWithCurrentContext());
+    ::glDeleteTextures(1, &texture);
+    stranger.makeCurrent();
+    EXPECT_FALSE(child.isSharingWithCurrentContext());
+}
+
+TEST(ShareGroups, CheckTheirMembers) {
+    AutoInitializer library;
+    Exposed context;
+    context.makeCurrent();
+    Bare loner;
+    EXPECT_EQ("sibling != this", MessageOf([&] { context.addShareContext(&context); }));
+    EXPECT_EQ("outerIter != gVectorOfContextVectors->end()",
+              MessageOf([&] { context.addShareContext(&loner); }));
+    EXPECT_EQ("indexSource < LARGE_INDEX-1",
+              MessageOf([&] { loner.isSharingWithCurrentContext(); }));
+    context.unregisterSharedContext();
+    EXPECT_EQ("indexSource < LARGE_INDEX-1",
+              MessageOf([&] { context.isSharingWithCurrentContext(); }))
+        << "no groups at all";
+    loner.addShareContext(nullptr);
+    EXPECT_EQ("indexQuery < LARGE_INDEX-1",
+              MessageOf([&] { loner.isSharingWithCurrentContext(); }));
+    context.registerSharedContext(&loner);
+    EXPECT_TRUE(loner.isSharingWithCurrentContext());
+    Bare::UnregisterShareContext(&loner);
+    Bare::UnregisterShareContext(&loner); // nobody is not an error
+}
+
+TEST(ShareGroups, KeepTheirOrderWhenOneEnds) {
+    AutoInitializer library;
+    ContextOffscreen const first, last;
+    auto middle = std::make_unique<ContextOffscreen>();
+    ContextOffscreen const end(&last);
+    middle.reset();
+    last.makeCurrent();
+    EXPECT_TRUE(end.isSharingWithCurrentContext());
+    EXPECT_FALSE(first.isSharingWithCurrentContext());
+    ReleaseOGLContext();
+}
+
+TEST(ShareGroups, AreFoundForAdoptedContexts) {
+    AutoInitializer library;
+    ContextOffscreen const unrelated, parent;
+    {
+        HostSibling const sharing(parent, true);
+        HGLRC const current = ::wglGetCurrentContext();
+        ContextWrapped const adopted;
+        EXPECT_EQ(current, ::wglGetCurrentContext()) << "the probe restores the current context";
+        EXPECT_TRUE(parent.isSharingWithCurrentContext());
+        EXPECT_FALSE(unrelated.isSharingWithCurrentContext());
+    }
+    {
+        HostSibling const alone(parent, false);
+        ContextWrapped const adopted;
+        EXPECT_TRUE(adopted.isSharingWithCurrentContext());
+        EXPECT_FALSE(parent.isSharingWithCurrentContext());
+        EXPECT_FALSE(unrelated.isSharingWithCurrentContext());
+    }
+}
+
+// A group whose first context another thread uses cannot be probed, which is no failure.
+TEST(ShareGroups, PassOverContextsInUseElsewhere) {
+    AutoInitializer library;
+    ContextOffscreen const busy;
+    ContextOffscreen const parent;
+    std::thread([&] {
+        busy.makeCurrent();
+        std::thread([&] {
+            HostSibling const sharing(parent, true);
+            ContextWrapped const adopted;
+            EXPECT_TRUE(parent.isSharingWithCurrentContext());
+        }).join();
+        ReleaseOGLContext();
+    }).join();
+}

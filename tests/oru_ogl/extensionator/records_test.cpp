@@ -1,0 +1,245 @@
+// Where records come from: one per device, one per foreign context, none before the library is
+// open.
+#include "../glfixture.h"
+
+#include "oru/core/exceptions/internalexception.h"
+#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
+#include "oru/oru_ogl/extensionator/wgl/wglforwarder.h"
+#include "oru/oru_ogl/ogl/contextwrapped_win.h"
+#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
+
+#include <atomic>
+#include <cstring>
+#include <set>
+#include <thread>
+#include <vector>
+
+using namespace ORU::OGL;
+
+namespace {
+
+template<class Call>
+std::string MessageOf(Call call) {
+    try {
+        call();
+    } catch (ORU::LogicalException const &e) {
+        return e.message();
+    }
+    return "nothing was thrown";
+}
+
+/// A window and context that the host makes with plain calls.
+class HostContext {
+public:
+    HostContext()
+        : window_(::CreateWindowA("STATIC", "", WS_OVERLAPPEDWINDOW, 0, 0, 32, 32, nullptr, nullptr,
+                                  ::GetModuleHandleW(nullptr), nullptr)),
+          dc_(::GetDC(window_)) {
+        PIXELFORMATDESCRIPTOR descriptor = {};
+        descriptor.nSize = sizeof descriptor;
+        descriptor.nVersion = 1;
+        descriptor.dwFlags = PFD_DRAW_TO_WINDOW | PFD_SUPPORT_OPENGL;
+        descriptor.iPixelType = PFD_TYPE_RGBA;
+        ::SetPixelFormat(dc_, ::ChoosePixelFormat(dc_, &descriptor), &descriptor);
+        rc_ = ::wglCreateContext(dc_);
+    }
+    ~HostContext() {
+        if (::wglGetCurrentContext() == rc_)
+            ::wglMakeCurrent(nullptr, nullptr);
+        ::wglDeleteContext(rc_);
+        ::ReleaseDC(window_, dc_);
+        ::DestroyWindow(window_);
+    }
+    HostContext(HostContext const &) = delete;
+    HostContext &operator=(HostContext const &) = delete;
+
+    void makeCurrent() const { ASSERT_TRUE(::wglMakeCurrent(dc_, rc_)); }
+    HDC dc() const { return dc_; }
+    HGLRC rc() const { return rc_; }
+
+private:
+    HWND window_;
+    HDC dc_;
+    HGLRC rc_ = nullptr;
+};
+
+/// Counts the bootstrap contexts: they alone are made without attributes here.
+class CreationCounter : public WGLForwarder {
+public:
+    CreationCounter() { WGLInterceptor::Instance()->addInterceptor(this); }
+    ~CreationCounter() override { WGLInterceptor::Instance()->popInterceptor(); }
+    HGLRC wcgmCreateContext(char const *file, unsigned int line, HDC dc) override {
+        ++count_;
+        return WGLForwarder::wcgmCreateContext(file, line, dc);
+    }
+    int count() const { return count_; }
+
+private:
+    std::atomic<int> count_{0};
+};
+
+char const kNotInitialized[] = "OGL Library must be initialized to use Instance()";
+
+} // namespace
+
+TEST(LibraryStart, OpensOnceAndClosesOnce) {
+    EXPECT_EQ("sIsInitialized_", MessageOf([] { Library::Terminate(); }));
+    Library::Initialize(Library::InitOptions());
+    EXPECT_EQ("!sIsInitialized_", MessageOf([] { Library::Initialize(Library::InitOptions()); }));
+    EXPECT_TRUE(Library::IsInitialized());
+    EXPECT_EQ(nullptr, ExtensionManager::Instance());
+    EXPECT_EQ(nullptr, ExtensionManager::Instance(static_cast<Context const *>(nullptr)));
+    Library::Terminate();
+    EXPECT_FALSE(Library::IsInitialized());
+    EXPECT_EQ(kNotInitialized, MessageOf([] { ExtensionManager::Instance(); }));
+    EXPECT_EQ(kNotInitialized,
+              MessageOf([] { ExtensionManager::Instance(static_cast<Context const *>(nullptr)); }));
+    {
+        AutoInitializer library;
+        library.release();
+    }
+    EXPECT_TRUE(Library::IsInitialized());
+    Library::Terminate();
+}
+
+TEST(LibraryStart, HandsOptionsToNewContexts) {
+    AutoInitializer library;
+    ExtensionManager::InitOptions outer, inner;
+    outer.setOpenGLProfile(OPENGLPROFILE_CORE);
+    inner.setThrowOnNullContext(false);
+    {
+        ExtensionManager::ScopedInitOptions const first(outer);
+        {
+            ExtensionManager::ScopedInitOptions const second(inner);
+            EXPECT_FALSE(ExtensionManager::CurrentInitOptions().throwOnNullContext());
+        }
+        ContextOffscreen context;
+        EXPECT_EQ(OPENGLPROFILE_CORE, context.openGLProfile());
+        EXPECT_EQ(OPENGLPROFILE_CORE,
+                  ExtensionManager::Instance(&context)->initOptions().openGLProfile());
+    }
+    EXPECT_EQ(OPENGLPROFILE_DEFAULT, ExtensionManager::CurrentInitOptions().openGLProfile());
+    EXPECT_TRUE(ExtensionManager::CurrentInitOptions().throwOnNullContext());
+}
+
+TEST(DeviceRecord, IsBuiltOnceForAllContextsOfADevice) {
+    AutoInitializer library;
+    CreationCounter created;
+    ContextOffscreen first;
+    EXPECT_EQ(1, created.count());
+    ContextOffscreen second, third(&first);
+    EXPECT_EQ(1, created.count());
+    EXPECT_EQ(nullptr, ::wglGetCurrentContext());
+
+    ExtensionManager *const record = ExtensionManager::Instance(first.displayDeviceKey());
+    for (Context const *context : {&first, &second, &third}) {
+        EXPECT_EQ(record, ExtensionManager::Instance(context));
+        EXPECT_EQ(record, ExtensionManager::Instance(context->renderContext()));
+        context->makeCurrent();
+        EXPECT_EQ(record, ExtensionManager::Instance());
+        EXPECT_EQ(&record->table(), &ExtensionManager::CurrentTable());
+    }
+    ExtensionManager::UnRegisterContext(second);
+    EXPECT_EQ("bFound", MessageOf([&] { ExtensionManager::UnRegisterContext(second); }));
+    EXPECT_EQ(nullptr, ExtensionManager::Instance(second.renderContext()));
+    ExtensionManager::RegisterContext(second);
+    EXPECT_EQ(record, ExtensionManager::Instance(second.renderContext()));
+    EXPECT_EQ(1, created.count());
+}
+
+// All threads meet the device first at the same moment: each may build a record, one stays.
+TEST(DeviceRecord, IsOneForThreadsThatBuildItAtOnce) {
+    for (int round = 0; round < 5; ++round) {
+        AutoInitializer library;
+        DisplayDeviceKey key;
+        ASSERT_TRUE(Context::DisplayDevice(0, key));
+        std::atomic<int> waiting{8};
+        std::vector<ExtensionManager *> records(8);
+        std::vector<std::thread> threads;
+        for (auto &record : records)
+            threads.emplace_back([&] {
+                --waiting;
+                while (waiting > 0)
+                    std::this_thread::yield();
+                record = ExtensionManager::Instance(key);
+            });
+        for (std::thread &thread : threads)
+            thread.join();
+        std::set<ExtensionManager *> const distinct(records.begin(), records.end());
+        ASSERT_EQ(1u, distinct.size());
+        EXPECT_TRUE((*distinct.begin())->isSupported(GL_VERSION_2_0));
+    }
+}
+
+TEST(DeviceRecord, RestoresTheCurrentContext) {
+    AutoInitializer library;
+    HostContext host;
+    host.makeCurrent();
+    DisplayDeviceKey key;
+    ASSERT_TRUE(Context::DisplayDevice(0, key));
+    ASSERT_NE(nullptr, ExtensionManager::Instance(key));
+    EXPECT_EQ(host.rc(), ::wglGetCurrentContext());
+    EXPECT_EQ(host.dc(), ::wglGetCurrentDC());
+}
+
+TEST(ForeignRecord, IsBuiltAtTheFirstCallAndOnce) {
+    HostContext host;
+    host.makeCurrent();
+    EXPECT_EQ(kNotInitialized, MessageOf([] { ExtensionManager::CurrentTable(); }));
+    EXPECT_EQ(kNotInitialized, MessageOf([] { ORU_GL(UseProgram, 0u); }));
+
+    AutoInitializer library;
+    EXPECT_EQ(nullptr, ExtensionManager::Instance());
+    ORU_GL(UseProgram, 0u);
+    ExtensionManager *const record = ExtensionManager::Instance();
+    ASSERT_NE(nullptr, record);
+    EXPECT_TRUE(record->displayDeviceKey().deviceID.empty());
+    EXPECT_EQ(&record->table(), &ExtensionManager::CurrentTable());
+    EXPECT_EQ(record, ExtensionManager::InstanceGuaranteed(host.rc()));
+
+    // Adopting it leaves the record it has; its display device is found all the same.
+    ContextWrapped const adopted;
+    EXPECT_EQ(record, ExtensionManager::Instance(host.rc()));
+    EXPECT_FALSE(adopted.displayDeviceKey().deviceID.empty());
+}
+
+TEST(ForeignRecord, IsEmptyWithoutAContext) {
+    AutoInitializer library;
+    FunctionTable const empty;
+    EXPECT_EQ(0, std::memcmp(&empty, &ExtensionManager::CurrentTable(), sizeof empty));
+    EXPECT_EQ(&ExtensionManager::CurrentTable(), &ExtensionManager::CurrentTable());
+    std::ostringstream text;
+    text << *ExtensionManager::Instance();
+    EXPECT_NE(std::string::npos, text.str().find("Supported extensions:\n    NONE\n"));
+    EXPECT_FALSE(ExtensionManager::Instance()->hasReleaseVersion());
+    EXPECT_EQ(1u, ExtensionManager::Instance()->numberOfTextureUnits());
+}
+
+// More contexts than the read-only index of the registry can hold: the map behind it answers.
+TEST(ContextRegistry, FindsManyContextsFromManyThreads) {
+    AutoInitializer library;
+    ContextOffscreen first;
+    std::vector<std::unique_ptr<ContextOffscreen>> contexts;
+    for (int i = 0; i < 40; ++i)
+        contexts.push_back(std::make_unique<ContextOffscreen>(&first));
+    ExtensionManager *const record = ExtensionManager::Instance(&first);
+    std::vector<std::thread> threads;
+    std::atomic<int> wrong{0};
+    for (int t = 0; t < 4; ++t)
+        threads.emplace_back([&, t] {
+            for (std::size_t i = static_cast<std::size_t>(t); i < contexts.size(); i += 4) {
+                contexts[i]->makeCurrent();
+                for (int repeat = 0; repeat < 200; ++repeat)
+                    if (&ExtensionManager::CurrentTable() != &record->table())
+                        ++wrong;
+                ReleaseOGLContext();
+            }
+        });
+    for (std::thread &thread : threads)
+        thread.join();
+    EXPECT_EQ(0, wrong);
+    HGLRC const gone = contexts.back()->renderContext();
+    contexts.clear();
+    EXPECT_EQ(nullptr, ExtensionManager::Instance(gone)) << "an entry ends with its context";
+    EXPECT_EQ(record, ExtensionManager::Instance(first.renderContext()));
+}
