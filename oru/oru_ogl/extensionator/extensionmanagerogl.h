@@ -239,6 +239,7 @@ private:
     static ExtensionManager *Create(DisplayDeviceKey const &key);
     static ExtensionManager *Create(HGLRC rc);
     static ExtensionManager *NullExtensionManager();
+    static FunctionTable const &FindOrMakeTable(HGLRC rc);
 
     void initialize();
     void readVendor();

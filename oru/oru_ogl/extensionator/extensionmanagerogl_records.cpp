@@ -17,7 +17,7 @@ namespace ORU {
 namespace OGL {
 
 using internal::ContextBootstrap;
-namespace ContextRegistry = internal::ContextRegistry;
+using internal::ContextRegistry;
 
 namespace {
 
@@ -83,11 +83,17 @@ FunctionTable const &ExtensionManager::CurrentTable() {
 }
 
 FunctionTable const &ExtensionManager::CurrentTable(HGLRC const &rc) {
+    if (FunctionTable const *table = ContextRegistry::FindTable(rc))
+        return *table;
+    return FindOrMakeTable(rc);
+}
+
+FunctionTable const &ExtensionManager::FindOrMakeTable(HGLRC rc) {
     if (ExtensionManager const *record = Instance(rc))
         return record->table();
     HGLRC const current = ORU_WGL0(GetCurrentContext);
     ExtensionManager *const record = Create(current);
-    ContextRegistry::Insert(current, record);
+    ContextRegistry::Insert(current, record, &record->table());
     return record->table();
 }
 
@@ -130,7 +136,8 @@ ExtensionManager *ExtensionManager::Create(DisplayDeviceKey const &key) {
 }
 
 void ExtensionManager::RegisterContext(Context const &context) {
-    ContextRegistry::Insert(context.renderContext(), Instance(context.displayDeviceKey()));
+    ExtensionManager *const record = Instance(context.displayDeviceKey());
+    ContextRegistry::Insert(context.renderContext(), record, &record->table());
 }
 
 void ExtensionManager::UnRegisterContext(Context const &context) {

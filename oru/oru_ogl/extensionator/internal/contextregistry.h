@@ -3,10 +3,15 @@
 
 #include "oru/core/utility/windowsforward.h"
 
+#include <atomic>
+#include <cstddef>
+#include <cstdint>
+
 namespace ORU {
 namespace OGL {
 
 class ExtensionManager;
+struct FunctionTable;
 
 namespace internal {
 
@@ -16,21 +21,61 @@ namespace internal {
 /// A look-up stands before every OpenGL call beyond 1.1, so it must not write anything that threads
 /// share, which the concurrent map's element locks do. A small read-only index answers for the
 /// contexts in use; only what it does not hold goes to the map.
-namespace ContextRegistry {
+class ContextRegistry {
+public:
+    /// The context's record, or null.
+    static ExtensionManager *Find(HGLRC context);
 
-/// The context's record, or null.
-ExtensionManager *Find(HGLRC context);
+    /// The function table of the context's record when the index knows the context, else null.
+    static FunctionTable const *FindTable(HGLRC context) {
+        // The first place is the right one but for a collision of two contexts in use.
+        Slot const &slot = sIndex_[Hash(context)];
+        if (slot.context.load(std::memory_order_acquire) == Key(context))
+            return slot.table.load(std::memory_order_relaxed);
+        return nullptr;
+    }
 
-/// Adds an entry; one already present for the context stays.
-void Insert(HGLRC context, ExtensionManager *record);
+    /// Adds an entry; one already present for the context stays.
+    /// @param table the record's function table
+    static void Insert(HGLRC context, ExtensionManager *record, FunctionTable const *table);
 
-/// Removes an entry.
-/// @return whether there was one
-bool Erase(HGLRC context);
+    /// Removes an entry.
+    /// @return whether there was one
+    static bool Erase(HGLRC context);
 
-void Clear();
+    static void Clear();
 
-} // namespace ContextRegistry
+private:
+    /// No context has this handle; null will not do, as a thread without a context asks for it.
+    static std::uintptr_t const kFree = ~std::uintptr_t(0);
+
+    /// A place of the index. It is written record and table first and erased context first, so a
+    /// reader that finds its context finds that context's record; it could see another's only if
+    /// its context were unregistered while it is current, which is not allowed.
+    struct alignas(32) Slot {
+        std::atomic<std::uintptr_t> context{kFree};
+        std::atomic<FunctionTable const *> table{nullptr};
+        std::atomic<ExtensionManager *> record{nullptr};
+    };
+
+    static std::size_t const kSlotBits = 8;
+    static std::size_t const kSlots = std::size_t(1) << kSlotBits;
+    static std::size_t const kProbes = 8;
+
+    static std::uintptr_t Key(HGLRC context) { return reinterpret_cast<std::uintptr_t>(context); }
+
+    /// Fibonacci hashing: handles differ in a few low or middle bits only.
+    static std::size_t Hash(HGLRC context) {
+        return (Key(context) * std::uintptr_t(0x9E3779B97F4A7C15)) >> (64 - kSlotBits);
+    }
+
+    static Slot *FindSlot(HGLRC context);
+
+    /// Open addressing with a short probe, for which there are places beyond the last; a context
+    /// that finds no room is answered by the map alone.
+    static Slot sIndex_[kSlots + kProbes];
+};
+
 } // namespace internal
 } // namespace OGL
 } // namespace ORU
