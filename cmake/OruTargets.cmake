@@ -14,8 +14,9 @@ endfunction()
 # oru_add_test(<name> SOURCES <file>... [LIBRARIES <target>...] [ENVIRONMENT <VAR=value>...]
 #              [TIMEOUT <seconds>] [INTERNAL])
 # A GoogleTest program, each of its cases a test of CTest, run with ENVIRONMENT and ended after TIMEOUT
-# (60 s unless told). INTERNAL links the library's objects instead of the DLL, to reach what it does not
-# export.
+# (60 s unless told). With an ENVIRONMENT its tests are named "<name>/Suite.Name", so that several programs
+# can run the same cases, each in its own. INTERNAL links the library's objects instead of the DLL, to
+# reach what it does not export.
 function(oru_add_test name)
     cmake_parse_arguments(arg "INTERNAL" "TIMEOUT" "SOURCES;LIBRARIES;ENVIRONMENT" ${ARGN})
     if(arg_UNPARSED_ARGUMENTS)
@@ -32,7 +33,12 @@ function(oru_add_test name)
     endif()
     target_link_libraries(${name} PRIVATE ${arg_LIBRARIES} GTest::gmock GTest::gtest_main)
 
+    set(prefix "")
+    if(arg_ENVIRONMENT)
+        set(prefix "${name}/")
+    endif()
     gtest_discover_tests(${name}
+        TEST_PREFIX "${prefix}"
         DISCOVERY_MODE PRE_TEST
         DISCOVERY_TIMEOUT 60
         NO_PRETTY_TYPES NO_PRETTY_VALUES

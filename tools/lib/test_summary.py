@@ -1,4 +1,5 @@
 # Sums up CTest's JUnit results and holds the skipped tests against the list of expected ones.
+import collections
 import sys
 import xml.etree.ElementTree as ElementTree
 
@@ -30,18 +31,22 @@ def main(results_path, expected_path):
         passed, failed, skipped = read_results(results_path)
     except FileNotFoundError:
         raise SystemExit("No test ran.")
+    names = collections.Counter(passed + failed + skipped)
+    ambiguous = [name for name, count in names.items() if count > 1]
     unexpected = [name for name in skipped if name not in expected]
     for name in skipped:
         print(f"skipped: {name} ({expected.get(name, 'NOT EXPECTED: list it with its reason')})")
     for name in sorted(set(expected) & set(passed)):
         print(f"note: {name} is listed as an expected skip, but it ran")
+    for name in ambiguous:
+        print(f"ambiguous: {names[name]} tests are named {name}")
     for name in failed:
         print(f"failed: {name}")
     print(f"Tests: {len(passed)} passed, {len(failed)} failed, {len(skipped)} skipped"
           f" ({len(unexpected)} of these unexpectedly)")
     if not passed and not failed:
         raise SystemExit("No test ran.")
-    return 1 if failed or unexpected else 0
+    return 1 if failed or unexpected or ambiguous else 0
 
 
 if __name__ == "__main__":

@@ -86,7 +86,7 @@ stop_wine() {
 # for each build folder: a second one waits. Inside a running one there is nothing to do.
 start_wine() {
     [ -z "${ORU_WINE:-}" ] || return 0
-    mkdir -p "$ORU_WINE_DIR"
+    mkdir -p "$ORU_WINE_DIR/cache"
     exec 8>"$ORU_WINE_DIR/lock"
     flock -n 8 || { say "Waiting for another program that uses $(shown_path "$ORU_WINE_DIR")"; flock 8; }
     WINE=$(find_program /usr/lib/wine/wine64 wine64 wine)

@@ -5,8 +5,7 @@
 #include <cstring>
 
 int main() {
-    ORU::OGL::Library::Initialize();
-    ORU::OGL::Library::Terminate();
+    ORU::OGL::AutoInitializer const layer;
     try {
         throw ORU::InternalException("host.cpp", 7, "a host's own");
     } catch (ORU::LogicalException const &e) {
