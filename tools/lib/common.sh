@@ -22,14 +22,15 @@ die() {
 show_help() { sed -n '2,/^[^#]/ { s/^# \{0,1\}//p }' "$0"; }
 
 # logged NAME WHAT COMMAND...: runs a long step with its output in a log; a failure ends the script with
-# what failed, the log's last lines and where the log is. (Descriptors 8 and 9 are locks of the scripts.)
+# the first errors in the log (or its last lines), what failed and where the log is. Descriptors 8 and 9,
+# locks of the scripts, stay out of what outlives the step.
 logged() {
     local log=$ORU_LOG_DIR/$1.log what=$2
     shift 2
     mkdir -p "$ORU_LOG_DIR"
     say "$what"
     if ! "$@" >"$log" 2>&1 </dev/null 8>&- 9>&-; then
-        tail -n 30 "$log" >&2
+        grep -m 10 -A 3 -E '(^E|error):|CMake Error|^FAILED' "$log" >&2 || tail -n 20 "$log" >&2
         die "failed: $what (whole log: $(shown_path "$log"))"
     fi
 }
