@@ -8,7 +8,7 @@ SOURCE = "catalogue/gl_entry_points.tsv and gl_extensions.tsv by emit_gl.py"
 HAND_CHECKED = {"glBegin", "glEnd", "glGetError"}
 
 # Names that the generated bodies use themselves; a parameter of that name would hide them.
-RESERVED_NAMES = {"file", "line", "check", "value_"}
+RESERVED_NAMES = {"file", "line", "insideBeginEnd_", "value_"}
 
 
 def emit(folder, writer):
@@ -186,9 +186,9 @@ def error_checker(entries):
         target = f"::{entry.name}" if entry.is_core else f"ExtensionManager::CurrentTable().{entry.name}"
         call = f"{target}({entry.arguments})"
         if entry.result == "void":
-            lines = f"    {call};\n    check(file, line);"
+            lines = f"    {call};\n    CheckOpenGLError(insideBeginEnd_, file, line);"
         else:
-            lines = f"    {entry.result} const value_ = {call};\n    check(file, line);\n    return value_;"
+            lines = f"    {entry.result} const value_ = {call};\n    CheckOpenGLError(insideBeginEnd_, file, line);\n    return value_;"
         bodies.append(f"{entry.result} OpenGLErrorChecker::{entry.operation}({entry.full_declarations}) {{\n"
                       f"{lines}\n}}")
     return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"

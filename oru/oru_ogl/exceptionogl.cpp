@@ -11,10 +11,10 @@ ExceptionOGL::ExceptionOGL(char const *file, unsigned int line, char const *mess
     : LogicalException(file, static_cast<int>(line), message), errorNumber_(errorNumber) {}
 
 ExceptionOGL::ExceptionOGL(ExceptionOGL const &other) = default;
-ExceptionOGL::ExceptionOGL(ExceptionOGL &&other) = default;
+ExceptionOGL::ExceptionOGL(ExceptionOGL &&other) noexcept = default;
 ExceptionOGL::~ExceptionOGL() = default;
 ExceptionOGL &ExceptionOGL::operator=(ExceptionOGL const &other) = default;
-ExceptionOGL &ExceptionOGL::operator=(ExceptionOGL &&other) = default;
+ExceptionOGL &ExceptionOGL::operator=(ExceptionOGL &&other) noexcept = default;
 
 ExceptionBase *ExceptionOGL::clone() const {
     return ORU_NEW ExceptionOGL(*this);

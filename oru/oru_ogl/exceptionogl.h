@@ -15,11 +15,11 @@ public:
     ExceptionOGL(char const *file, unsigned int line, char const *message,
                  unsigned int errorNumber);
     ExceptionOGL(ExceptionOGL const &other);
-    ExceptionOGL(ExceptionOGL &&other);
+    ExceptionOGL(ExceptionOGL &&other) noexcept;
     ~ExceptionOGL() override;
 
     ExceptionOGL &operator=(ExceptionOGL const &other);
-    ExceptionOGL &operator=(ExceptionOGL &&other);
+    ExceptionOGL &operator=(ExceptionOGL &&other) noexcept;
 
     ExceptionBase *clone() const override;
 

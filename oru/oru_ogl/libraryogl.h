@@ -40,7 +40,7 @@ public:
     ///         is), or, after all is cleaned up, when the layer was not open
     static void Terminate();
 
-    Library &operator=(Library const &) { return *this; }
+    Library &operator=(Library const &) = default;
 
 private:
     static bool sIsInitialized_;

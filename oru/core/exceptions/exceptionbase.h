@@ -22,7 +22,9 @@ public:
     explicit ExceptionBase(char const *text);
 
     ExceptionBase(ExceptionBase const &) = default;
+    ExceptionBase(ExceptionBase &&) noexcept = default;
     ExceptionBase &operator=(ExceptionBase const &) = default;
+    ExceptionBase &operator=(ExceptionBase &&) noexcept = default;
     ~ExceptionBase() override;
 
     /// The what-text, valid as long as the object lives.

@@ -20,7 +20,9 @@ public:
     LogicalException(char const *file, int line, char const *message);
 
     LogicalException(LogicalException const &) = default;
+    LogicalException(LogicalException &&) noexcept = default;
     LogicalException &operator=(LogicalException const &) = default;
+    LogicalException &operator=(LogicalException &&) noexcept = default;
     ~LogicalException() override;
 
     /// Source file of the failure, valid as long as the object lives.

@@ -5,6 +5,8 @@
 #include "oru/oru_ogl/extensionator/openglerrorchecker.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <atomic>
+
 namespace ORU {
 namespace OGL {
 
@@ -12,8 +14,11 @@ namespace OGL {
 [[noreturn]] ORU_COLD void ThrowOpenGLError(char const *file, unsigned int line,
                                             unsigned int error);
 
-inline void OpenGLErrorChecker::check(char const *file, unsigned int line) const {
-    if (insideBeginEnd_.load(std::memory_order_relaxed))
+/// Throws when the call before left an error; asks nothing inside glBegin and glEnd, where OpenGL
+/// allows no query.
+inline void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const *file,
+                             unsigned int line) {
+    if (insideBeginEnd.load(std::memory_order_relaxed))
         return;
     if (GLenum const error = ::glGetError())
         ThrowOpenGLError(file, line, error);

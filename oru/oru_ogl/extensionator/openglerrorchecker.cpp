@@ -62,13 +62,13 @@ void OpenGLErrorChecker::cgmEnd(char const *file, unsigned int line) {
         throw ExceptionOGL(file, line, "Unbalanced glEnd()!", 0);
     insideBeginEnd_.store(false, std::memory_order_relaxed);
     ::glEnd();
-    check(file, line);
+    CheckOpenGLError(insideBeginEnd_, file, line);
 }
 
 GLenum OpenGLErrorChecker::cgmGetError(char const *file, unsigned int line) {
     // The check asks again: it reports a second pending error, the first is the caller's result.
     GLenum const error = ::glGetError();
-    check(file, line);
+    CheckOpenGLError(insideBeginEnd_, file, line);
     return error;
 }
 

@@ -27,8 +27,6 @@ public:
 #include "oru/oru_ogl/extensionator/gloperations.inc"
 
 private:
-    void check(char const *file, unsigned int line) const;
-
     /// True between `cgmBegin` and `cgmEnd`; relaxed accesses, which cost what a plain bool costs.
     std::atomic<bool> insideBeginEnd_{false};
 };

@@ -23,7 +23,7 @@ public:
 private:
     HDC deviceContext_;
     HGLRC renderContext_;
-    bool restore_;
+    [[maybe_unused]] bool restore_;
 };
 
 /// Makes no context current on the calling thread.

@@ -124,10 +124,12 @@ TEST(ContextKinds, WorkOnSeveralThreadsAtOnce) {
     AutoInitializer library;
     ContextOffscreen parent;
     std::vector<std::unique_ptr<ContextOffscreen>> contexts;
+    contexts.reserve(6);
     for (int i = 0; i < 6; ++i)
         contexts.push_back(std::make_unique<ContextOffscreen>(&parent));
     std::vector<unsigned int> pixels(contexts.size());
     std::vector<std::thread> threads;
+    threads.reserve(contexts.size());
     for (std::size_t i = 0; i < contexts.size(); ++i)
         threads.emplace_back([&, i] {
             contexts[i]->makeCurrent();

@@ -131,7 +131,7 @@ TEST(PixelFormats, LeaveInitializeAsLogicalExceptions) {
                                    static_cast<Context::Multisampling>(2), nullptr);
         ADD_FAILURE() << "a single-buffered multisampled context was made";
     } catch (ORU::LogicalException const &e) {
-        EXPECT_TRUE(typeid(e) == typeid(ORU::LogicalException));
+        EXPECT_STREQ(typeid(ORU::LogicalException).name(), typeid(e).name());
         EXPECT_STREQ("ORU Internal exception", e.what()) << "the text of what was caught stays";
         EXPECT_STREQ("oru/oru_ogl/ogl/context_win.cpp", e.file());
     }

@@ -156,6 +156,7 @@ TEST(DeviceRecord, IsOneForThreadsThatBuildItAtOnce) {
         std::atomic<int> waiting{8};
         std::vector<ExtensionManager *> records(8);
         std::vector<std::thread> threads;
+        threads.reserve(8);
         for (auto &record : records)
             threads.emplace_back([&] {
                 --waiting;
@@ -220,10 +221,12 @@ TEST(ContextRegistry, FindsManyContextsFromManyThreads) {
     AutoInitializer library;
     ContextOffscreen first;
     std::vector<std::unique_ptr<ContextOffscreen>> contexts;
+    contexts.reserve(40);
     for (int i = 0; i < 40; ++i)
         contexts.push_back(std::make_unique<ContextOffscreen>(&first));
     ExtensionManager *const record = ExtensionManager::Instance(&first);
     std::vector<std::thread> threads;
+    threads.reserve(4);
     std::atomic<int> wrong{0};
     for (int t = 0; t < 4; ++t)
         threads.emplace_back([&, t] {
