@@ -1,0 +1,211 @@
+// Buffer objects: storage of the OpenGL implementation for pixels and vertices.
+#include "oru/oru_ogl/ogl/bufferogl.h"
+
+#include "oru/core/utility/composetext.h"
+#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/ending.h"
+#include "oru/oru_ogl/ogl/internal/release.h"
+#include "oru/oru_ogl/ogl/internal/supported.h"
+#include "oru/oru_ogl/ogl/internal/translation.h"
+#include "oru/oru_ogl/platformgl.h"
+
+namespace ORU {
+namespace OGL {
+
+namespace {
+
+struct TypeRow {
+    Buffer::Type value;
+    unsigned int gl;
+    unsigned int binding;
+};
+
+#define ORU_TYPE(Name)                                                                             \
+    { Buffer::TYPE_##Name, GL_##Name, GL_##Name##_BINDING }
+constexpr internal::Translation<Buffer::Type, 4, TypeRow> kTypes = {
+    ORU_TRANSLATION_FAILURE("Buffer type enums are not all properly translated."),
+    {ORU_TYPE(PIXEL_UNPACK_BUFFER), ORU_TYPE(PIXEL_PACK_BUFFER), ORU_TYPE(ARRAY_BUFFER),
+     ORU_TYPE(ELEMENT_ARRAY_BUFFER)}};
+#undef ORU_TYPE
+static_assert(kTypes.isInOrder());
+
+#define ORU_USAGE(Name)                                                                            \
+    { Buffer::USAGE_##Name, GL_##Name }
+constexpr internal::Translation<Buffer::Usage, 9> kUsages = {
+    ORU_TRANSLATION_FAILURE("Buffer type enums are not all properly translated."),
+    {ORU_USAGE(STREAM_DRAW), ORU_USAGE(STREAM_READ), ORU_USAGE(STREAM_COPY), ORU_USAGE(STATIC_DRAW),
+     ORU_USAGE(STATIC_READ), ORU_USAGE(STATIC_COPY), ORU_USAGE(DYNAMIC_DRAW),
+     ORU_USAGE(DYNAMIC_READ), ORU_USAGE(DYNAMIC_COPY)}};
+#undef ORU_USAGE
+static_assert(kUsages.isInOrder());
+
+} // namespace
+
+Buffer::Buffer(std::int64_t size, Type type, Usage usage, void const *data)
+    : Object(GL_PIXEL_UNPACK_BUFFER, GL_PIXEL_UNPACK_BUFFER_BINDING), size_(size),
+      usagePolicy_(usage) {
+    ORU_ASSERT_SUPPORTED(GL_ARB_PIXEL_BUFFER_OBJECT);
+    ORU_ASSERT_SUPPORTED(GL_ARB_VERTEX_BUFFER_OBJECT);
+    if (size < 1)
+        ORU_THROW_INTERNAL("Range error: nSize > 0");
+    ORU_GL(GenBuffers, 1, &objectID_);
+    ORU_ASSERT(objectID_ != 0);
+    try {
+        setTarget(type);
+        fill(data);
+    } catch (...) {
+        deleteObject();
+        throw;
+    }
+}
+
+Buffer::~Buffer() {
+    deleteObject();
+}
+
+void Buffer::deleteObject() noexcept {
+    internal::Release([this] { ORU_GL(DeleteBuffers, 1, &objectID_); });
+}
+
+void Buffer::setTarget(Type type) {
+    switch (type) {
+    case TYPE_PIXEL_UNPACK_BUFFER:
+        return convertToUnpackBuffer();
+    case TYPE_PIXEL_PACK_BUFFER:
+        return convertToPackBuffer();
+    case TYPE_ARRAY_BUFFER:
+        return convertToArrayBuffer();
+    case TYPE_ELEMENT_ARRAY_BUFFER:
+        return convertToElementArrayBuffer();
+    }
+}
+
+void Buffer::fill(void const *data) {
+    unsigned int const previous = getBoundID();
+    bind();
+    internal::Ending restore([&] { ORU_GL(BindBuffer, target(), previous); });
+    ORU_GL(BufferData, target(), size_, data, Usage2GL(usagePolicy_));
+    restore.now();
+}
+
+void Buffer::bind() {
+    ORU_GL(BindBuffer, target(), objectID_);
+}
+
+void Buffer::BindDefaultArrayBuffer() {
+    ORU_GL(BindBuffer, GL_ARRAY_BUFFER, 0);
+}
+
+void Buffer::BindDefaultElementArrayBuffer() {
+    ORU_GL(BindBuffer, GL_ELEMENT_ARRAY_BUFFER, 0);
+}
+
+void Buffer::BindDefaultPackBuffer() {
+    ORU_GL(BindBuffer, GL_PIXEL_PACK_BUFFER, 0);
+}
+
+void Buffer::BindDefaultUnpackBuffer() {
+    ORU_GL(BindBuffer, GL_PIXEL_UNPACK_BUFFER, 0);
+}
+
+void Buffer::convertTo(Type type, char const *failure) {
+    if (isBound())
+        ORU_THROW_INTERNAL(failure);
+    TypeRow const &row = *kTypes.find(type);
+    changeTarget(row.gl, row.binding);
+}
+
+void Buffer::convertToArrayBuffer() {
+    convertTo(TYPE_ARRAY_BUFFER,
+              "Buffer::convertToArrayBuffer cannot convert buffer target while bound");
+}
+
+void Buffer::convertToElementArrayBuffer() {
+    convertTo(TYPE_ELEMENT_ARRAY_BUFFER,
+              "Buffer::convertToElementArrayBuffer cannot convert buffer target while bound");
+}
+
+void Buffer::convertToPackBuffer() {
+    convertTo(TYPE_PIXEL_PACK_BUFFER,
+              "Buffer::convertToPackBuffer cannot convert buffer target while bound");
+}
+
+void Buffer::convertToUnpackBuffer() {
+    convertTo(TYPE_PIXEL_UNPACK_BUFFER,
+              "Buffer::convertToUnpackBuffer cannot convert buffer target while bound");
+}
+
+void *Buffer::map(unsigned int access) {
+    if (mapped_)
+        ORU_THROW_INTERNAL("Buffer is already mapped (this will cause a GL error)");
+    void *const address = ORU_GL(MapBuffer, target(), access);
+    mapped_ = true;
+    return address;
+}
+
+void Buffer::unmap() {
+    if (!mapped_)
+        ORU_THROW_INTERNAL("Buffer must be mapped before umapping it (this will cause a GL error)");
+    if (!ORU_GL(UnmapBuffer, target()))
+        ORU_THROW_INTERNAL("Cannot unmap buffer");
+    mapped_ = false;
+}
+
+void Buffer::checkTransfer(char const *operation, std::int64_t offset, void const *data) const {
+    if (mapped_)
+        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " buffer cannot be mapped"));
+    if (!data)
+        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " pointer to data must not be NULL"));
+    if (offset < 0)
+        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " offset must not be negative"));
+}
+
+void Buffer::subData(std::int64_t offset, std::int64_t size, void const *data) {
+    checkTransfer("subData", offset, data);
+    ORU_GL(BufferSubData, target(), offset, size, data);
+}
+
+void Buffer::getSubData(std::int64_t offset, std::int64_t size, void *data) {
+    checkTransfer("getSubData", offset, data);
+    ORU_GL(GetBufferSubData, target(), offset, size, data);
+}
+
+bool Buffer::isArrayBuffer() const {
+    return target() == GL_ARRAY_BUFFER;
+}
+
+bool Buffer::isElementArrayBuffer() const {
+    return target() == GL_ELEMENT_ARRAY_BUFFER;
+}
+
+bool Buffer::isPackBuffer() const {
+    return target() == GL_PIXEL_PACK_BUFFER;
+}
+
+bool Buffer::isUnpackBuffer() const {
+    return target() == GL_PIXEL_UNPACK_BUFFER;
+}
+
+unsigned int Buffer::Type2GL(Type type) {
+    return kTypes.toGL(type);
+}
+
+Buffer::Type Buffer::GL2Type(unsigned int target) {
+    return kTypes.fromGL(target);
+}
+
+unsigned int Buffer::Usage2GL(Usage usage) {
+    return kUsages.toGL(usage);
+}
+
+Buffer::Usage Buffer::GL2Usage(unsigned int usage) {
+    return kUsages.fromGL(usage);
+}
+
+bool Buffer::IsSupported() {
+    return internal::Supports(GL_ARB_PIXEL_BUFFER_OBJECT) &&
+           internal::Supports(GL_ARB_VERTEX_BUFFER_OBJECT);
+}
+
+} // namespace OGL
+} // namespace ORU

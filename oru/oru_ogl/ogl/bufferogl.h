@@ -1,0 +1,143 @@
+// Buffer objects: storage of the OpenGL implementation for pixels and vertices.
+#pragma once
+
+#include "oru/oru_ogl/ogl/object.h"
+
+#include <cstdint>
+
+namespace ORU {
+namespace OGL {
+
+/// One OpenGL buffer object, used as pixel unpack, pixel pack, array or element array buffer.
+///
+/// `map`, `unmap`, `subData` and `getSubData` act on what is bound to the buffer's target and do
+/// not bind: call `bind()` first.
+///
+///     Buffer pixels(width * height * 4, Buffer::TYPE_PIXEL_UNPACK_BUFFER,
+///                   Buffer::USAGE_STREAM_DRAW, nullptr);
+///     pixels.bind();
+///     std::memcpy(pixels.map(GL_WRITE_ONLY), source, pixels.size());
+///     pixels.unmap();
+///     Buffer::BindDefaultUnpackBuffer();
+///
+/// GL functions of version 2.1, or GL_ARB_vertex_buffer_object and GL_ARB_pixel_buffer_object.
+class ORU_API Buffer : public Object {
+public:
+    enum Type : unsigned int {
+        TYPE_PIXEL_UNPACK_BUFFER = 0, ///< pixels on their way into a texture
+        TYPE_PIXEL_PACK_BUFFER,       ///< pixels on their way out of a texture or framebuffer
+        TYPE_ARRAY_BUFFER,            ///< vertices
+        TYPE_ELEMENT_ARRAY_BUFFER     ///< vertex indices
+    };
+
+    /// How often the store changes, and who reads it.
+    enum Usage : unsigned int {
+        USAGE_STREAM_DRAW = 0,
+        USAGE_STREAM_READ,
+        USAGE_STREAM_COPY,
+        USAGE_STATIC_DRAW,
+        USAGE_STATIC_READ,
+        USAGE_STATIC_COPY,
+        USAGE_DYNAMIC_DRAW,
+        USAGE_DYNAMIC_READ,
+        USAGE_DYNAMIC_COPY
+    };
+
+    /// Makes a buffer and its store. What was bound to the target stays bound.
+    /// @param size bytes, at least 1
+    /// @param type a number that is no Type makes a pixel unpack buffer
+    /// @param data `size` bytes to fill the store with, or null for one without contents
+    /// @throws InternalException without the two extensions, or for a size below 1; ExceptionOGL
+    ///         when there is no memory
+    /// @note glGenBuffers, glBufferData
+    Buffer(std::int64_t size, Type type, Usage usage, void const *data);
+
+    /// Deletes the buffer, which need not be unmapped. @note glDeleteBuffers
+    ~Buffer() override;
+
+    /// @note glBindBuffer
+    void bind();
+
+    /// @name Bind no buffer to a target
+    /// @note glBindBuffer
+    /// @{
+    static void BindDefaultArrayBuffer();
+    static void BindDefaultElementArrayBuffer();
+    static void BindDefaultPackBuffer();
+    static void BindDefaultUnpackBuffer();
+    /// @}
+
+    /// @name Change the target the buffer is used with
+    /// The store stays as it is.
+    /// @throws InternalException while the buffer is bound to its present target
+    /// @note glGetIntegerv
+    /// @{
+    void convertToArrayBuffer();
+    void convertToElementArrayBuffer();
+    void convertToPackBuffer();
+    void convertToUnpackBuffer();
+    /// @}
+
+    /// Maps the whole store into memory.
+    /// @param access GL_READ_ONLY, GL_WRITE_ONLY or GL_READ_WRITE
+    /// @return `size()` bytes, valid until `unmap()`
+    /// @throws InternalException when mapped already
+    /// @note glMapBuffer
+    void *map(unsigned int access);
+
+    /// @throws InternalException when not mapped, or when the system has lost the contents, after
+    ///         which the buffer still counts as mapped
+    /// @note glUnmapBuffer
+    void unmap();
+
+    bool isMapped() const { return mapped_; }
+
+    /// Writes a range of the store.
+    /// @param offset, size bytes; a range that leaves the store is an ExceptionOGL
+    /// @param data `size` bytes
+    /// @throws InternalException while mapped, for a null pointer or a negative offset
+    /// @note glBufferSubData
+    void subData(std::int64_t offset, std::int64_t size, void const *data);
+
+    /// Reads a range of the store; parameters and failures as `subData`.
+    /// @note glGetBufferSubData
+    void getSubData(std::int64_t offset, std::int64_t size, void *data);
+
+    bool isArrayBuffer() const;
+    bool isElementArrayBuffer() const;
+    bool isPackBuffer() const;
+    bool isUnpackBuffer() const;
+
+    /// Size of the store in bytes.
+    std::uint64_t size() const { return static_cast<std::uint64_t>(size_); }
+    Usage usagePolicy() const { return usagePolicy_; }
+
+    /// Kept for hosts that call it; there is nothing to verify.
+    void verifyCurrentBufferObject() const {}
+
+    /// @name Translations to and from GL targets and usages
+    /// @throws InternalException for a value outside the enumeration
+    /// @{
+    static unsigned int Type2GL(Type type);
+    static Type GL2Type(unsigned int target);
+    static unsigned int Usage2GL(Usage usage);
+    static Usage GL2Usage(unsigned int usage);
+    /// @}
+
+    /// Whether the current context has pixel and vertex buffer objects; false without a context.
+    static bool IsSupported();
+
+private:
+    void setTarget(Type type);
+    void convertTo(Type type, char const *failure);
+    void fill(void const *data);
+    void deleteObject() noexcept;
+    void checkTransfer(char const *operation, std::int64_t offset, void const *data) const;
+
+    std::int64_t size_;
+    Usage usagePolicy_;
+    bool mapped_ = false;
+};
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,24 @@
+// Deleting GL objects in destructors.
+#pragma once
+
+#include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/ogl/internal/dropexceptions.h"
+
+namespace ORU {
+namespace OGL {
+namespace internal {
+
+/// Runs the step of a destructor that deletes GL objects, and drops what it throws. Without a
+/// current context, in which no entry point beyond OpenGL 1.1 has an address, it does nothing: the
+/// objects went with their context.
+template<class Step>
+void Release(Step step) noexcept {
+    DropExceptions([&] {
+        if (ORU_WGL0(GetCurrentContext))
+            step();
+    });
+}
+
+} // namespace internal
+} // namespace OGL
+} // namespace ORU

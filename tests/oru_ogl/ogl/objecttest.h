@@ -1,0 +1,96 @@
+// What tests of GL objects share: the fixture that counts names, and expected failures.
+#pragma once
+
+#include "../glfixture.h"
+
+#include "oru/core/exceptions/logicalexception.h"
+#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
+
+#include <optional>
+#include <set>
+#include <sstream>
+#include <string>
+#include <vector>
+
+namespace oru_test {
+
+/// The message of the exception that a call throws, empty when it throws none.
+template<class Call>
+std::string MessageOf(Call call) {
+    try {
+        call();
+    } catch (ORU::LogicalException const &e) {
+        return e.message();
+    }
+    return "";
+}
+
+/// Follows the names of GL objects from generation to deletion.
+class NameLedger : public ORU::OGL::OpenGLForwarder {
+public:
+#define ORU_FOLLOW(Objects)                                                                        \
+    void cgmGen##Objects(char const *file, unsigned int line, GLsizei n, GLuint *names) override { \
+        OpenGLForwarder::cgmGen##Objects(file, line, n, names);                                    \
+        add(#Objects, n, names);                                                                   \
+    }                                                                                              \
+    void cgmDelete##Objects(char const *file, unsigned int line, GLsizei n, GLuint const *names)   \
+        override {                                                                                 \
+        remove(#Objects, n, names);                                                                \
+        OpenGLForwarder::cgmDelete##Objects(file, line, n, names);                                 \
+    }
+    ORU_FOLLOW(Buffers)
+    ORU_FOLLOW(FramebuffersEXT)
+    ORU_FOLLOW(RenderbuffersEXT)
+    ORU_FOLLOW(Textures)
+#undef ORU_FOLLOW
+
+    int made() const {
+        return made_;
+    }
+
+    /// The names that were not deleted or deleted twice, empty when all is well.
+    std::string leaks() const {
+        std::ostringstream text;
+        for (auto const &name : alive_)
+            text << name.first << " " << name.second << " lives; ";
+        return text.str() + faults_;
+    }
+
+private:
+    using Name = std::pair<std::string, GLuint>;
+
+    void add(char const *kind, GLsizei n, GLuint const *names) {
+        for (GLsizei i = 0; i < n; ++i)
+            alive_.insert(Name(kind, names[i]));
+        made_ += n;
+    }
+    void remove(char const *kind, GLsizei n, GLuint const *names) {
+        for (GLsizei i = 0; i < n; ++i) {
+            if (!alive_.erase(Name(kind, names[i])))
+                faults_ += std::string(kind) + " deleted that were not made; ";
+        }
+    }
+
+    std::set<Name> alive_;
+    std::string faults_;
+    int made_ = 0;
+};
+
+/// Every test ends with the names deleted that it made.
+class ObjectTest : public OffscreenTest {
+protected:
+    void SetUp() override {
+        OffscreenTest::SetUp();
+        ledger_.emplace();
+    }
+    void TearDown() override {
+        EXPECT_EQ("", (*ledger_)->leaks());
+        ledger_.reset();
+        OffscreenTest::TearDown();
+    }
+
+private:
+    std::optional<Pushed<NameLedger>> ledger_;
+};
+
+} // namespace oru_test
