@@ -78,7 +78,7 @@ fetch_source() {
     (cd "$into/$package.download" && apt_source source --only-source "$package") || return 1
     local unpacked
     unpacked=$(find "$into/$package.download" -mindepth 1 -maxdepth 1 -type d)
-    mv "$unpacked" "$into/$package"
+    mv "$unpacked" "$into/$package" || return 1
     rm -rf "$into/$package.download"
 }
 
@@ -99,19 +99,21 @@ cross_build() { # NAME SOURCE CMAKE_ARGUMENT...
     rm -rf "$build"
 }
 
-# dependency NAME PACKAGE CMAKE_ARGUMENT...: fetches, builds and installs one library, once for each
-# change of what is said here.
+# dependency NAME PACKAGE CMAKE_ARGUMENT...: fetches, builds and installs one library, and again when its
+# arguments, the way it is built or the toolchain file change.
 dependency() {
     local name=$1 package=$2
     shift 2
-    local stamp=$ORU_DEPS_DIR/stamps/$name recipe="$package $*"
+    local stamp=$ORU_DEPS_DIR/stamps/$name recipe
+    recipe="$package $* $(declare -f cross_build | cat - "$ORU_ROOT/cmake/toolchain-mingw64.cmake" | cksum)"
     [ "$(cat "$stamp" 2>/dev/null)" != "$recipe" ] || return 0
     local source=$ORU_DEPS_DIR/src/$package
     if [ "$package" = googletest ]; then
         source=/usr/src/googletest
     elif [ ! -f "$source/CMakeLists.txt" ]; then
-        [ -s "$ORU_DEPS_DIR/apt/sources.list" ] ||
-            logged apt-sources "Preparing a list of Debian's source packages in build/deps" prepare_source_list
+        [ -n "${ORU_SOURCES_LISTED:-}" ] ||
+            logged apt-sources "Listing Debian's source packages (in build/deps)" prepare_source_list
+        ORU_SOURCES_LISTED=yes
         logged "fetch-$name" "Fetching the Debian source of $name" fetch_source "$package"
     fi
     logged "dep-$name" "Cross-building $name" cross_build "$name" "$source" "$@"
