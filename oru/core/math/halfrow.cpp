@@ -1,0 +1,133 @@
+// Conversion of whole rows between half and single precision.
+#include "oru/core/math/halfrow.h"
+
+#include <immintrin.h>
+#if defined(_MSC_VER) && !defined(__clang__)
+#include <intrin.h>
+#define ORU_TARGET(features)
+#else
+#include <cpuid.h>
+#define ORU_TARGET(features) __attribute__((target(features)))
+#endif
+
+// The processor's conversion instructions serve eight values at a time where they agree with the
+// class; a block with any value on which they differ goes through the class. They differ on
+// signalling NaNs to float, which they make quiet, and to half on ties, on the sign of zeros, on
+// denormals, overflow and NaNs. Of these ties are mended by rounding before the instruction cuts;
+// the rest is rare in pictures.
+
+namespace ORU {
+
+namespace {
+
+void ScalarToFloat(half const *source, float *target, std::size_t count) {
+    for (std::size_t i = 0; i < count; ++i)
+        target[i] = source[i];
+}
+
+void ScalarToHalf(float const *source, half *target, std::size_t count) {
+    for (std::size_t i = 0; i < count; ++i)
+        target[i] = source[i];
+}
+
+ORU_TARGET("avx,f16c")
+void VectorToFloat(half const *source, float *target, std::size_t count) {
+    __m128i const magnitude = _mm_set1_epi16(0x7FFF);
+    __m128i const infinity = _mm_set1_epi16(0x7C00);
+    __m128i const quiet = _mm_set1_epi16(0x7E00);
+    std::size_t i = 0;
+    for (; i + 8 <= count; i += 8) {
+        __m128i const bits = _mm_loadu_si128(reinterpret_cast<__m128i const *>(source + i));
+        __m128i const size = _mm_and_si128(bits, magnitude);
+        __m128i const signalling =
+            _mm_and_si128(_mm_cmpgt_epi16(size, infinity), _mm_cmplt_epi16(size, quiet));
+        if (_mm_movemask_epi8(signalling))
+            ScalarToFloat(source + i, target + i, 8);
+        else
+            _mm256_storeu_ps(target + i, _mm256_cvtph_ps(bits));
+    }
+    ScalarToFloat(source + i, target + i, count - i);
+}
+
+ORU_TARGET("avx2,f16c")
+void VectorToHalf(float const *source, half *target, std::size_t count) {
+    // From 2^-14, the smallest normal half, to below 65520, which rounds up to infinity.
+    __m256i const magnitude = _mm256_set1_epi32(0x7FFFFFFF);
+    __m256i const belowNormal = _mm256_set1_epi32(0x387FFFFF);
+    __m256i const overflow = _mm256_set1_epi32(0x477FF000);
+    __m256i const halfPlace = _mm256_set1_epi32(0x1000);
+    __m256i const zero = _mm256_setzero_si256();
+    std::size_t i = 0;
+    for (; i + 8 <= count; i += 8) {
+        __m256i const bits = _mm256_castps_si256(_mm256_loadu_ps(source + i));
+        __m256i const size = _mm256_and_si256(bits, magnitude);
+        __m256i const isNormal = _mm256_and_si256(_mm256_cmpgt_epi32(size, belowNormal),
+                                                  _mm256_cmpgt_epi32(overflow, size));
+        __m256i const isPlain = _mm256_or_si256(isNormal, _mm256_cmpeq_epi32(bits, zero));
+        if (_mm256_movemask_epi8(isPlain) != -1) {
+            ScalarToHalf(source + i, target + i, 8);
+            continue;
+        }
+        __m256 const rounded = _mm256_castsi256_ps(_mm256_add_epi32(bits, halfPlace));
+        _mm_storeu_si128(reinterpret_cast<__m128i *>(target + i),
+                         _mm256_cvtps_ph(rounded, _MM_FROUND_TO_ZERO | _MM_FROUND_NO_EXC));
+    }
+    ScalarToHalf(source + i, target + i, count - i);
+}
+
+/// What the processor and the system offer (Intel 64 manual, volume 1, 14.3 and 14.4).
+struct Processor {
+    bool hasF16C = false;
+    bool hasAVX2 = false;
+
+    Processor() {
+        unsigned registers[4];
+        Query(1, registers);
+        bool const usesXSave = (registers[2] >> 27) & 1;
+        bool const hasAVX = (registers[2] >> 28) & 1;
+        bool const converts = (registers[2] >> 29) & 1;
+        // The system must save the wide registers, too.
+        hasF16C = usesXSave && hasAVX && converts && (EnabledStates() & 6) == 6;
+        Query(7, registers);
+        hasAVX2 = hasF16C && ((registers[1] >> 5) & 1);
+    }
+
+private:
+    /// eax, ebx, ecx, edx of a leaf; zeros when the processor does not have it.
+    static void Query(unsigned leaf, unsigned (&registers)[4]) {
+#if defined(_MSC_VER) && !defined(__clang__)
+        int values[4];
+        __cpuid(values, 0);
+        bool const isKnown = static_cast<unsigned>(values[0]) >= leaf;
+        __cpuidex(values, static_cast<int>(leaf), 0);
+        for (int i = 0; i < 4; ++i)
+            registers[i] = isKnown ? static_cast<unsigned>(values[i]) : 0;
+#else
+        registers[0] = registers[1] = registers[2] = registers[3] = 0;
+        __get_cpuid_count(leaf, 0, &registers[0], &registers[1], &registers[2], &registers[3]);
+#endif
+    }
+
+    ORU_TARGET("xsave") static unsigned EnabledStates() {
+        return static_cast<unsigned>(_xgetbv(0));
+    }
+};
+
+using ToFloat = void (*)(half const *, float *, std::size_t);
+using ToHalf = void (*)(float const *, half *, std::size_t);
+
+Processor const gProcessor;
+ToFloat const gToFloat = gProcessor.hasF16C ? VectorToFloat : ScalarToFloat;
+ToHalf const gToHalf = gProcessor.hasAVX2 ? VectorToHalf : ScalarToHalf;
+
+} // namespace
+
+void HalfToFloat(half const *source, float *target, std::size_t count) {
+    gToFloat(source, target, count);
+}
+
+void FloatToHalf(float const *source, half *target, std::size_t count) {
+    gToHalf(source, target, count);
+}
+
+} // namespace ORU
