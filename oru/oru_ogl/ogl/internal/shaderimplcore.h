@@ -1,0 +1,35 @@
+// The shader body that drives the entry points of OpenGL 2.0.
+#pragma once
+
+#include "oru/oru_ogl/ogl/internal/shaderimpl.h"
+#include "oru/oru_ogl/ogl/shader.h"
+
+namespace ORU {
+namespace OGL {
+
+/// A body that owns one OpenGL shader object.
+class ORU_API ShaderImplCore : public ShaderImpl {
+public:
+    explicit ShaderImplCore(Shader::ShaderType eShaderType);
+    ~ShaderImplCore() override;
+
+    static bool IsSupported(Shader::ShaderType type);
+
+    void compile(bool throwOnFailure) override;
+    void getInfoLog(int maxLength, char *buffer) override;
+    int getInfoLogLength() const override;
+    bool isCompiled() const override;
+    bool isLoaded() const override;
+    void load(std::string const &source) override;
+    void load(unsigned int count, char const *const *strings, int const *lengths) override;
+
+    unsigned int shaderID() const { return shaderID_; }
+
+private:
+    int parameter(unsigned int name) const;
+
+    unsigned int shaderID_ = 0;
+};
+
+} // namespace OGL
+} // namespace ORU

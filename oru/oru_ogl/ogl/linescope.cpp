@@ -1,0 +1,104 @@
+// Line smoothing, stippling and width changed for a scope.
+#include "oru/oru_ogl/ogl/linescope.h"
+
+#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/release.h"
+#include "oru/oru_ogl/platformgl.h"
+
+namespace ORU {
+namespace OGL {
+
+using internal::Release;
+
+namespace {
+
+bool IsOn(GLenum name) {
+    GLboolean value = GL_FALSE;
+    ORU_GL(GetBooleanv, name, &value);
+    return value != GL_FALSE;
+}
+
+void Apply(bool enable, int factor, unsigned short pattern) {
+    if (enable) {
+        ORU_GL(Enable, GL_LINE_STIPPLE);
+        ORU_GL(LineStipple, factor, pattern);
+    } else {
+        ORU_GL(Disable, GL_LINE_STIPPLE);
+    }
+}
+
+} // namespace
+
+void LineSmoothState::getLineSmoothState() {
+    enabled = IsOn(GL_LINE_SMOOTH);
+}
+
+TemporaryLineSmoothScope::TemporaryLineSmoothScope() {
+    saved_.getLineSmoothState();
+    if (!saved_.enabled)
+        ORU_GL(Enable, GL_LINE_SMOOTH);
+    current_.getLineSmoothState();
+}
+
+TemporaryLineSmoothScope::~TemporaryLineSmoothScope() {
+    if (current_.enabled == saved_.enabled)
+        return;
+    Release([this] {
+        if (saved_.enabled)
+            ORU_GL(Enable, GL_LINE_SMOOTH);
+        else
+            ORU_GL(Disable, GL_LINE_SMOOTH);
+    });
+}
+
+void LineStippleState::setToCurrentGLValues() {
+    enabled = IsOn(GL_LINE_STIPPLE);
+    if (!enabled)
+        return;
+    ORU_GL(GetIntegerv, GL_LINE_STIPPLE_REPEAT, &factor);
+    GLint bits = 0;
+    ORU_GL(GetIntegerv, GL_LINE_STIPPLE_PATTERN, &bits);
+    pattern = static_cast<unsigned short>(bits);
+}
+
+TemporaryLineStippleScope::TemporaryLineStippleScope(unsigned char enable, int factor,
+                                                     unsigned short pattern) {
+    saved_.setToCurrentGLValues();
+    LineStippleState const wanted{enable != 0, factor, pattern};
+    bool const bothOff = !saved_.enabled && !wanted.enabled;
+    if (bothOff || saved_ == wanted)
+        current_ = wanted;
+    else
+        updateCurrentState(enable, factor, pattern);
+}
+
+TemporaryLineStippleScope::~TemporaryLineStippleScope() {
+    if (current_ == saved_)
+        return;
+    Release([this] { Apply(saved_.enabled, saved_.factor, saved_.pattern); });
+}
+
+void TemporaryLineStippleScope::updateCurrentState(unsigned char enable, int factor,
+                                                   unsigned short pattern) {
+    Apply(enable != 0, factor, pattern);
+    current_ = {enable != 0, factor, pattern};
+}
+
+void LineWidthState::setToCurrentGLValues() {
+    ORU_GL(GetFloatv, GL_LINE_WIDTH, &width);
+}
+
+TemporaryLineWidthScope::TemporaryLineWidthScope(float width) {
+    saved_.setToCurrentGLValues();
+    current_.width = width;
+    if (saved_.width != width)
+        ORU_GL(LineWidth, width);
+}
+
+TemporaryLineWidthScope::~TemporaryLineWidthScope() {
+    if (current_.width != saved_.width)
+        Release([this] { ORU_GL(LineWidth, saved_.width); });
+}
+
+} // namespace OGL
+} // namespace ORU

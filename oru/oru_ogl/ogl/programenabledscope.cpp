@@ -1,0 +1,29 @@
+// A program current for a scope.
+#include "oru/oru_ogl/ogl/programenabledscope.h"
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/oru_ogl/ogl/internal/release.h"
+#include "oru/oru_ogl/ogl/programogl.h"
+
+namespace ORU {
+namespace OGL {
+
+ProgramEnabledScope::ProgramEnabledScope(Program *theProgram) : theProgram_(theProgram) {
+    ORU_ASSERT(theProgram);
+    theProgram_->enable();
+}
+
+ProgramEnabledScope::~ProgramEnabledScope() {
+    if (theProgram_)
+        internal::Release([this] { theProgram_->disable(); });
+}
+
+void ProgramEnabledScope::enable(Program *program) {
+    ORU_ASSERT(!theProgram_);
+    ORU_ASSERT(program);
+    theProgram_ = program;
+    theProgram_->enable();
+}
+
+} // namespace OGL
+} // namespace ORU

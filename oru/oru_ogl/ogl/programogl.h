@@ -1,0 +1,173 @@
+// GLSL programs and their uniforms.
+#pragma once
+
+#include "oru/core/utility/export.h"
+#include "oru/core/utility/scopedptr.h"
+
+namespace ORU {
+namespace OGL {
+
+class ProgramImpl;
+class Shader;
+
+/// A program object: attach shaders, link, enable, set uniforms, draw.
+///
+///     Program program;
+///     program.loadVertexShader(1, &vertexSource, nullptr);
+///     program.loadFragmentShader(1, &fragmentSource, nullptr);
+///     program.link(true);
+///     program.enable();
+///     program.setUniform("gain", 0.5f);
+///
+/// Made, used and destroyed while its context, or one that shares with it, is current. It owns its
+/// OpenGL program and moves; every member of a moved-from program throws InternalException. OpenGL
+/// 2.0.
+class ORU_API Program {
+public:
+    /// @throws InternalException when the current context has no programs
+    /// @note glCreateProgram
+    Program();
+    Program(Program &&other) noexcept;
+    Program &operator=(Program &&other) noexcept;
+    /// @note glDeleteProgram; OpenGL keeps the program while it is current
+    ~Program();
+
+    /// Whether the current context has programs: OpenGL 2.0.
+    static bool IsSupported();
+
+    /// @name Shaders
+    /// @{
+
+    /// Attaches a shader, compiled or not.
+    /// @throws InternalException for a shader without a source
+    /// @note glAttachShader
+    void attach(Shader *shader);
+
+    /// @note glDetachShader
+    void detach(Shader const *shader);
+
+    /// @note glGetAttachedShaders, glDetachShader
+    void detachAllShaders();
+
+    /// Detaches up to 256 shaders of the type. @note glGetAttachedShaders, glDetachShader
+    void detachAllVertexShaders();
+    void detachAllFragmentShaders();
+
+    /// Makes a shader from a source, compiles and attaches it. A failed compilation shows when the
+    /// program is linked.
+    /// @param count, strings, lengths as Shader::load
+    void loadVertexShader(unsigned int count, char const *const *strings, int const *lengths);
+    void loadFragmentShader(unsigned int count, char const *const *strings, int const *lengths);
+    /// @}
+
+    /// @name Linking and use
+    /// @{
+
+    /// @param throwOnFailure whether a failed link throws rather than waits to be asked for; then a
+    ///        driver's note that the program will "run in software" throws too
+    /// @throws InternalException whose message holds the linker's log
+    /// @note glLinkProgram
+    void link(bool throwOnFailure);
+
+    /// A hook for bodies with work to do after a link; this one has none, and `link` calls it not.
+    void postLinkInit();
+
+    /// Whether the last link succeeded. @note glGetProgramiv
+    bool isLinked() const;
+
+    /// Whether the program can run in the current state. @note glValidateProgram
+    bool validate() const;
+
+    /// Makes the program current.
+    /// @throws InternalException when it is not linked
+    /// @note glUseProgram
+    void enable();
+
+    /// Makes no program current, whichever was. @note glUseProgram
+    void disable();
+
+    /// Whether the program is current. @note glGetIntegerv
+    bool isEnabled() const;
+
+    /// Bytes of the linker's log with its final zero; 0 when there is none.
+    /// @note glGetProgramiv
+    int getInfoLogLength() const;
+
+    /// @param maxLength bytes of the buffer
+    /// @param buffer receives the log, cut to fit, and a final zero
+    /// @note glGetProgramInfoLog
+    void getInfoLog(int maxLength, char *buffer);
+    /// @}
+
+    /// @name Attributes
+    /// @{
+
+    /// Takes effect when the program is linked next. @note glBindAttribLocation
+    void setAttributeLocation(unsigned int index, char const *name);
+
+    /// @return -1 when the linked program does not use the attribute
+    /// @note glGetAttribLocation
+    int getAttributeLocation(char const *name);
+    /// @}
+
+    /// @name Uniform queries
+    /// @{
+
+    /// @throws InternalException when not linked
+    /// @note glGetProgramiv
+    unsigned int getActiveUniformCount() const;
+
+    /// Bytes of the longest uniform's name with its final zero.
+    /// @throws InternalException when not linked
+    /// @note glGetProgramiv
+    int getMaxUniformStringLength() const;
+
+    /// @param bufSize bytes of `name`
+    /// @param size receives the number of array elements, 1 for others
+    /// @param type receives the GL type
+    /// @param name receives the name, cut to fit, and a final zero
+    /// @throws InternalException when not linked
+    /// @note glGetActiveUniform
+    void getActiveUniform(unsigned int index, int bufSize, int *size, unsigned int *type,
+                          char *name) const;
+
+    /// Asks OpenGL each time; keep the answer for a uniform that is set often.
+    /// @return -1 when the linked program does not use the uniform
+    /// @note glGetUniformLocation
+    int getUniformLocation(char const *name) const;
+
+    /// Called by the guarded setters before they upload; verifies nothing, since OpenGL itself
+    /// reports a wrong type.
+    void assertActiveUniformType(int location, unsigned int glType, unsigned int count) const;
+    /// @}
+
+    /// @name Uniform setters
+    /// Each takes the uniform as a location or as a name, which costs a query, then the values:
+    ///
+    /// | setter | values | GL call |
+    /// |---|---|---|
+    /// | `setUniform` | 1 to 4 of bool, unsigned char, int or float | glUniform{1,2,3,4}{i,f} |
+    /// | `setUniform`, `setUniform2`, `3`, `4` | a count and a pointer to int or float |
+    /// glUniform{1,2,3,4}{iv,fv} | | `setUniformSampler1D`, `2D`, `2DRECT`, `3D` | a texture unit's
+    /// index | glUniform1i | | `setUniformMatrix2`, `3`, `4` | n × n floats, whether to transpose |
+    /// glUniformMatrix{2,3,4}fv | | `setUniformMatrices2`, `3`, `4` | the same after a count |
+    /// glUniformMatrix{2,3,4}fv |
+    ///
+    /// Matrices lie column after column unless transposed. A location of -1 is ignored.
+    ///
+    /// The plain form asks whether the program is current and throws InternalException when it is
+    /// not (an array set by name is sent without asking). The form `…_Unsafe` takes that for
+    /// granted and makes the GL call at once, none for a location of -1.
+    /// @{
+#define ORU_UNIFORM_OPERATION(Name, Parameters, Arguments) void Name Parameters;
+#include "oru/oru_ogl/ogl/uniformoperations.inc"
+    /// @}
+
+private:
+    ProgramImpl &body() const;
+
+    ScopedPtr<ProgramImpl> actualProgram_;
+};
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,60 @@
+// One stage of a GLSL program: its source and its compilation.
+#include "oru/oru_ogl/ogl/shader.h"
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/oru_ogl/ogl/internal/shaderimplcore.h"
+
+namespace ORU {
+namespace OGL {
+
+Shader::Shader(ShaderType type) {
+    if (!IsSupported(type))
+        ORU_THROW_INTERNAL("Unsupported shader type");
+    if (!ShaderImplCore::IsSupported(type))
+        ORU_THROW_INTERNAL("Shader not supported by core OpenGL");
+    actualShader_.reset(ORU_NEW ShaderImplCore(type));
+}
+
+Shader::Shader(Shader &&other) noexcept = default;
+Shader &Shader::operator=(Shader &&other) noexcept = default;
+Shader::~Shader() = default;
+
+bool Shader::IsSupported(ShaderType type) {
+    return ShaderImplCore::IsSupported(type);
+}
+
+ShaderImpl &Shader::body() const {
+    ORU_ENFORCE(actualShader_ != NULL);
+    return *actualShader_;
+}
+
+void Shader::load(unsigned int count, char const *const *strings, int const *lengths) {
+    body().load(count, strings, lengths);
+}
+
+void Shader::load(std::string const &source) {
+    body().load(source);
+}
+
+bool Shader::isLoaded() const {
+    return body().isLoaded();
+}
+
+void Shader::compile(bool throwOnFailure) {
+    body().compile(throwOnFailure);
+}
+
+bool Shader::isCompiled() const {
+    return body().isCompiled();
+}
+
+int Shader::getInfoLogLength() const {
+    return body().getInfoLogLength();
+}
+
+void Shader::getInfoLog(int maxLength, char *buffer) {
+    body().getInfoLog(maxLength, buffer);
+}
+
+} // namespace OGL
+} // namespace ORU
