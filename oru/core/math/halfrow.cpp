@@ -10,8 +10,8 @@
 #define ORU_TARGET(features) __attribute__((target(features)))
 #endif
 
-// The processor's conversion instructions serve eight values at a time where they agree with the
-// class; a block with any value on which they differ goes through the class. They differ on
+// The processor's conversion instructions serve where they agree with the class; a block of values
+// with any on which they differ goes through the class. They differ on
 // signalling NaNs to float, which they make quiet, and to half on ties, on the sign of zeros, on
 // denormals, overflow and NaNs. Of these ties are mended by rounding before the instruction cuts;
 // the rest is rare in pictures.
@@ -32,19 +32,27 @@ void ScalarToHalf(float const *source, half *target, std::size_t count) {
 
 ORU_TARGET("avx,f16c")
 void VectorToFloat(half const *source, float *target, std::size_t count) {
+    std::size_t const block = 32; // one test for four vectors
     __m128i const magnitude = _mm_set1_epi16(0x7FFF);
     __m128i const infinity = _mm_set1_epi16(0x7C00);
-    __m128i const quiet = _mm_set1_epi16(0x7E00);
     std::size_t i = 0;
-    for (; i + 8 <= count; i += 8) {
-        __m128i const bits = _mm_loadu_si128(reinterpret_cast<__m128i const *>(source + i));
-        __m128i const size = _mm_and_si128(bits, magnitude);
-        __m128i const signalling =
-            _mm_and_si128(_mm_cmpgt_epi16(size, infinity), _mm_cmplt_epi16(size, quiet));
-        if (_mm_movemask_epi8(signalling))
-            ScalarToFloat(source + i, target + i, 8);
-        else
-            _mm256_storeu_ps(target + i, _mm256_cvtph_ps(bits));
+    for (; i + block <= count; i += block) {
+        auto const *const from = reinterpret_cast<__m128i const *>(source + i);
+        __m128i const a = _mm_loadu_si128(from);
+        __m128i const b = _mm_loadu_si128(from + 1);
+        __m128i const c = _mm_loadu_si128(from + 2);
+        __m128i const d = _mm_loadu_si128(from + 3);
+        __m128i const largest =
+            _mm_max_epi16(_mm_max_epi16(_mm_and_si128(a, magnitude), _mm_and_si128(b, magnitude)),
+                          _mm_max_epi16(_mm_and_si128(c, magnitude), _mm_and_si128(d, magnitude)));
+        if (_mm_movemask_epi8(_mm_cmpgt_epi16(largest, infinity))) { // a NaN of either kind
+            ScalarToFloat(source + i, target + i, block);
+            continue;
+        }
+        _mm256_storeu_ps(target + i, _mm256_cvtph_ps(a));
+        _mm256_storeu_ps(target + i + 8, _mm256_cvtph_ps(b));
+        _mm256_storeu_ps(target + i + 16, _mm256_cvtph_ps(c));
+        _mm256_storeu_ps(target + i + 24, _mm256_cvtph_ps(d));
     }
     ScalarToFloat(source + i, target + i, count - i);
 }
