@@ -7,6 +7,7 @@
 #include "oru/oru_ogl/exceptionogl.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
 
+#include <cmath>
 #include <cstdint>
 #include <cstring>
 #include <limits>
@@ -336,6 +337,38 @@ TEST(Tracer, WritesTheseLines) {
     first.cgmFlush("g", 1);
     EXPECT_EQ("g:1: glFlush()\n", other.str());
     EXPECT_EQ("", text.str());
+}
+
+// Numbers of a new stream have a formatter of their own: floats of all magnitudes, ties between two
+// last digits, both sides of powers of ten, and doubles that are no floats.
+TEST(Tracer, WritesNumbersAsTheStreamDoes) {
+    std::vector<double> numbers;
+    for (std::uint64_t pattern = 0; pattern <= 0xFFFFFFFF; pattern += 65521) {
+        auto const bits = static_cast<std::uint32_t>(pattern);
+        float number;
+        std::memcpy(&number, &bits, sizeof number);
+        numbers.push_back(static_cast<double>(number));
+    }
+    for (double number = 1000000; number < 17000000; number += 1234.5)
+        numbers.push_back(number + 0.5);
+    for (double number = 0.5; number < 1e5; number = number * 1.25 + 0.125)
+        numbers.insert(numbers.end(), {number, number + 1. / 16, number + 3. / 64, number * 1.1});
+    for (float number = 1e-9f; number < 1e21f; number *= 10)
+        for (float const side : {0.f, 1.f, 1e30f}) {
+            auto const neighbour = static_cast<double>(std::nextafter(number, side));
+            numbers.insert(numbers.end(), {neighbour, -neighbour, neighbour * (1 + 1e-12)});
+        }
+
+    Recorder recorder;
+    std::ostringstream text, expected;
+    OpenGLTracer tracer(text, &recorder);
+    for (double const number : numbers) {
+        text.str("");
+        tracer.cgmClearDepth("", 1, number);
+        expected.str("");
+        expected << ":1: glClearDepth(" << number << ")\n";
+        ASSERT_EQ(expected.str(), text.str());
+    }
 }
 
 TEST(Tracer, WritesTextsOfAnyLength) {

@@ -1,6 +1,7 @@
 // One line of the tracer's output, composed in a buffer and written at once.
 #include "oru/oru_ogl/extensionator/internal/traceline.h"
 
+#include "oru/oru_ogl/extensionator/internal/floattext.h"
 #include "oru/oru_ogl/extensionator/internal/opengltoken.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
 
@@ -171,18 +172,8 @@ void TraceLine::number(GLdouble value) {
         throughFacet(value);
         return;
     }
-    // Six digits show a whole number below a million as it is, and most numbers in traces are such.
-    if (std::fabs(value) < 1e6) {
-        auto const whole = static_cast<int>(value);
-        bool const negativeZero = whole == 0 && std::signbit(value);
-        if (static_cast<GLdouble>(whole) == value && !negativeZero) {
-            number(whole);
-            return;
-        }
-    }
     reserveNumber();
-    auto const end = position_ + kLongestNumber;
-    position_ = std::to_chars(position_, end, value, std::chars_format::general, 6).ptr;
+    position_ = WriteNumber(position_, value);
 }
 
 TraceLine &TraceLine::token(GLenum value) {
