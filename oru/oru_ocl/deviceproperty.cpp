@@ -1,0 +1,56 @@
+// With which type each device property is read.
+#include "oru/oru_ocl/deviceproperty.h"
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/oru_ocl/internal/devicepropertytable.h"
+#include "oru/oru_ocl/range.h"
+
+#include <cstddef>
+#include <cstdint>
+
+namespace ORU::OCL {
+
+namespace {
+
+struct Slot {
+    Enum::DeviceProperty property = Enum::DeviceProperty(0);
+    std::string type;
+};
+
+constexpr std::size_t firstProperty = Enum::DEVICEPROPERTY_TYPE;
+constexpr std::size_t table_size = Enum::DEVICEPROPERTY_OPENCL_C_VERSION - firstProperty + 1;
+
+Slot sTable_[table_size];
+
+Slot &SlotOf(Enum::DeviceProperty property) {
+    // A value below the first wraps to a large index.
+    std::size_t const property_index = static_cast<std::size_t>(property) - firstProperty;
+    ORU_ASSERT(property_index < table_size);
+    return sTable_[property_index];
+}
+
+#define ORU_CL_DEVICE_PROPERTY(Property, Constant, Type)                                           \
+    static_assert(Enum::Property == Constant, "a property is its constant of the headers");
+#include "oru/oru_ocl/deviceproperty_rows.inc"
+
+} // namespace
+
+void FillDevicePropertyTable() {
+    struct Row {
+        Enum::DeviceProperty property;
+        std::string const &type;
+    };
+    Row const rows[] = {
+#define ORU_CL_DEVICE_PROPERTY(Property, Constant, Type)                                           \
+    {Enum::Property, Enum::GetTypeName<Type>()},
+#include "oru/oru_ocl/deviceproperty_rows.inc"
+    };
+    for (Row const &row : rows)
+        SlotOf(row.property) = {row.property, row.type};
+}
+
+std::string const &Enum::GetPropertyTypeName(DeviceProperty property) {
+    return SlotOf(property).type;
+}
+
+} // namespace ORU::OCL

@@ -1,0 +1,31 @@
+// With which type each device property is read.
+#pragma once
+
+#include "oru/core/utility/export.h"
+#include "oru/oru_ocl/devicepropertyenum.h"
+#include "oru/oru_ocl/openclheaders.h"
+
+#include <string>
+#include <typeinfo>
+
+namespace ORU::OCL::Enum {
+
+/// A text that stands for the type `T`; equal texts mean equal types.
+template<class T>
+std::string const &GetTypeName() {
+    static std::string const name = typeid(T).name();
+    return name;
+}
+
+template<>
+inline std::string const &GetTypeName<cl_platform_id>() {
+    static std::string const name = "cl_platform_id";
+    return name;
+}
+
+/// The type name of what `Device::getInfo` reads for `property`; empty for a property that it does
+/// not read, and for all of them until `Library::Initialize` ran.
+/// @throws InternalException "property_index < table_size" for a value that is no property
+ORU_API std::string const &GetPropertyTypeName(DeviceProperty property);
+
+} // namespace ORU::OCL::Enum

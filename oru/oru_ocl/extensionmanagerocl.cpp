@@ -1,0 +1,184 @@
+// The OpenCL function table and the extensions whose entry points fill it.
+
+// The table is held against all declarations of the headers, deprecated ones included.
+#define CL_USE_DEPRECATED_OPENCL_1_0_APIS
+#define CL_USE_DEPRECATED_OPENCL_1_1_APIS
+#define CL_USE_DEPRECATED_OPENCL_1_2_APIS
+#include "oru/oru_ocl/extensionmanagerocl.h"
+
+#include "oru/core/exceptions/checks.h"
+
+#include <cstddef>
+#include <cstring>
+#include <string_view>
+#include <type_traits>
+
+#include <windows.h>
+
+namespace ORU::OCL {
+
+namespace {
+
+#define ORU_CL_SLOT(Extension, Name)                                                               \
+    static_assert(std::is_same_v<decltype(FunctionTable::Name), decltype(&::Name)>, #Name);
+#include "oru/oru_ocl/functiontable_slots.inc"
+
+struct Slot {
+    Enum::Extension extension;
+    char const *name;
+    std::size_t offset;
+};
+
+constexpr Slot slots[] = {
+#define ORU_CL_SLOT(Extension, Name) {Enum::Extension, #Name, offsetof(FunctionTable, Name)},
+#include "oru/oru_ocl/functiontable_slots.inc"
+};
+
+static_assert(sizeof(FunctionTable) == std::size(slots) * sizeof(FARPROC));
+
+/// The extensions' names; an extension's value is its index.
+constexpr char const *extensionNames[] = {
+#define ORU_CL_EXTENSION(Extension, Name) #Name,
+#include "oru/oru_ocl/extensions.inc"
+};
+
+#define ORU_CL_EXTENSION(Extension, Name)                                                          \
+    static_assert(std::string_view(extensionNames[Enum::Extension]) == #Name);
+#include "oru/oru_ocl/extensions.inc"
+
+bool IsExtension(Enum::Extension extension) {
+    return static_cast<std::size_t>(extension) < std::size(extensionNames);
+}
+
+struct Version {
+    unsigned int major = 0;
+    unsigned int minor = 0;
+};
+
+unsigned int Digit(std::string const &text, std::size_t i) {
+    return i < text.size() && text[i] >= '0' && text[i] <= '9'
+               ? static_cast<unsigned int>(text[i] - '0')
+               : 0;
+}
+
+/// The version in "OpenCL <major>.<minor> …", one digit each; 0.0 for an empty text.
+Version ParseVersion(std::string const &text) {
+    if (text.empty())
+        return {};
+    std::string const digits = text.substr(std::strlen("OpenCL "), 3);
+    return {Digit(digits, 0), Digit(digits, 2)};
+}
+
+Version PlatformVersion(FunctionTable const &table, cl_platform_id platform) {
+    std::size_t size = 0;
+    cl_int error = table.clGetPlatformInfo(platform, CL_PLATFORM_VERSION, 0, nullptr, &size);
+    ORU_ASSERT(CL_SUCCESS == error);
+    std::vector<char> bytes(size + 1);
+    error = table.clGetPlatformInfo(platform, CL_PLATFORM_VERSION, size, bytes.data(), nullptr);
+    ORU_ASSERT(CL_SUCCESS == error);
+    return ParseVersion(bytes.data());
+}
+
+std::vector<Version> PlatformVersions(FunctionTable const &table) {
+    cl_uint count = 0;
+    cl_int error = table.clGetPlatformIDs(0, nullptr, &count);
+    ORU_ASSERT(CL_SUCCESS == error);
+    std::vector<cl_platform_id> platforms(count);
+    error = table.clGetPlatformIDs(count, platforms.data(), nullptr);
+    ORU_ASSERT(CL_SUCCESS == error);
+    std::vector<Version> versions;
+    for (cl_platform_id platform : platforms)
+        versions.push_back(PlatformVersion(table, platform));
+    return versions;
+}
+
+} // namespace
+
+ExtensionManager *ExtensionManager::extMgrInstance_ = nullptr;
+
+ExtensionManager::ExtensionManager(HINSTANCE library)
+    : library_(library), table_(ORU_NEW FunctionTable) {
+    bool const isInitialized = init_CL_VERSION_1_0();
+    ORU_ASSERT(isInitialized);
+}
+
+ExtensionManager::~ExtensionManager() = default;
+
+ExtensionManager *ExtensionManager::create(HINSTANCE library) {
+    ORU_ASSERT(library);
+    ORU_ASSERT(extMgrInstance_ == 0);
+    extMgrInstance_ = ORU_NEW ExtensionManager(library);
+    ORU_ASSERT(extMgrInstance_);
+    std::vector<Version> const platformVersions = PlatformVersions(extMgrInstance_->table());
+    ORU_ASSERT(platformVersions.size() > 0);
+    // The loader exports one set of entry points for all platforms; the first platform decides, so
+    // that a caller finds the same slots however many runtimes are installed beside it.
+    Version const version = platformVersions.front();
+    if (version.major > 1 || (version.major == 1 && version.minor > 0))
+        extMgrInstance_->init_CL_VERSION_1_1();
+    return extMgrInstance_;
+}
+
+void ExtensionManager::destroy() noexcept {
+    ORUDeleter<ExtensionManager>()(extMgrInstance_);
+    extMgrInstance_ = nullptr;
+}
+
+bool ExtensionManager::resolve(Enum::Extension extension) {
+    bool complete = true;
+    for (Slot const &slot : slots) {
+        if (slot.extension != extension)
+            continue;
+        FARPROC const function = GetProcAddress(library_, slot.name);
+        std::memcpy(reinterpret_cast<char *>(table_.get()) + slot.offset, &function,
+                    sizeof function);
+        complete = complete && function;
+    }
+    return complete;
+}
+
+#define ORU_CL_EXTENSION(Extension, Name)                                                          \
+    bool ExtensionManager::init_##Name() {                                                         \
+        return resolve(Enum::Extension);                                                           \
+    }                                                                                              \
+    bool ExtensionManager::zero_##Name() {                                                         \
+        return true;                                                                               \
+    }
+#include "oru/oru_ocl/extensions.inc"
+
+bool ExtensionManager::initializeCL(Enum::Extension extension) {
+    return IsExtension(extension) && resolve(extension);
+}
+
+bool ExtensionManager::zeroSymbolsForExtensionCL(Enum::Extension extension) {
+    return IsExtension(extension);
+}
+
+void ExtensionManager::zeroAllSymbolsCL() {}
+
+Enum::Extension ExtensionManager::nameToExtensionEnum(char const *name) {
+    for (std::size_t i = 0; i < std::size(extensionNames); ++i)
+        if (std::strcmp(name, extensionNames[i]) == 0)
+            return static_cast<Enum::Extension>(i);
+    return Enum::EXTENSION_UNKNOWN;
+}
+
+Enum::Extension ExtensionManager::nameToExtensionEnum(std::string const &name) {
+    return nameToExtensionEnum(name.c_str());
+}
+
+std::string ExtensionManager::ExtensionEnumToString(Enum::Extension extension) {
+    return IsExtension(extension) ? extensionNames[extension] : std::string();
+}
+
+void TokenizeExtensionString(std::string const &text, std::vector<std::string> &tokens) {
+    char const separators[] = " \t";
+    std::size_t begin = text.find_first_not_of(separators);
+    while (begin != std::string::npos) {
+        std::size_t const end = text.find_first_of(separators, begin);
+        tokens.push_back(text.substr(begin, end - begin));
+        begin = text.find_first_not_of(separators, end);
+    }
+}
+
+} // namespace ORU::OCL

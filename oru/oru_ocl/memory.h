@@ -1,0 +1,64 @@
+// The base of OpenCL buffers and images.
+#pragma once
+
+#include "oru/oru_ocl/contextocl.h"
+
+#include <cstddef>
+
+namespace ORU::OCL {
+
+/// A piece of device memory, or none.
+class ORU_API Memory : public OpenCLObjectWrapper<cl_mem> {
+public:
+    /// What kernels may do with it. Any other value leaves it to the runtime (read and write).
+    enum MemoryAccessFlags : int {
+        MEMORY_READ_ONLY = 0,
+        MEMORY_WRITE_ONLY = 1,
+        MEMORY_READ_WRITE = 2
+    };
+
+    /// What `getInfo` can ask, with the type of its answer.
+    enum MemoryInfo : int {
+        MEMORYINFO_TYPE = 0,            ///< cl_mem_object_type
+        MEMORYINFO_FLAGS = 1,           ///< cl_mem_flags
+        MEMORYINFO_SIZE = 2,            ///< std::size_t, in bytes
+        MEMORYINFO_HOST_PTR = 3,        ///< void *
+        MEMORYINFO_MAP_COUNT = 4,       ///< cl_uint
+        MEMORYINFO_REFERENCE_COUNT = 5, ///< cl_uint
+        MEMORYINFO_CONTEXT = 6          ///< cl_context, not retained
+    };
+
+    enum MemoryObjectType : int {
+        MEMORYOBJECTTYPE_BUFFER = 0,
+        MEMORYOBJECTTYPE_IMAGE2D = 1,
+        MEMORYOBJECTTYPE_IMAGE3D = 2,
+        MEMORYOBJECTTYPE_OTHER = 3 ///< a type that OpenCL 1.1 does not have
+    };
+
+    /// No memory.
+    Memory() = default;
+
+    /// Reads one property (clGetMemObjectInfo).
+    /// @param size bytes at `value`, which may be null to ask for the size only
+    /// @param sizeReturned receives the size of the answer in bytes; may be null
+    /// @throws ExceptionOCL when the runtime refuses
+    void getInfo(MemoryInfo info, std::size_t size, void *value, std::size_t *sizeReturned) const;
+
+    /// What kind of memory this is.
+    /// @throws ExceptionOCL when the runtime refuses
+    MemoryObjectType memType() const;
+
+protected:
+    /// Takes over the caller's reference.
+    explicit Memory(cl_mem handle) : OpenCLObjectWrapper(handle) {}
+
+    // Translations into OpenCL's constants; 0 for a value outside the enumeration.
+    static cl_mem_flags AccessFlags(MemoryAccessFlags access);
+    static unsigned int ConvertMemoryInfo(MemoryInfo info);
+    static unsigned int ConvertMemoryObjectType(MemoryObjectType type);
+
+    /// The flags of memory that the runtime allocates, in host memory when `allocHost` is set.
+    static cl_mem_flags AllocationFlags(MemoryAccessFlags access, bool allocHost);
+};
+
+} // namespace ORU::OCL

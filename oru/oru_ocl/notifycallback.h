@@ -1,0 +1,22 @@
+// A callback and what it is called with.
+#pragma once
+
+namespace ORU::OCL {
+
+/// A function that the runtime calls back, and the user data that it hands over.
+/// @tparam Function the runtime's type of the callback
+template<class Function>
+class NotifyCallback {
+public:
+    NotifyCallback(Function pf_notify = nullptr, void *user_data = nullptr)
+        : pf_notify_(pf_notify), user_data_(user_data) {}
+
+    Function pf_notify() const { return pf_notify_; }
+    void *user_data() const { return user_data_; }
+
+private:
+    Function pf_notify_;
+    void *user_data_;
+};
+
+} // namespace ORU::OCL

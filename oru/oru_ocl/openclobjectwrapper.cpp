@@ -1,0 +1,66 @@
+// What retains and releases each kind of OpenCL handle.
+#include "oru/oru_ocl/openclobjectwrapper.h"
+
+#include "oru/oru_ocl/internal/clcall.h"
+
+namespace ORU::OCL {
+
+namespace {
+
+template<class T>
+using CountSlot = cl_int (CL_API_CALL *FunctionTable::*)(T);
+
+template<class T>
+constexpr CountSlot<T> retainSlot = nullptr;
+template<class T>
+constexpr CountSlot<T> releaseSlot = nullptr;
+
+#define ORU_CL_COUNTED(Handle, Kind)                                                               \
+    template<>                                                                                     \
+    constexpr CountSlot<Handle> retainSlot<Handle> = &FunctionTable::clRetain##Kind;               \
+    template<>                                                                                     \
+    constexpr CountSlot<Handle> releaseSlot<Handle> = &FunctionTable::clRelease##Kind;
+
+ORU_CL_COUNTED(cl_context, Context)
+ORU_CL_COUNTED(cl_command_queue, CommandQueue)
+ORU_CL_COUNTED(cl_mem, MemObject)
+ORU_CL_COUNTED(cl_sampler, Sampler)
+ORU_CL_COUNTED(cl_program, Program)
+ORU_CL_COUNTED(cl_kernel, Kernel)
+ORU_CL_COUNTED(cl_event, Event)
+
+template<class T>
+int Count([[maybe_unused]] CountSlot<T> slot, [[maybe_unused]] T handle) {
+    if constexpr (retainSlot<T> != nullptr)
+        if (handle)
+            return (Table().*slot)(handle);
+    return 0;
+}
+
+} // namespace
+
+template<class T>
+int RetainHandle(T handle) {
+    return Count<T>(retainSlot<T>, handle);
+}
+
+template<class T>
+int ReleaseHandle(T handle) {
+    return Count<T>(releaseSlot<T>, handle);
+}
+
+#define ORU_CL_HANDLE(Handle)                                                                      \
+    template ORU_API int RetainHandle(Handle);                                                     \
+    template ORU_API int ReleaseHandle(Handle);
+
+ORU_CL_HANDLE(cl_platform_id)
+ORU_CL_HANDLE(cl_device_id)
+ORU_CL_HANDLE(cl_context)
+ORU_CL_HANDLE(cl_command_queue)
+ORU_CL_HANDLE(cl_mem)
+ORU_CL_HANDLE(cl_sampler)
+ORU_CL_HANDLE(cl_program)
+ORU_CL_HANDLE(cl_kernel)
+ORU_CL_HANDLE(cl_event)
+
+} // namespace ORU::OCL

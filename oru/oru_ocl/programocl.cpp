@@ -1,0 +1,133 @@
+// OpenCL programs: what is built for a device from source or binaries.
+#include "oru/oru_ocl/programocl.h"
+
+#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/internal/enumtable.h"
+#include "oru/oru_ocl/internal/handlearray.h"
+#include "oru/oru_ocl/internal/infoquery.h"
+
+#include <cstring>
+
+namespace ORU::OCL {
+
+namespace {
+
+constexpr int buildStatuses[] = {
+    CL_BUILD_NONE,
+    CL_BUILD_ERROR,
+    CL_BUILD_SUCCESS,
+    CL_BUILD_IN_PROGRESS,
+};
+
+cl_program CreateWithSource(Context const &context, char const *source) {
+    std::size_t const length = std::strlen(source);
+    return ORU_CL(CreateProgramWithSource)(context.id(), cl_uint(1), &source, &length);
+}
+
+cl_program CreateWithBinaries(Context const &context, Program::BinaryArray const &array) {
+    std::vector<unsigned char const *> binaries = array.binaries();
+    return ORU_CL(CreateProgramWithBinary)(context.id(), static_cast<cl_uint>(array.nBinary()),
+                                           array.devices().data(), array.sizes(), binaries.data(),
+                                           nullptr);
+}
+
+} // namespace
+
+Program::Program(Context const &context, std::string const &source)
+    : OpenCLObjectWrapper(CreateWithSource(context, source.c_str())), context_(context),
+      source_(source) {}
+
+Program::Program(Context const &context, BinaryArray const &binaries)
+    : OpenCLObjectWrapper(CreateWithBinaries(context, binaries)), context_(context) {}
+
+void Program::build(std::string const &options) {
+    build(context_.devices(), options);
+}
+
+void Program::build(std::vector<Device> const &devices, std::string const &options) {
+    build(devices, options, {});
+}
+
+void Program::buildAsync(std::vector<Device> const &devices, std::string const &options,
+                         NotifyCallback const &callback) {
+    build(devices, options, callback);
+}
+
+void Program::build(std::vector<Device> const &devices, std::string const &options,
+                    NotifyCallback const &callback) {
+    HandleArray<cl_device_id> const ids(devices);
+    ORU_CL(BuildProgram)(id(), ids.count(), ids.data(), options.empty() ? nullptr : options.c_str(),
+                         callback.pf_notify(), callback.user_data());
+}
+
+std::string Program::buildLog(Device const &device) {
+    std::string const log =
+        QueryText([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
+            ORU_CL(GetProgramBuildInfo)(id(), device.id(), cl_program_build_info(CL_PROGRAM_BUILD_LOG),
+                                        bytes, value, bytesReturned);
+        });
+    return log.c_str();
+}
+
+Program::BuildStatus Program::buildStatus(Device const &device) {
+    std::vector<cl_build_status> const status = QueryList<cl_build_status>(
+        [&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
+            ORU_CL(GetProgramBuildInfo)(id(), device.id(),
+                                        cl_program_build_info(CL_PROGRAM_BUILD_STATUS), bytes, value,
+                                        bytesReturned);
+        });
+    return status.empty() ? BUILD_STATUS_NONE : OCLBuildStatus(status.front());
+}
+
+Kernel Program::kernel(std::string const &name) const {
+    return Kernel(ORU_CL(CreateKernel)(id(), name.c_str()));
+}
+
+std::vector<Kernel> Program::kernels() const {
+    std::vector<Kernel> kernels;
+    auto const handles =
+        QueryHandles<cl_kernel>([&](cl_uint count, cl_kernel *created, cl_uint *found) {
+            // Room before the references exist: nothing may fail once there is something to leak.
+            kernels.reserve(count);
+            ORU_CL(CreateKernelsInProgram)(id(), count, created, found);
+        });
+    for (cl_kernel const handle : handles)
+        kernels.push_back(Kernel(handle));
+    return kernels;
+}
+
+Program::BuildStatus Program::OCLBuildStatus(int status) {
+    int const index = IndexOf(buildStatuses, status);
+    return index < static_cast<int>(std::size(buildStatuses)) ? static_cast<BuildStatus>(index)
+                                                              : BUILD_STATUS_NONE;
+}
+
+int Program::OpenCLBuildStatus(BuildStatus status) {
+    return ConstantOr(buildStatuses, status, int(CL_BUILD_NONE));
+}
+
+Program::BinaryArray::BinaryArray(std::vector<Device> const &devs,
+                                  std::vector<std::size_t> const &sizes,
+                                  std::vector<std::vector<unsigned char>> const &binaries)
+    : sizes_(sizes), binaries_(binaries) {
+    for (Device const &device : devs)
+        devices_.push_back(device.id());
+    ORU_ASSERT(devs.size() == sizes.size());
+    ORU_ASSERT(sizes.size() == binaries.size());
+}
+
+Program::BinaryArray::BinaryArray(std::vector<cl_device_id> const &devs, std::size_t const *sizes,
+                                  unsigned char const **binaries)
+    : devices_(devs), sizes_(sizes, sizes + devs.size()) {
+    for (std::size_t i = 0; i < devs.size(); ++i)
+        binaries_.emplace_back(binaries[i], binaries[i] + sizes[i]);
+}
+
+std::vector<unsigned char const *> Program::BinaryArray::binaries() const {
+    std::vector<unsigned char const *> pointers;
+    for (std::vector<unsigned char> const &binary : binaries_)
+        pointers.push_back(binary.data());
+    return pointers;
+}
+
+} // namespace ORU::OCL
