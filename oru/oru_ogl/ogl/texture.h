@@ -1,0 +1,300 @@
+// What all textures have in common.
+#pragma once
+
+#include "oru/oru_ogl/ogl/object.h"
+#include "oru/oru_ogl/ogl/pixelunpackparameters.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <iosfwd>
+
+namespace ORU {
+namespace OGL {
+
+/// A texture object with its storage; made as one of the kinds in texture1.h, texture2.h and
+/// texture3.h.
+///
+/// A constructor allocates the storage (sampled with FILTER_NEAREST, clamped to its edges) and
+/// leaves what was bound to the target bound. Let no pixel unpack buffer be bound meanwhile:
+/// OpenGL would fill the texture from it. Setters, uploads and downloads act on the texture that is
+/// bound to the target; bind first, with TextureUnit::bind.
+class ORU_API Texture : public Object {
+public:
+    /// What a texture is bound to.
+    enum Target : unsigned int {
+        TARGET_TEXTURE_1D = 0,
+        TARGET_TEXTURE_2D,
+        TARGET_TEXTURE_3D,
+        TARGET_TEXTURE_1D_ARRAY,
+        TARGET_TEXTURE_2D_ARRAY,
+        TARGET_TEXTURE_RECTANGLE
+    };
+
+    /// The query for what is bound to the target of the same value.
+    enum TargetBinding : unsigned int {
+        TARGETBINDING_TEXTURE_BINDING_1D = 0,
+        TARGETBINDING_TEXTURE_BINDING_2D,
+        TARGETBINDING_TEXTURE_BINDING_3D,
+        TARGETBINDING_TEXTURE_BINDING_1D_ARRAY,
+        TARGETBINDING_TEXTURE_BINDING_2D_ARRAY,
+        TARGETBINDING_TEXTURE_BINDING_RECTANGLE
+    };
+
+    /// How the implementation keeps the texels.
+    enum InternalFormat : unsigned int {
+        INTERNALFORMAT_ALPHA = 0,
+        INTERNALFORMAT_ALPHA4,
+        INTERNALFORMAT_ALPHA8,
+        INTERNALFORMAT_ALPHA12,
+        INTERNALFORMAT_ALPHA16,
+        INTERNALFORMAT_LUMINANCE,
+        INTERNALFORMAT_LUMINANCE4,
+        INTERNALFORMAT_LUMINANCE8,
+        INTERNALFORMAT_LUMINANCE12,
+        INTERNALFORMAT_LUMINANCE16,
+        INTERNALFORMAT_LUMINANCE_ALPHA,
+        INTERNALFORMAT_LUMINANCE4_ALPHA4,
+        INTERNALFORMAT_LUMINANCE6_ALPHA2,
+        INTERNALFORMAT_LUMINANCE8_ALPHA8,
+        INTERNALFORMAT_LUMINANCE12_ALPHA4,
+        INTERNALFORMAT_LUMINANCE12_ALPHA12,
+        INTERNALFORMAT_LUMINANCE16_ALPHA16,
+        INTERNALFORMAT_INTENSITY,
+        INTERNALFORMAT_INTENSITY4,
+        INTERNALFORMAT_INTENSITY8,
+        INTERNALFORMAT_INTENSITY12,
+        INTERNALFORMAT_INTENSITY16,
+        INTERNALFORMAT_R3_G3_B2,
+        INTERNALFORMAT_RED,
+        INTERNALFORMAT_R16,
+        INTERNALFORMAT_R16F,
+        INTERNALFORMAT_R32F,
+        INTERNALFORMAT_RG,
+        INTERNALFORMAT_RG16,
+        INTERNALFORMAT_RG16F,
+        INTERNALFORMAT_RG32F,
+        INTERNALFORMAT_RGB,
+        INTERNALFORMAT_RGB4,
+        INTERNALFORMAT_RGB5,
+        INTERNALFORMAT_RGB8,
+        INTERNALFORMAT_RGB10,
+        INTERNALFORMAT_RGB12,
+        INTERNALFORMAT_RGB16,
+        INTERNALFORMAT_RGBA,
+        INTERNALFORMAT_RGBA2,
+        INTERNALFORMAT_RGBA4,
+        INTERNALFORMAT_RGB5_A1,
+        INTERNALFORMAT_RGBA8,
+        INTERNALFORMAT_RGB10_A2,
+        INTERNALFORMAT_RGBA12,
+        INTERNALFORMAT_RGBA16,
+        INTERNALFORMAT_RGBA32F_ARB,
+        INTERNALFORMAT_RGB32F_ARB,
+        INTERNALFORMAT_ALPHA32F_ARB,
+        INTERNALFORMAT_INTENSITY32F_ARB,
+        INTERNALFORMAT_LUMINANCE32F_ARB,
+        INTERNALFORMAT_LUMINANCE_ALPHA32F_ARB,
+        INTERNALFORMAT_RGBA16F_ARB,
+        INTERNALFORMAT_RGB16F_ARB,
+        INTERNALFORMAT_ALPHA16F_ARB,
+        INTERNALFORMAT_INTENSITY16F_ARB,
+        INTERNALFORMAT_LUMINANCE16F_ARB,
+        INTERNALFORMAT_LUMINANCE_ALPHA16F_ARB
+    };
+
+    /// The components of a pixel in the caller's memory.
+    enum Format : unsigned int {
+        FORMAT_COLOR_INDEX = 0,
+        FORMAT_RED,
+        FORMAT_GREEN,
+        FORMAT_BLUE,
+        FORMAT_ALPHA,
+        FORMAT_RG,
+        FORMAT_RGB,
+        FORMAT_BGR,
+        FORMAT_RGBA,
+        FORMAT_BGRA,
+        FORMAT_LUMINANCE,
+        FORMAT_LUMINANCE_ALPHA
+    };
+
+    /// The component type of a pixel in the caller's memory.
+    enum Type : unsigned int {
+        TYPE_UNSIGNED_BYTE = 0,
+        TYPE_BYTE,
+        TYPE_BITMAP,
+        TYPE_UNSIGNED_SHORT,
+        TYPE_SHORT,
+        TYPE_UNSIGNED_INT,
+        TYPE_INT,
+        TYPE_FLOAT,
+        TYPE_UNSIGNED_BYTE_3_3_2,
+        TYPE_UNSIGNED_BYTE_2_3_3_REV,
+        TYPE_UNSIGNED_SHORT_5_6_5,
+        TYPE_UNSIGNED_SHORT_5_6_5_REV,
+        TYPE_UNSIGNED_SHORT_4_4_4_4,
+        TYPE_UNSIGNED_SHORT_4_4_4_4_REV,
+        TYPE_UNSIGNED_SHORT_5_5_5_1,
+        TYPE_UNSIGNED_SHORT_1_5_5_5_REV,
+        TYPE_UNSIGNED_INT_8_8_8_8,
+        TYPE_UNSIGNED_INT_8_8_8_8_REV,
+        TYPE_UNSIGNED_INT_10_10_10_2,
+        TYPE_UNSIGNED_INT_2_10_10_10_REV,
+        TYPE_HALF_FLOAT,
+        TYPE_NONE = 0xFFFFFFFFu ///< where a constructor accepts it: no type is given
+    };
+
+    /// How texels are combined for a fragment.
+    enum Filter : unsigned int {
+        FILTER_NEAREST = 0,
+        FILTER_LINEAR,
+        FILTER_NEAREST_MIPMAP_NEAREST,
+        FILTER_LINEAR_MIPMAP_NEAREST,
+        FILTER_NEAREST_MIPMAP_LINEAR,
+        FILTER_LINEAR_MIPMAP_LINEAR
+    };
+
+    /// What lies outside the texture.
+    enum WrapMode : unsigned int {
+        WRAPMODE_CLAMP = 0,
+        WRAPMODE_CLAMP_TO_BORDER,
+        WRAPMODE_CLAMP_TO_EDGE,
+        WRAPMODE_MIRRORED_REPEAT,
+        WRAPMODE_REPEAT
+    };
+
+    /// The parameters of glPixelStore.
+    enum PixelStoreMode : unsigned int {
+        PIXELSTOREMODE_PACK_SWAP_BYTES = 0,
+        PIXELSTOREMODE_PACK_LSB_FIRST,
+        PIXELSTOREMODE_PACK_ROW_LENGTH,
+        PIXELSTOREMODE_PACK_IMAGE_HEIGHT,
+        PIXELSTOREMODE_PACK_SKIP_PIXELS,
+        PIXELSTOREMODE_PACK_SKIP_ROWS,
+        PIXELSTOREMODE_PACK_SKIP_IMAGES,
+        PIXELSTOREMODE_PACK_ALIGNMENT,
+        PIXELSTOREMODE_UNPACK_SWAP_BYTES,
+        PIXELSTOREMODE_UNPACK_LSB_FIRST,
+        PIXELSTOREMODE_UNPACK_ROW_LENGTH,
+        PIXELSTOREMODE_UNPACK_IMAGE_HEIGHT,
+        PIXELSTOREMODE_UNPACK_SKIP_PIXELS,
+        PIXELSTOREMODE_UNPACK_SKIP_ROWS,
+        PIXELSTOREMODE_UNPACK_SKIP_IMAGES,
+        PIXELSTOREMODE_UNPACK_ALIGNMENT
+    };
+
+    /// Deletes the texture. @note glDeleteTextures
+    ~Texture() override;
+
+    InternalFormat format() const { return format_; }
+
+    /// Channels of the format. @throws InternalException for INTERNALFORMAT_RGB4
+    std::size_t channels() const { return Channels(format_); }
+
+    /// @name Size of a mip level in texels
+    /// The size of level 0 halved `level` times and rounded down, so it can be 0.
+    /// @{
+    std::uint64_t width(unsigned int level) const;
+    std::uint64_t height(unsigned int level) const;
+    /// In the array textures the number of layers, or 1, on every level.
+    virtual std::uint64_t depth(unsigned int level) const;
+    /// @}
+
+    /// Bytes of level 0, found out once. Failures as `SizeInBytes`.
+    int sizeInBytes() const;
+
+    /// The GL client format that fits a format best: GL_RED, GL_RG or GL_BGRA.
+    unsigned int getGLFormat(InternalFormat format) const;
+
+    /// @name Parameters of the texture bound to the target
+    /// @{
+
+    /// @note glTexParameteri
+    void setFilter(Filter minification, Filter magnification);
+
+    /// @param rgba four components
+    /// @note glTexParameterfv
+    void setBorderColor(float const *rgba);
+
+    /// Whether a change of level 0 makes the other levels anew.
+    /// @note glTexParameteri; needs `SupportsAutoMIPGeneration()`
+    void enableAutoMIPGeneration(bool on);
+    /// @}
+
+    /// Channels of a format. @throws InternalException for INTERNALFORMAT_RGB4, and for a number
+    /// that is no format
+    static std::size_t Channels(InternalFormat format);
+    static std::size_t Channels(Format format);
+
+    /// Bytes of an image without gaps: channels x bytes of a channel x width x height x depth.
+    /// @throws InternalException for formats whose channels are not all of 1, 2 or 4 bytes
+    static std::size_t SizeInBytes(InternalFormat format, std::uint64_t width, std::uint64_t height,
+                                   std::uint64_t depth);
+
+    /// Whether the current context has textures of a GL target: 1-D, 2-D and 3-D always, rectangles
+    /// with GL_ARB_texture_rectangle, arrays with GL_EXT_texture_array, others never.
+    static bool IsTargetSupported(unsigned int target);
+
+    /// Whether the current context is of OpenGL 1.4 or later.
+    static bool SupportsAutoMIPGeneration();
+
+    /// @name Translations to and from GL values
+    /// @throws InternalException for a value outside the enumeration
+    /// @{
+    static unsigned int Target2GL(Target target);
+    static Target GL2Target(unsigned int target);
+    static unsigned int TargetBinding2GL(TargetBinding binding);
+    static TargetBinding GL2TargetBinding(unsigned int binding);
+    static unsigned int InternalFormat2GL(InternalFormat format);
+    static InternalFormat GL2InternalFormat(unsigned int format);
+    static unsigned int Format2GL(Format format);
+    static Format GL2Format(unsigned int format);
+    static unsigned int Type2GL(Type type);
+    static Type GL2Type(unsigned int type);
+    static unsigned int Filter2GL(Filter filter);
+    static Filter GL2Filter(unsigned int filter);
+    static unsigned int WrapMode2GL(WrapMode mode);
+    static WrapMode GL2WrapMode(unsigned int mode);
+    static unsigned int PixelStoreMode2GL(PixelStoreMode mode);
+    static PixelStoreMode GL2PixelStoreMode(unsigned int mode);
+    /// @}
+
+protected:
+    /// Makes the texture's name; the storage is the derived classes' part.
+    /// @param width, height, depth texels of level 0, 1 for what the target has not
+    /// @throws InternalException when there is no name to be had
+    /// @note glGenTextures
+    Texture(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
+            std::uint64_t height, std::uint64_t depth);
+
+    /// Kept for hosts that call it; there is nothing to verify.
+    void verifyCurrentTextureObject() const {}
+
+    /// Bytes of a pixel in the caller's memory.
+    /// @throws InternalException for types other than bytes, shorts, half floats and floats
+    static std::size_t BytesPerPixel(Format format, Type type);
+
+    /// @name Client pixel-store state around a transfer
+    /// Saves the state and sets the alignment of rows; the last one puts the saved state back.
+    /// @param bytes 1, 2, 4 or 8
+    /// @throws InternalException for any other number
+    /// @note glPushClientAttrib, glPixelStorei, glPopClientAttrib
+    /// @{
+    static void PushAndSetReadbackByteAlignment(unsigned int bytes);
+    static void PushAndSetTransferByteAlignment(unsigned int bytes);
+    static void PopPixelTransferModes();
+    /// @}
+
+private:
+    InternalFormat format_;
+    std::uint64_t width_;
+    std::uint64_t height_;
+    std::uint64_t depth_;
+    mutable std::uint64_t sizeInBytes_ = ~std::uint64_t(0); ///< all ones: not computed yet
+};
+
+/// Writes the enumerator's name ("INTERNALFORMAT_RGBA8"), or "UNKNOWN FORMAT".
+ORU_API std::ostream &operator<<(std::ostream &os, Texture::InternalFormat format);
+
+} // namespace OGL
+} // namespace ORU

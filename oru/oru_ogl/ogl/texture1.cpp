@@ -1,0 +1,99 @@
+// Textures with one side.
+#include "oru/oru_ogl/ogl/texture1.h"
+
+#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/imagetransfer.h"
+#include "oru/oru_ogl/ogl/internal/supported.h"
+#include "oru/oru_ogl/ogl/internal/texturestorage.h"
+#include "oru/oru_ogl/platformgl.h"
+
+#include <optional>
+
+namespace ORU {
+namespace OGL {
+
+Texture1::Texture1(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
+                   bool mipmapped)
+    : Texture(target, binding, format, width, 1, 1) {
+    if (!internal::CurrentRecord(&ExtensionManager::supportsNonPowerOfTwoTextures) &&
+        !internal::IsPowerOfTwoSize(width))
+        ORU_THROW_INTERNAL("Texture2::ctor hardware only supports power of two textures");
+
+    unsigned int const previous = getBoundID();
+    ORU_GL(BindTexture, this->target(), objectID());
+    internal::Ending restore([&] { ORU_GL(BindTexture, this->target(), previous); });
+    auto const allocate = [&](GLint level, std::array<GLsizei, 1> const &sides) {
+        ORU_GL(TexImage1D, this->target(), level, static_cast<GLint>(InternalFormat2GL(format)),
+               sides[0], 0, getGLFormat(format), GL_UNSIGNED_BYTE, nullptr);
+    };
+    internal::ForEachLevel(std::array{internal::ToGLsizei(width)}, 1, mipmapped, allocate);
+    setFilter(FILTER_NEAREST, FILTER_NEAREST);
+    setWrap(internal::CurrentRecord(&ExtensionManager::supportsClampToEdge) ? WRAPMODE_CLAMP_TO_EDGE
+                                                                            : WRAPMODE_CLAMP);
+    restore.now();
+}
+
+Texture1::~Texture1() = default;
+
+void Texture1::setWrap(WrapMode s) {
+    ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_S, static_cast<GLint>(WrapMode2GL(s)));
+}
+
+void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Type type,
+                        void const *data, PixelUnpackParameters const &params) {
+    internal::CheckPart("subimage", level, {{"width", "width", width, this->width(0)}});
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    internal::WithUnpackState(params, [&] {
+        ORU_GL(TexSubImage1D, target(), level, x, static_cast<GLsizei>(width), glFormat, glType,
+               data);
+    });
+}
+
+void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Type type,
+                        Buffer *buffer, std::size_t offset, PixelUnpackParameters const &params) {
+    internal::CheckPart("subimage", level, {{"width", "width", width, this->width(0)}});
+    internal::CheckUnpackBuffer(buffer, offset);
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    if (!buffer->isUnpackBuffer())
+        buffer->convertToUnpackBuffer();
+    std::optional<internal::BoundBuffer> bound;
+    internal::WithUnpackState(params, [&] {
+        bound.emplace(*buffer);
+        ORU_GL(TexSubImage1D, target(), level, x, static_cast<GLsizei>(width), glFormat, glType,
+               internal::BufferOffset(offset));
+    });
+    bound->restore();
+}
+
+void Texture1::copyTexSubImage(int level, int xOffset, int x, int y, std::uint64_t width) {
+    internal::CheckPart("copySubimage", level, {{"width", "width", width, this->width(0)}});
+    ORU_GL(CopyTexSubImage1D, target(), level, xOffset, x, y, static_cast<GLsizei>(width));
+}
+
+void Texture1::getPixelData(void *dst, int level, unsigned int format, unsigned int type) const {
+    ORU_GL(GetTexImage, target(), level, format, type, dst);
+}
+
+void Texture1::getPixelData(Buffer *buffer, int offset, int level, unsigned int format,
+                            unsigned int type) const {
+    ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, 1);
+    internal::CheckBuffer(buffer);
+    if (!buffer->isPackBuffer())
+        buffer->convertToPackBuffer();
+    internal::BoundBuffer bound(*buffer);
+    ORU_GL(GetTexImage, target(), level, format, type,
+           internal::BufferOffset(static_cast<std::uint64_t>(offset)));
+    bound.restore();
+}
+
+std::size_t Texture1::pixelDataSize(int /*level*/, Format format, Type type) const {
+    return BytesPerPixel(format, type) * width(0);
+}
+
+Texture1D::Texture1D(InternalFormat format, std::uint64_t width, bool mipmapped)
+    : Texture1(TARGET_TEXTURE_1D, TARGETBINDING_TEXTURE_BINDING_1D, format, width, mipmapped) {}
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,77 @@
+// Textures with one side.
+#pragma once
+
+#include "oru/oru_ogl/ogl/texture.h"
+
+namespace ORU {
+namespace OGL {
+
+class Buffer;
+
+/// A texture of one row of texels. The transfers act on the texture bound to the target.
+class ORU_API Texture1 : public Texture {
+public:
+    ~Texture1() override;
+
+    /// @note glTexParameteri
+    void setWrap(WrapMode s);
+
+    /// Uploads texels from memory.
+    /// @param level mip level, at least 0; the size is compared with level 0 whatever it is
+    /// @param x first texel to write
+    /// @param width texels, at least 1
+    /// @param format, type of the pixels at `data`, which lie there as `params` tell
+    /// @throws InternalException for a size or level out of range. Whether the range lies within
+    ///         the texture OpenGL says, by ExceptionOGL, which leaves the upload's unpack state on
+    ///         the client attribute stack
+    /// @note glPushClientAttrib, glPixelStorei, glTexSubImage1D, glPopClientAttrib
+    void subImage(int level, int x, std::uint64_t width, Format format, Type type, void const *data,
+                  PixelUnpackParameters const &params);
+
+    /// Uploads texels from a buffer, which becomes a pixel unpack buffer. What was bound as such
+    /// is bound again at the end.
+    /// @param offset bytes from the buffer's beginning to the pixel data
+    /// @throws InternalException also for an offset behind the buffer, and for a mapped buffer
+    void subImage(int level, int x, std::uint64_t width, Format format, Type type, Buffer *buffer,
+                  std::size_t offset, PixelUnpackParameters const &params);
+
+    /// Copies pixels of the current read framebuffer, beginning at (x, y).
+    /// @throws InternalException for a size or level out of range, as `subImage`
+    /// @note glCopyTexSubImage1D
+    void copyTexSubImage(int level, int xOffset, int x, int y, std::uint64_t width);
+
+    /// Reads a level, with the pixel-store state as it is.
+    /// @param format, type GL enumeration values of the pixels at `dst`
+    /// @note glGetTexImage
+    void getPixelData(void *dst, int level, unsigned int format, unsigned int type) const;
+
+    /// Reads a level into a buffer, which becomes a pixel pack buffer. The pack alignment is 1
+    /// afterwards; the buffer binding is as it was.
+    /// @param offset bytes from the buffer's beginning
+    /// @throws InternalException for a mapped buffer
+    /// @note glPixelStorei, glBindBuffer, glGetTexImage
+    void getPixelData(Buffer *buffer, int offset, int level, unsigned int format,
+                      unsigned int type) const;
+
+    /// Bytes that level 0 takes in memory when its rows have no gaps, whatever the level.
+    /// @throws InternalException for types other than bytes, shorts, half floats and floats
+    std::size_t pixelDataSize(int level, Format format, Type type) const;
+
+protected:
+    /// @throws InternalException for a size that is no power of two where that is needed,
+    ///         ExceptionOGL when OpenGL refuses size or format
+    /// @note glTexImage1D
+    Texture1(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
+             bool mipmapped);
+};
+
+/// GL_TEXTURE_1D.
+class ORU_API Texture1D : public Texture1 {
+public:
+    /// @param width texels of level 0
+    /// @param mipmapped whether the levels down to one texel are allocated too
+    Texture1D(InternalFormat format, std::uint64_t width, bool mipmapped);
+};
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,178 @@
+// Textures with two sides.
+#include "oru/oru_ogl/ogl/texture2.h"
+
+#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/imagetransfer.h"
+#include "oru/oru_ogl/ogl/internal/supported.h"
+#include "oru/oru_ogl/ogl/internal/texturestorage.h"
+#include "oru/oru_ogl/platformgl.h"
+
+namespace ORU {
+namespace OGL {
+
+namespace {
+
+/// Whether an upload takes the caller's memory for the texture's own storage. Where the storage is
+/// kept is a parameter of the rectangle target, whichever target the upload is for.
+void UseClientStorage(bool use) {
+    ORU_GL(TexParameteri, GL_TEXTURE_RECTANGLE, GL_TEXTURE_STORAGE_HINT_APPLE,
+           use ? GL_STORAGE_CACHED_APPLE : GL_STORAGE_PRIVATE_APPLE);
+    ORU_GL(PixelStorei, GL_UNPACK_CLIENT_STORAGE_APPLE, use ? 1 : 0);
+}
+
+} // namespace
+
+Texture2::Texture2(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
+                   std::uint64_t height, bool mipmapped, void *clientStorage, Type type)
+    : Texture(target, binding, format, width, height, 1), clientStorage_(clientStorage) {
+    if (!internal::CurrentRecord(&ExtensionManager::supportsNonPowerOfTwoTextures) &&
+        !internal::Supports(GL_ARB_TEXTURE_RECTANGLE) &&
+        !(internal::IsPowerOfTwoSize(width) && internal::IsPowerOfTwoSize(height)))
+        ORU_THROW_INTERNAL("Texture2::ctor hardware only supports power of two textures");
+
+    unsigned int const previous = getBoundID();
+    ORU_GL(BindTexture, this->target(), objectID());
+    internal::Ending restore([&] { ORU_GL(BindTexture, this->target(), previous); });
+    if (clientStorage_)
+        ORU_ASSERT_SUPPORTED(GL_APPLE_CLIENT_STORAGE);
+    internal::Ending endClientStorage([this] {
+        if (clientStorage_)
+            UseClientStorage(false);
+    });
+    if (clientStorage_)
+        UseClientStorage(true);
+    allocate(mipmapped, type);
+    setFilter(FILTER_NEAREST, FILTER_NEAREST);
+    WrapMode const wrap = internal::CurrentRecord(&ExtensionManager::supportsClampToEdge)
+                              ? WRAPMODE_CLAMP_TO_EDGE
+                              : WRAPMODE_CLAMP;
+    setWrap(wrap, wrap);
+    endClientStorage.now();
+    restore.now();
+}
+
+Texture2::~Texture2() = default;
+
+void Texture2::allocate(bool mipmapped, Type type) {
+    auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format()));
+    unsigned int const glFormat = getGLFormat(format());
+    unsigned int const glType = type == TYPE_NONE ? GL_UNSIGNED_BYTE : Type2GL(type);
+    bool const layered = target() == GL_TEXTURE_1D_ARRAY;
+    internal::ForEachLevel(
+        std::array{internal::ToGLsizei(width(0)), internal::ToGLsizei(height(0))}, layered ? 1 : 2,
+        mipmapped, [&](GLint level, std::array<GLsizei, 2> const &sides) {
+            ORU_GL(TexImage2D, target(), level, glInternalFormat, sides[0], sides[1], 0, glFormat,
+                   glType, clientStorage_);
+        });
+}
+
+void Texture2::setWrap(WrapMode s, WrapMode t) {
+    if (!isBound())
+        ORU_THROW_INTERNAL("Texture must be enabled (bound & active)");
+    ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_S, static_cast<GLint>(WrapMode2GL(s)));
+    ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_T, static_cast<GLint>(WrapMode2GL(t)));
+}
+
+void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint64_t height,
+                        Format format, Type type, void const *data,
+                        PixelUnpackParameters const &params) {
+    internal::CheckPart(
+        "subimage", level,
+        {{"width", "width", width, this->width(0)}, {"height", "height", height, this->height(0)}});
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    internal::WithUnpackState(params, [&] {
+        ORU_GL(TexSubImage2D, target(), level, x, y, static_cast<GLsizei>(width),
+               static_cast<GLsizei>(height), glFormat, glType, data);
+    });
+}
+
+void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint64_t height,
+                        Format format, Type type, Buffer *buffer, std::size_t offset,
+                        PixelUnpackParameters const &params) {
+    internal::CheckPart(
+        "subimage", level,
+        {{"width", "width", width, this->width(0)}, {"height", "height", height, this->height(0)}});
+    internal::CheckUnpackBuffer(buffer, offset);
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    if (!buffer->isUnpackBuffer())
+        buffer->convertToUnpackBuffer();
+    internal::WithUnpackState(params, [&] {
+        internal::BoundBuffer bound(*buffer);
+        ORU_GL(TexSubImage2D, target(), level, x, y, static_cast<GLsizei>(width),
+               static_cast<GLsizei>(height), glFormat, glType, internal::BufferOffset(offset));
+        bound.restore();
+    });
+}
+
+void Texture2::copyTexSubImage(int level, int xOffset, int yOffset, int x, int y,
+                               std::uint64_t width, std::uint64_t height) {
+    internal::CheckPart(
+        "copySubimage", level,
+        {{"width", "width", width, this->width(0)}, {"height", "height", height, this->height(0)}});
+    ORU_GL(CopyTexSubImage2D, target(), level, xOffset, yOffset, x, y, static_cast<GLsizei>(width),
+           static_cast<GLsizei>(height));
+}
+
+void Texture2::getPixelData(void *dst, int level, Format format, Type type,
+                            unsigned int alignment) const {
+    if (!isBound())
+        ORU_THROW_INTERNAL("Texture must be bound");
+    if (format == FORMAT_COLOR_INDEX)
+        ORU_THROW_INTERNAL("COLOR_INDEX not allowed here!");
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    PushAndSetReadbackByteAlignment(alignment);
+    ORU_GL(GetTexImage, target(), level, glFormat, glType, dst);
+    PopPixelTransferModes();
+}
+
+void Texture2::getPixelData(Buffer *buffer, std::size_t offset, int level, Format format, Type type,
+                            unsigned int alignment) const {
+    if (!isBound())
+        ORU_THROW_INTERNAL("Texture must be bound");
+    internal::CheckBuffer(buffer);
+    if (format == FORMAT_COLOR_INDEX)
+        ORU_THROW_INTERNAL("COLOR_INDEX not allowed here!");
+    internal::CheckByteAlignment(alignment);
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    if (!buffer->isPackBuffer())
+        buffer->convertToPackBuffer();
+    PushAndSetReadbackByteAlignment(alignment);
+    internal::BoundBuffer bound(*buffer);
+    ORU_GL(GetTexImage, target(), level, glFormat, glType, internal::BufferOffset(offset));
+    bound.restore();
+    PopPixelTransferModes();
+}
+
+std::size_t Texture2::pixelDataSize(int /*level*/, Format format, Type type) const {
+    return BytesPerPixel(format, type) * width(0) * height(0);
+}
+
+Texture2D::Texture2D(InternalFormat format, std::uint64_t width, std::uint64_t height,
+                     bool mipmapped, void *clientStorage, Type type)
+    : Texture2(TARGET_TEXTURE_2D, TARGETBINDING_TEXTURE_BINDING_2D, format, width, height,
+               mipmapped, clientStorage, type) {}
+
+TextureRECT::TextureRECT(InternalFormat format, std::uint64_t width, std::uint64_t height,
+                         void *clientStorage, Type type)
+    : Texture2(TARGET_TEXTURE_RECTANGLE, TARGETBINDING_TEXTURE_BINDING_RECTANGLE, format, width,
+               height, false, clientStorage, type) {}
+
+bool TextureRECT::IsSupported() {
+    return internal::Supports(GL_ARB_TEXTURE_RECTANGLE);
+}
+
+Texture1DArray::Texture1DArray(InternalFormat format, std::uint64_t width, std::uint64_t layers,
+                               bool mipmapped)
+    : Texture2(TARGET_TEXTURE_1D_ARRAY, TARGETBINDING_TEXTURE_BINDING_1D_ARRAY, format, width,
+               layers, mipmapped, nullptr, TYPE_NONE) {}
+
+std::uint64_t Texture1DArray::depth(unsigned int /*level*/) const {
+    return Texture::depth(0);
+}
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,122 @@
+// Textures with two sides.
+#pragma once
+
+#include "oru/oru_ogl/ogl/texture.h"
+
+namespace ORU {
+namespace OGL {
+
+class Buffer;
+
+/// A texture of rows of texels; the layers of a 1-D array count as rows. The transfers act on the
+/// texture bound to the target.
+class ORU_API Texture2 : public Texture {
+public:
+    ~Texture2() override;
+
+    /// The caller's memory that the texture was made over, or null.
+    void *clientStorage() const { return clientStorage_; }
+
+    /// @throws InternalException when the texture is not bound
+    /// @note glGetIntegerv, glTexParameteri
+    void setWrap(WrapMode s, WrapMode t);
+
+    /// Uploads a rectangle of texels from memory.
+    ///
+    ///     texture.subImage(0, 0, 0, width, height, Texture::FORMAT_RGBA,
+    ///                      Texture::TYPE_UNSIGNED_BYTE, pixels, PixelUnpackParameters());
+    ///
+    /// @param level mip level, at least 0; the size is compared with level 0 whatever it is
+    /// @param x, y first texel to write
+    /// @param width, height texels, at least 1
+    /// @param format, type of the pixels at `data`, which lie there as `params` tell
+    /// @throws InternalException for a size or level out of range. Whether the rectangle lies
+    ///         within the texture OpenGL says, by ExceptionOGL, which leaves the upload's unpack
+    ///         state on the client attribute stack
+    /// @note glPushClientAttrib, glPixelStorei, glTexSubImage2D, glPopClientAttrib
+    void subImage(int level, int x, int y, std::uint64_t width, std::uint64_t height, Format format,
+                  Type type, void const *data, PixelUnpackParameters const &params);
+
+    /// Uploads a rectangle of texels from a buffer, which becomes a pixel unpack buffer. What was
+    /// bound as such is bound again at the end.
+    /// @param offset bytes from the buffer's beginning to the pixel data
+    /// @throws InternalException also for an offset behind the buffer, and for a mapped buffer
+    void subImage(int level, int x, int y, std::uint64_t width, std::uint64_t height, Format format,
+                  Type type, Buffer *buffer, std::size_t offset,
+                  PixelUnpackParameters const &params);
+
+    /// Copies a rectangle of the current read framebuffer, beginning at (x, y).
+    /// @throws InternalException for a size or level out of range, as `subImage`
+    /// @note glCopyTexSubImage2D
+    void copyTexSubImage(int level, int xOffset, int yOffset, int x, int y, std::uint64_t width,
+                         std::uint64_t height);
+
+    /// Reads a level into memory of `pixelDataSize` bytes (for level 0 and alignment 1).
+    /// @param alignment bytes that rows are aligned to: 1, 2, 4 or 8
+    /// @throws InternalException when the texture is not bound, for FORMAT_COLOR_INDEX and for
+    ///         other alignments
+    /// @note glPushClientAttrib, glPixelStorei, glGetTexImage, glPopClientAttrib
+    void getPixelData(void *dst, int level, Format format, Type type, unsigned int alignment) const;
+
+    /// Reads a level into a buffer, which becomes a pixel pack buffer. What was bound as such is
+    /// bound again at the end.
+    /// @param offset bytes from the buffer's beginning
+    /// @throws InternalException also for a mapped buffer
+    void getPixelData(Buffer *buffer, std::size_t offset, int level, Format format, Type type,
+                      unsigned int alignment) const;
+
+    /// Bytes that level 0 takes in memory when its rows have no gaps, whatever the level.
+    /// @throws InternalException for types other than bytes, shorts, half floats and floats
+    std::size_t pixelDataSize(int level, Format format, Type type) const;
+
+protected:
+    /// @param clientStorage pixels that the texture is made over and that outlive it, or null
+    /// @param type of the components at `clientStorage`; TYPE_NONE means unsigned bytes
+    /// @throws InternalException for a size that is no power of two where that is needed, and for
+    ///         client storage without GL_APPLE_client_storage; ExceptionOGL when OpenGL refuses
+    ///         size or format
+    /// @note glTexImage2D
+    Texture2(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
+             std::uint64_t height, bool mipmapped, void *clientStorage, Type type);
+
+private:
+    void allocate(bool mipmapped, Type type);
+
+    void *clientStorage_;
+};
+
+/// GL_TEXTURE_2D.
+class ORU_API Texture2D : public Texture2 {
+public:
+    /// @param width, height texels of level 0
+    /// @param mipmapped whether the levels down to one texel are allocated too
+    /// @param clientStorage, type see Texture2
+    Texture2D(InternalFormat format, std::uint64_t width, std::uint64_t height, bool mipmapped,
+              void *clientStorage = nullptr, Type type = TYPE_NONE);
+
+    static bool IsSupported() { return true; }
+};
+
+/// GL_TEXTURE_RECTANGLE: sampled by texel coordinates, without mipmaps.
+class ORU_API TextureRECT : public Texture2 {
+public:
+    /// @param clientStorage, type see Texture2
+    TextureRECT(InternalFormat format, std::uint64_t width, std::uint64_t height,
+                void *clientStorage = nullptr, Type type = TYPE_NONE);
+
+    /// GL_ARB_texture_rectangle.
+    static bool IsSupported();
+};
+
+/// GL_TEXTURE_1D_ARRAY: `height(0)` layers of one row each, as many on every mip level.
+class ORU_API Texture1DArray : public Texture2 {
+public:
+    Texture1DArray(InternalFormat format, std::uint64_t width, std::uint64_t layers,
+                   bool mipmapped);
+
+    /// Always 1.
+    std::uint64_t depth(unsigned int level) const override;
+};
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,170 @@
+// Textures with three sides.
+#include "oru/oru_ogl/ogl/texture3.h"
+
+#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/imagetransfer.h"
+#include "oru/oru_ogl/ogl/internal/supported.h"
+#include "oru/oru_ogl/ogl/internal/texturestorage.h"
+#include "oru/oru_ogl/platformgl.h"
+
+namespace ORU {
+namespace OGL {
+
+/// The part of construction that both ways share: `allocate` runs with the texture bound.
+template<class Allocate>
+void Texture3::initialize(Allocate allocate) {
+    if (!internal::CurrentRecord(&ExtensionManager::supportsNonPowerOfTwoTextures) &&
+        !(internal::IsPowerOfTwoSize(width(0)) && internal::IsPowerOfTwoSize(height(0)) &&
+          internal::IsPowerOfTwoSize(Texture::depth(0))))
+        ORU_THROW_INTERNAL("Texture3::ctor hardware only supports power of two textures");
+
+    unsigned int const previous = getBoundID();
+    ORU_GL(BindTexture, target(), objectID());
+    internal::Ending restore([&] { ORU_GL(BindTexture, target(), previous); });
+    allocate(std::array{internal::ToGLsizei(width(0)), internal::ToGLsizei(height(0)),
+                        internal::ToGLsizei(Texture::depth(0))});
+    setFilter(FILTER_NEAREST, FILTER_NEAREST);
+    WrapMode const wrap = internal::CurrentRecord(&ExtensionManager::supportsClampToEdge)
+                              ? WRAPMODE_CLAMP_TO_EDGE
+                              : WRAPMODE_CLAMP;
+    setWrap(wrap, wrap, wrap);
+    restore.now();
+}
+
+Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
+                   std::uint64_t height, std::uint64_t depth, bool mipmapped)
+    : Texture(target, binding, format, width, height, depth) {
+    auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format));
+    unsigned int const glFormat = getGLFormat(format);
+    std::size_t const halved = target == TARGET_TEXTURE_2D_ARRAY ? 2 : 3;
+    initialize([&](std::array<GLsizei, 3> const &level0) {
+        internal::ForEachLevel(
+            level0, halved, mipmapped, [&](GLint level, std::array<GLsizei, 3> const &sides) {
+                ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1],
+                       sides[2], 0, glFormat, GL_UNSIGNED_BYTE, nullptr);
+            });
+    });
+}
+
+Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, int level,
+                   std::uint64_t width, std::uint64_t height, std::uint64_t depth,
+                   Format clientFormat, Type type, void const *data,
+                   PixelUnpackParameters const &params)
+    : Texture(target, binding, format, width, height, depth) {
+    auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format));
+    unsigned int const glFormat = Format2GL(clientFormat);
+    unsigned int const glType = Type2GL(type);
+    initialize([&](std::array<GLsizei, 3> const &sides) {
+        internal::WithUnpackState(params, [&] {
+            ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1],
+                   sides[2], 0, glFormat, glType, data);
+        });
+    });
+}
+
+Texture3::~Texture3() = default;
+
+void Texture3::setWrap(WrapMode s, WrapMode t, WrapMode r) {
+    ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_S, static_cast<GLint>(WrapMode2GL(s)));
+    ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_T, static_cast<GLint>(WrapMode2GL(t)));
+    ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_R, static_cast<GLint>(WrapMode2GL(r)));
+}
+
+void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std::uint64_t height,
+                        std::uint64_t depth, Format format, Type type, void const *data,
+                        PixelUnpackParameters const &params) {
+    internal::CheckPart("subimage", level,
+                        {{"width", "width ", width, this->width(0)},
+                         {"height", "height", height, this->height(0)},
+                         {"depth", "depth ", depth, this->depth(0)}});
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    internal::WithUnpackState(params, [&] {
+        ORU_GL(TexSubImage3D, target(), level, x, y, z, static_cast<GLsizei>(width),
+               static_cast<GLsizei>(height), static_cast<GLsizei>(depth), glFormat, glType, data);
+    });
+}
+
+void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std::uint64_t height,
+                        std::uint64_t depth, Format format, Type type, Buffer *buffer,
+                        std::size_t offset, PixelUnpackParameters const &params) {
+    internal::CheckPart("subimage", level,
+                        {{"width", "width ", width, this->width(0)},
+                         {"height", "height", height, this->height(0)},
+                         {"depth", "depth ", depth, this->depth(0)}});
+    internal::CheckUnpackBuffer(buffer, offset);
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    if (!buffer->isUnpackBuffer())
+        buffer->convertToUnpackBuffer();
+    internal::WithUnpackState(params, [&] {
+        internal::BoundBuffer bound(*buffer);
+        ORU_GL(TexSubImage3D, target(), level, x, y, z, static_cast<GLsizei>(width),
+               static_cast<GLsizei>(height), static_cast<GLsizei>(depth), glFormat, glType,
+               internal::BufferOffset(offset));
+        bound.restore();
+    });
+}
+
+void Texture3::copyTexSubImage(int level, int xOffset, int yOffset, int zOffset, int x, int y,
+                               std::uint64_t width, std::uint64_t height) {
+    internal::CheckPart(
+        "copySubimage", level,
+        {{"width", "width", width, this->width(0)}, {"height", "height", height, this->height(0)}});
+    ORU_GL(CopyTexSubImage3D, target(), level, xOffset, yOffset, zOffset, x, y,
+           static_cast<GLsizei>(width), static_cast<GLsizei>(height));
+}
+
+void Texture3::getPixelData(void *dst, int level, Format format, Type type,
+                            unsigned int alignment) const {
+    if (format == FORMAT_COLOR_INDEX)
+        ORU_THROW_INTERNAL("COLOR_INDEX not allowed here!");
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    PushAndSetReadbackByteAlignment(alignment);
+    ORU_GL(GetTexImage, target(), level, glFormat, glType, dst);
+    PopPixelTransferModes();
+}
+
+void Texture3::getPixelData(Buffer *buffer, int offset, int level, Format format, Type type,
+                            unsigned int alignment) const {
+    internal::CheckBuffer(buffer);
+    internal::CheckByteAlignment(alignment);
+    unsigned int const glFormat = Format2GL(format);
+    unsigned int const glType = Type2GL(type);
+    if (!buffer->isPackBuffer())
+        buffer->convertToPackBuffer();
+    PushAndSetReadbackByteAlignment(alignment);
+    internal::BoundBuffer bound(*buffer);
+    ORU_GL(GetTexImage, target(), level, glFormat, glType,
+           internal::BufferOffset(static_cast<std::uint64_t>(offset)));
+    bound.restore();
+    PopPixelTransferModes();
+}
+
+std::size_t Texture3::pixelDataSize(int /*level*/, Format format, Type type) const {
+    return BytesPerPixel(format, type) * width(0) * height(0) * depth(0);
+}
+
+Texture3D::Texture3D(InternalFormat format, std::uint64_t width, std::uint64_t height,
+                     std::uint64_t depth, bool mipmapped)
+    : Texture3(TARGET_TEXTURE_3D, TARGETBINDING_TEXTURE_BINDING_3D, format, width, height, depth,
+               mipmapped) {}
+
+Texture3D::Texture3D(InternalFormat format, int level, std::uint64_t width, std::uint64_t height,
+                     std::uint64_t depth, Format clientFormat, Type type, void const *data,
+                     PixelUnpackParameters const &params)
+    : Texture3(TARGET_TEXTURE_3D, TARGETBINDING_TEXTURE_BINDING_3D, format, level, width, height,
+               depth, clientFormat, type, data, params) {}
+
+Texture2DArray::Texture2DArray(InternalFormat format, std::uint64_t width, std::uint64_t height,
+                               std::uint64_t layers, bool mipmapped)
+    : Texture3(TARGET_TEXTURE_2D_ARRAY, TARGETBINDING_TEXTURE_BINDING_2D_ARRAY, format, width,
+               height, layers, mipmapped) {}
+
+std::uint64_t Texture2DArray::depth(unsigned int /*level*/) const {
+    return Texture::depth(0);
+}
+
+} // namespace OGL
+} // namespace ORU

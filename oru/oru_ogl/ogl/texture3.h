@@ -1,0 +1,109 @@
+// Textures with three sides.
+#pragma once
+
+#include "oru/oru_ogl/ogl/texture.h"
+
+namespace ORU {
+namespace OGL {
+
+class Buffer;
+
+/// A texture of images of texels; the layers of a 2-D array count as images. The transfers act on
+/// the texture bound to the target.
+class ORU_API Texture3 : public Texture {
+public:
+    ~Texture3() override;
+
+    /// @note glTexParameteri
+    void setWrap(WrapMode s, WrapMode t, WrapMode r);
+
+    /// Uploads a box of texels from memory.
+    /// @param level mip level, at least 0; the size is compared with level 0 whatever it is
+    /// @param x, y, z first texel to write
+    /// @param width, height, depth texels, at least 1
+    /// @param format, type of the pixels at `data`, which lie there as `params` tell
+    /// @throws InternalException for a size or level out of range. Whether the box lies within the
+    ///         texture OpenGL says, by ExceptionOGL, which leaves the upload's unpack state on the
+    ///         client attribute stack
+    /// @note glPushClientAttrib, glPixelStorei, glTexSubImage3D, glPopClientAttrib
+    void subImage(int level, int x, int y, int z, std::uint64_t width, std::uint64_t height,
+                  std::uint64_t depth, Format format, Type type, void const *data,
+                  PixelUnpackParameters const &params);
+
+    /// Uploads a box of texels from a buffer, which becomes a pixel unpack buffer. What was bound
+    /// as such is bound again at the end.
+    /// @param offset bytes from the buffer's beginning to the pixel data
+    /// @throws InternalException also for an offset behind the buffer, and for a mapped buffer
+    void subImage(int level, int x, int y, int z, std::uint64_t width, std::uint64_t height,
+                  std::uint64_t depth, Format format, Type type, Buffer *buffer, std::size_t offset,
+                  PixelUnpackParameters const &params);
+
+    /// Copies a rectangle of the current read framebuffer, beginning at (x, y), into one image.
+    /// @throws InternalException for a size or level out of range, as `subImage`
+    /// @note glCopyTexSubImage3D
+    void copyTexSubImage(int level, int xOffset, int yOffset, int zOffset, int x, int y,
+                         std::uint64_t width, std::uint64_t height);
+
+    /// Reads a level into memory of `pixelDataSize` bytes (for level 0 and alignment 1).
+    /// @param alignment bytes that rows are aligned to: 1, 2, 4 or 8
+    /// @throws InternalException for FORMAT_COLOR_INDEX and for other alignments
+    /// @note glPushClientAttrib, glPixelStorei, glGetTexImage, glPopClientAttrib
+    void getPixelData(void *dst, int level, Format format, Type type, unsigned int alignment) const;
+
+    /// Reads a level into a buffer, which becomes a pixel pack buffer. What was bound as such is
+    /// bound again at the end.
+    /// @param offset bytes from the buffer's beginning
+    /// @throws InternalException for a mapped buffer and for other alignments
+    void getPixelData(Buffer *buffer, int offset, int level, Format format, Type type,
+                      unsigned int alignment) const;
+
+    /// Bytes that level 0 takes in memory when its rows have no gaps, whatever the level.
+    /// @throws InternalException for types other than bytes, shorts, half floats and floats
+    std::size_t pixelDataSize(int level, Format format, Type type) const;
+
+protected:
+    /// @throws InternalException for a size that is no power of two where that is needed,
+    ///         ExceptionOGL when OpenGL refuses size or format
+    /// @note glTexImage3D
+    Texture3(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
+             std::uint64_t height, std::uint64_t depth, bool mipmapped);
+
+    /// Makes one level with its contents; failures as above.
+    /// @param clientFormat, type of the pixels at `data`, which lie there as `params` tell
+    Texture3(Target target, TargetBinding binding, InternalFormat format, int level,
+             std::uint64_t width, std::uint64_t height, std::uint64_t depth, Format clientFormat,
+             Type type, void const *data, PixelUnpackParameters const &params);
+
+private:
+    template<class Allocate>
+    void initialize(Allocate allocate);
+};
+
+/// GL_TEXTURE_3D.
+class ORU_API Texture3D : public Texture3 {
+public:
+    /// @param width, height, depth texels of level 0
+    /// @param mipmapped whether the levels down to one texel are allocated too
+    Texture3D(InternalFormat format, std::uint64_t width, std::uint64_t height, std::uint64_t depth,
+              bool mipmapped);
+
+    /// See Texture3.
+    Texture3D(InternalFormat format, int level, std::uint64_t width, std::uint64_t height,
+              std::uint64_t depth, Format clientFormat, Type type, void const *data,
+              PixelUnpackParameters const &params);
+
+    static bool IsSupported() { return true; }
+};
+
+/// GL_TEXTURE_2D_ARRAY: `depth(level)` layers on every mip level.
+class ORU_API Texture2DArray : public Texture3 {
+public:
+    Texture2DArray(InternalFormat format, std::uint64_t width, std::uint64_t height,
+                   std::uint64_t layers, bool mipmapped);
+
+    /// The number of layers.
+    std::uint64_t depth(unsigned int level) const override;
+};
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,52 @@
+// Texturing with one 2-D texture for a scope.
+#include "oru/oru_ogl/ogl/texturebindscope.h"
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/dropexceptions.h"
+#include "oru/oru_ogl/ogl/texture2.h"
+#include "oru/oru_ogl/ogl/texturestate.h"
+#include "oru/oru_ogl/ogl/textureunit.h"
+#include "oru/oru_ogl/platformgl.h"
+
+namespace ORU {
+namespace OGL {
+
+Texture2DBindScope::Texture2DBindScope(Texture2D *theTexture, unsigned int unit, bool active)
+    : active_(active) {
+    if (!active_)
+        return;
+    ORU_ASSERT(theTexture);
+    previousUnit_ = TextureState::ActiveTextureUnit();
+    TextureState::SetActiveTextureUnit(unit);
+    unit_ = unit;
+    try {
+        TextureUnit const &theUnit = *TextureUnit::Unit(unit);
+        theUnit.enable2D();
+        theUnit.bind(theTexture);
+        theTexture->setFilter(Texture::FILTER_NEAREST, Texture::FILTER_NEAREST);
+        theTexture->setWrap(Texture::WRAPMODE_CLAMP_TO_EDGE, Texture::WRAPMODE_CLAMP_TO_EDGE);
+        theUnit.setEnv(TextureUnit::ENVIRONMENT_REPLACE);
+    } catch (...) {
+        end();
+        throw;
+    }
+}
+
+Texture2DBindScope::~Texture2DBindScope() {
+    if (active_)
+        end();
+}
+
+void Texture2DBindScope::end() const noexcept {
+    internal::DropExceptions([this] {
+        TextureState::SetActiveTextureUnit(unit_);
+        TextureUnit const &unit = *TextureUnit::Unit(unit_);
+        unit.bind2DDefault();
+        unit.disable2D();
+        TextureState::SetActiveTextureUnit(previousUnit_);
+    });
+}
+
+} // namespace OGL
+} // namespace ORU
