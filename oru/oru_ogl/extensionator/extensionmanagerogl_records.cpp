@@ -79,7 +79,11 @@ ExtensionManager *ExtensionManager::Instance(HGLRC const &rc) {
 }
 
 FunctionTable const &ExtensionManager::CurrentTable() {
-    return CurrentTable(ORU_WGL0(GetCurrentContext));
+    // The look-up of the other form once more, so that the handle stays in a register.
+    HGLRC const rc = ORU_WGL0(GetCurrentContext);
+    if (FunctionTable const *table = ContextRegistry::FindTable(rc))
+        return *table;
+    return FindOrMakeTable(rc);
 }
 
 FunctionTable const &ExtensionManager::CurrentTable(HGLRC const &rc) {
