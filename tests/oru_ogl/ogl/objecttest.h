@@ -42,7 +42,27 @@ public:
     ORU_FOLLOW(FramebuffersEXT)
     ORU_FOLLOW(RenderbuffersEXT)
     ORU_FOLLOW(Textures)
+    ORU_FOLLOW(VertexArrays)
 #undef ORU_FOLLOW
+
+    GLuint cgmCreateShader(char const *file, unsigned int line, GLenum type) override {
+        GLuint const name = OpenGLForwarder::cgmCreateShader(file, line, type);
+        add("Shader", 1, &name);
+        return name;
+    }
+    void cgmDeleteShader(char const *file, unsigned int line, GLuint name) override {
+        remove("Shader", 1, &name);
+        OpenGLForwarder::cgmDeleteShader(file, line, name);
+    }
+    GLuint cgmCreateProgram(char const *file, unsigned int line) override {
+        GLuint const name = OpenGLForwarder::cgmCreateProgram(file, line);
+        add("Program", 1, &name);
+        return name;
+    }
+    void cgmDeleteProgram(char const *file, unsigned int line, GLuint name) override {
+        remove("Program", 1, &name);
+        OpenGLForwarder::cgmDeleteProgram(file, line, name);
+    }
 
     int made() const {
         return made_;

@@ -1,0 +1,99 @@
+// Renderbuffers: storage to render into that no shader reads.
+#include "oru/oru_ogl/ogl/renderbuffer.h"
+
+#include "oru/core/utility/composetext.h"
+#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/ending.h"
+#include "oru/oru_ogl/ogl/internal/release.h"
+#include "oru/oru_ogl/ogl/internal/supported.h"
+#include "oru/oru_ogl/platformgl.h"
+
+namespace ORU {
+namespace OGL {
+
+namespace {
+
+/// The first of GL_EXT_framebuffer_object's five values for stencil indices; it has no name there.
+constexpr GLenum kFirstStencilIndex = 0x8D45;
+
+GLenum AttachmentOf(GLenum format) {
+    switch (format) {
+    case GL_DEPTH_COMPONENT:
+    case GL_DEPTH_COMPONENT16:
+    case GL_DEPTH_COMPONENT24:
+    case GL_DEPTH_COMPONENT32:
+    case GL_DEPTH_STENCIL_EXT:
+        return GL_DEPTH_ATTACHMENT_EXT;
+    case kFirstStencilIndex:
+    case GL_STENCIL_INDEX1_EXT:
+    case GL_STENCIL_INDEX4_EXT:
+    case GL_STENCIL_INDEX8_EXT:
+    case GL_STENCIL_INDEX16_EXT:
+        return GL_STENCIL_ATTACHMENT_EXT;
+    default:
+        return GL_COLOR_ATTACHMENT0_EXT;
+    }
+}
+
+} // namespace
+
+Renderbuffer::Renderbuffer(unsigned int format, int width, int height)
+    : Object(GL_RENDERBUFFER_EXT, GL_RENDERBUFFER_BINDING_EXT), format_(format),
+      attachment_(AttachmentOf(format)), width_(width), height_(height) {
+    ORU_ASSERT_SUPPORTED(GL_EXT_FRAMEBUFFER_OBJECT);
+    int const maximum = MaxSize();
+    if (width > maximum)
+        ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of width ", width,
+                                       ", a max width of ", maximum, " is supported"));
+    if (height > maximum)
+        ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of width ", height,
+                                       ", a max height of ", maximum, " is supported"));
+    ORU_GL(GenRenderbuffersEXT, 1, &objectID_);
+    try {
+        makeStorage();
+    } catch (...) {
+        deleteObject();
+        throw;
+    }
+}
+
+void Renderbuffer::makeStorage() {
+    unsigned int const previous = getBoundID();
+    internal::Ending restore([&] { ORU_GL(BindRenderbufferEXT, target(), previous); });
+    bind();
+    ORU_GL(RenderbufferStorageEXT, target(), format_, width_, height_);
+    ORU_ASSERT(objectID_ != 0);
+    unbind();
+    restore.now();
+}
+
+Renderbuffer::~Renderbuffer() {
+    deleteObject();
+}
+
+void Renderbuffer::deleteObject() noexcept {
+    internal::Release([this] { ORU_GL(DeleteRenderbuffersEXT, 1, &objectID_); });
+}
+
+void Renderbuffer::bind() {
+    ORU_GL(BindRenderbufferEXT, target(), objectID_);
+}
+
+void Renderbuffer::unbind() {
+    if (!isBound())
+        ORU_THROW_INTERNAL("Framebuffer object must be bound before calling unbind()");
+    ORU_GL(BindRenderbufferEXT, target(), 0);
+}
+
+int Renderbuffer::MaxSize() {
+    GLint maximum = 0;
+    ORU_GL(GetIntegerv, GL_MAX_RENDERBUFFER_SIZE_EXT, &maximum);
+    return maximum;
+}
+
+bool Renderbuffer::IsSupported() {
+    return internal::Supports(GL_EXT_FRAMEBUFFER_OBJECT);
+}
+
+} // namespace OGL
+} // namespace ORU

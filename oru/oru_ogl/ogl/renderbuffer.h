@@ -1,0 +1,60 @@
+// Renderbuffers: storage to render into that no shader reads.
+#pragma once
+
+#include "oru/oru_ogl/ogl/object.h"
+
+namespace ORU {
+namespace OGL {
+
+/// One renderbuffer of GL_EXT_framebuffer_object; attach it to a Framebuffer.
+class ORU_API Renderbuffer : public Object {
+public:
+    /// Makes a renderbuffer and its storage. The bound renderbuffer stays bound.
+    /// @param format GL internal format, which also says what the buffer is attached as: the depth
+    ///        formats as depth, the stencil index formats as stencil, GL_DEPTH_STENCIL_EXT as both,
+    ///        any other as a colour
+    /// @param width, height pixels, at most `MaxSize()`
+    /// @throws InternalException without the extension or for a size that is too large,
+    ///         ExceptionOGL for what OpenGL itself refuses
+    /// @note glGenRenderbuffersEXT, glRenderbufferStorageEXT
+    Renderbuffer(unsigned int format, int width, int height);
+
+    /// @note glDeleteRenderbuffersEXT
+    ~Renderbuffer() override;
+
+    unsigned int format() const { return format_; }
+    int width() const { return width_; }
+    int height() const { return height_; }
+
+    /// @note glBindRenderbufferEXT
+    void bind();
+
+    /// Binds no renderbuffer.
+    /// @throws InternalException when this one is not bound
+    /// @note glBindRenderbufferEXT
+    void unbind();
+
+    /// The largest width and height in pixels. @note glGetIntegerv
+    static int MaxSize();
+
+    /// Whether the current context has GL_EXT_framebuffer_object; false without a context.
+    static bool IsSupported();
+
+protected:
+    friend class Framebuffer;
+
+    /// The GL attachment point that the format asks for.
+    unsigned int attachment() const { return attachment_; }
+
+private:
+    void makeStorage();
+    void deleteObject() noexcept;
+
+    unsigned int format_;
+    unsigned int attachment_;
+    int width_;
+    int height_;
+};
+
+} // namespace OGL
+} // namespace ORU

@@ -1,0 +1,311 @@
+// Shaders and programs: their states, their logs, what they refuse.
+#include "objecttest.h"
+
+#include "oru/oru_ogl/ogl/oruopengl.h"
+#include "oru/oru_ogl/ogl/programenabledscope.h"
+#include "oru/oru_ogl/ogl/programogl.h"
+#include "oru/oru_ogl/ogl/shader.h"
+
+#include <functional>
+#include <utility>
+
+using namespace ORU::OGL;
+using oru_test::CountingForwarder;
+using oru_test::MessageOf;
+using oru_test::Pushed;
+
+namespace {
+
+char const kVertex[] = "attribute vec4 position; attribute vec4 colour; varying vec4 shade;"
+                       "void main() { shade = colour; gl_Position = position; }";
+char const kFragment[] = "varying vec4 shade; uniform float gain; uniform vec2 offsets[3];"
+                         "void main() { gl_FragColor = gain * shade + vec4(offsets[2], 0, 0); }";
+char const kBroken[] = "void main() { gl_FragColor = nothing; }";
+
+void Load(Program &program, char const *vertex = kVertex, char const *fragment = kFragment) {
+    program.loadVertexShader(1, &vertex, nullptr);
+    program.loadFragmentShader(1, &fragment, nullptr);
+}
+
+template<class Object>
+std::string LogOf(Object &object) {
+    std::string log(static_cast<std::size_t>(object.getInfoLogLength()), '\0');
+    object.getInfoLog(static_cast<int>(log.size()), &log[0]);
+    return log.c_str();
+}
+
+/// Answers for the driver: its log, and whether compiling and linking succeeds.
+class Driver : public OpenGLForwarder {
+public:
+    int status = 0;
+    std::string log;
+
+    void cgmGetShaderiv(char const *, unsigned int, GLuint, GLenum name, GLint *value) override {
+        *value = answer(name);
+    }
+    void cgmGetProgramiv(char const *, unsigned int, GLuint, GLenum name, GLint *value) override {
+        *value = answer(name);
+    }
+    void cgmGetProgramInfoLog(char const *, unsigned int, GLuint, GLsizei size, GLsizei *length,
+                              char *buffer) override {
+        *length = static_cast<GLsizei>(log.copy(buffer, static_cast<std::size_t>(size) - 1));
+        buffer[*length] = '\0';
+    }
+
+private:
+    GLint answer(GLenum name) const {
+        if (name != GL_INFO_LOG_LENGTH)
+            return status;
+        return log.empty() ? 0 : static_cast<GLint>(log.size()) + 1;
+    }
+};
+
+class ProgramTest : public oru_test::ObjectTest {};
+
+} // namespace
+
+TEST_F(ProgramTest, ShaderTypesAreThoseOfTheContext) {
+    // A context of OpenGL 4 has all types but one.
+    FragmentShader const fragment;
+    VertexShader const vertex;
+    TessellationControlShader const control;
+    TessellationEvaluationShader const evaluation;
+    GeometryShader const geometry;
+    EXPECT_FALSE(Shader::IsSupported(Shader::SHADERTYPE_COMPUTE));
+    EXPECT_EQ("Unsupported shader type", MessageOf([] { ComputeShader shader; }));
+    EXPECT_EQ("Unsupported shader type",
+              MessageOf([] { Shader shader(static_cast<Shader::ShaderType>(6)); }));
+}
+
+TEST_F(ProgramTest, ShaderIsLoadedThenCompiled) {
+    VertexShader shader;
+    EXPECT_FALSE(shader.isLoaded());
+    shader.load("");
+    EXPECT_FALSE(shader.isLoaded());
+    // Two texts, the first by its length, the second by its final zero.
+    char const *const texts[] = {"void main() { rubbish", "gl_Position = vec4(0); }"};
+    int const lengths[] = {14, -1};
+    shader.load(2, texts, lengths);
+    EXPECT_TRUE(shader.isLoaded());
+    EXPECT_FALSE(shader.isCompiled());
+    shader.compile(true);
+    EXPECT_TRUE(shader.isCompiled());
+
+    FragmentShader broken;
+    broken.load(kBroken);
+    broken.compile(false);
+    EXPECT_FALSE(broken.isCompiled());
+    std::string const log = LogOf(broken);
+    EXPECT_NE(std::string::npos, log.find("nothing")) << log;
+    EXPECT_EQ("Program Compile Error: \n" + log, MessageOf([&] { broken.compile(true); }));
+    Pushed<Driver> silent;
+    EXPECT_EQ("Unknown Compile Error.", MessageOf([&] { broken.compile(true); }));
+}
+
+TEST_F(ProgramTest, LinkReportsTheLog) {
+    Program program;
+    EXPECT_FALSE(program.isLinked());
+    Load(program, kVertex, kBroken); // the failed compilation shows at link time
+    program.link(false);
+    EXPECT_FALSE(program.isLinked());
+    std::string const log = LogOf(program);
+    EXPECT_FALSE(log.empty());
+    EXPECT_EQ("Program Link Error: \n" + log, MessageOf([&] { program.link(true); }));
+    EXPECT_EQ("Program must be linked before being enabled", MessageOf([&] { program.enable(); }));
+
+    Pushed<Driver> driver;
+    EXPECT_EQ("Unknown Program Link Error\n", MessageOf([&] { program.link(true); }));
+    driver->status = 1;
+    driver->log = "x";
+    EXPECT_EQ("", MessageOf([&] { program.link(true); })) << "a note does not fail a link";
+    driver->log = "The shader will run in software.";
+    EXPECT_EQ("Program Link Error(Falling to Software): \n" + driver->log,
+              MessageOf([&] { program.link(true); }));
+    EXPECT_EQ("", MessageOf([&] { program.link(false); }));
+}
+
+TEST_F(ProgramTest, AttachesLoadedShadersOnly) {
+    Program program;
+    FragmentShader shader;
+    EXPECT_EQ("Shader must be loaded before attaching",
+              MessageOf([&] { program.attach(&shader); }));
+    shader.load(kFragment);
+    program.attach(&shader); // not compiled
+    program.detach(&shader);
+    EXPECT_NE("", MessageOf([&] { program.detach(&shader); })) << "detached already";
+    EXPECT_EQ("Enforce coreShader != NULL", MessageOf([&] { program.attach(nullptr); }));
+    Shader const taken = std::move(shader);
+    EXPECT_EQ("Enforce coreShader != NULL", MessageOf([&] { program.attach(&shader); }));
+}
+
+TEST_F(ProgramTest, DetachesByType) {
+    Program program;
+    VertexShader vertex;
+    vertex.load(kVertex);
+    program.attach(&vertex);
+    Pushed<CountingForwarder> calls;
+    program.detachAllFragmentShaders();
+    EXPECT_EQ(4, calls->count("GetAttachedShaders"));
+    EXPECT_EQ(0, calls->count("DetachShader"));
+    char const *source = kFragment;
+    for (int i = 0; i < 70; ++i)
+        program.loadFragmentShader(1, &source, nullptr);
+    program.detachAllFragmentShaders();
+    EXPECT_EQ(70, calls->count("DetachShader"));
+    program.detachAllVertexShaders();
+    EXPECT_EQ(71, calls->count("DetachShader"));
+    for (int i = 0; i < 70; ++i)
+        program.loadFragmentShader(1, &source, nullptr);
+    program.attach(&vertex);
+    program.detachAllShaders();
+    EXPECT_EQ(142, calls->count("DetachShader"));
+    calls->reset();
+    program.detachAllShaders();
+    EXPECT_EQ(1, calls->total());
+}
+
+TEST_F(ProgramTest, IsCurrentWhileEnabled) {
+    Program first, second;
+    Load(first);
+    Load(second);
+    first.link(true);
+    second.link(true);
+    EXPECT_TRUE(first.validate());
+    EXPECT_FALSE(first.isEnabled());
+    first.enable();
+    EXPECT_TRUE(first.isEnabled());
+    second.enable();
+    EXPECT_FALSE(first.isEnabled());
+    first.disable(); // whichever is current
+    EXPECT_FALSE(second.isEnabled());
+
+    {
+        ProgramEnabledScope scope;
+        scope.enable(&first);
+        EXPECT_TRUE(first.isEnabled());
+        EXPECT_EQ("!theProgram_", MessageOf([&] { scope.enable(&second); }));
+        { ProgramEnabledScope const inner(&second); }
+        EXPECT_FALSE(first.isEnabled()) << "a scope leaves no program current";
+        first.enable();
+    }
+    EXPECT_FALSE(first.isEnabled());
+    EXPECT_EQ("theProgram", MessageOf([] { ProgramEnabledScope const scope(nullptr); }));
+    Program unlinked;
+    EXPECT_EQ("Program must be linked before being enabled",
+              MessageOf([&] { ProgramEnabledScope const scope(&unlinked); }));
+}
+
+TEST_F(ProgramTest, TellsAttributesAndUniforms) {
+    Program program;
+    Load(program);
+    char const needsLink[] = "Program must be linked to get active uniform count";
+    int size = 0;
+    unsigned int type = 0;
+    char name[32] = "";
+    EXPECT_EQ(needsLink, MessageOf([&] { program.getActiveUniformCount(); }));
+    EXPECT_EQ(needsLink, MessageOf([&] { program.getMaxUniformStringLength(); }));
+    EXPECT_EQ(needsLink, MessageOf([&] { program.getActiveUniform(0, 32, &size, &type, name); }));
+
+    program.setAttributeLocation(5, "colour");
+    program.setAttributeLocation(2, "position");
+    program.link(true);
+    EXPECT_EQ(5, program.getAttributeLocation("colour"));
+    EXPECT_EQ(2, program.getAttributeLocation("position"));
+    EXPECT_EQ(-1, program.getAttributeLocation("missing"));
+    EXPECT_EQ(-1, program.getUniformLocation("missing"));
+    EXPECT_LE(0, program.getUniformLocation("gain"));
+
+    ASSERT_EQ(2u, program.getActiveUniformCount());
+    EXPECT_EQ(11, program.getMaxUniformStringLength()); // "offsets[0]" and its zero
+    std::set<std::string> found;
+    for (unsigned int i = 0; i < 2; ++i) {
+        program.getActiveUniform(i, sizeof name, &size, &type, name);
+        found.insert(std::string(name) + " " + std::to_string(size) + " " + std::to_string(type));
+    }
+    EXPECT_EQ((std::set<std::string>{"gain 1 " + std::to_string(GL_FLOAT),
+                                     "offsets[0] 3 " + std::to_string(GL_FLOAT_VEC2)}),
+              found);
+    program.getActiveUniform(0, 3, &size, &type, name);
+    EXPECT_EQ(2u, std::string(name).size()) << "cut to fit";
+}
+
+TEST_F(ProgramTest, MovedFromObjectsThrow) {
+    Program program;
+    Load(program);
+    Program taken(std::move(program));
+    taken.link(true);
+    EXPECT_TRUE(taken.isLinked());
+    EXPECT_EQ("Enforce actualProgram_ != NULL", MessageOf([&] { program.link(true); }));
+    EXPECT_EQ("Enforce actualProgram_ != NULL", MessageOf([&] { program.setUniform(0, 1.f); }));
+    program = std::move(taken);
+    EXPECT_TRUE(program.isLinked());
+
+    VertexShader shader;
+    Shader other(std::move(shader));
+    EXPECT_EQ("Enforce actualShader_ != NULL", MessageOf([&] { shader.load(""); }));
+    EXPECT_FALSE(other.isLoaded());
+}
+
+TEST_F(ProgramTest, HelpersWorkOnGLNames) {
+    char const *const fragment = "uniform bool on; uniform vec4 four; uniform mat4 matrix;"
+                                 "uniform sampler2D image;"
+                                 "void main() { gl_FragColor = on ? matrix * four"
+                                 " : texture2D(image, vec2(0)); }";
+    GLuint const shader = ORU_GL(CreateShader, GL_FRAGMENT_SHADER);
+    ORU_GL(ShaderSource, shader, 1, &fragment, nullptr);
+    ORU_GL(CompileShader, shader);
+    GLuint const program = ORU_GL0(CreateProgram);
+    ORU_GL(AttachShader, program, shader);
+    ORU_GL(LinkProgram, program);
+    ORU_GL(DeleteShader, shader);
+
+    auto const read = [&](char const *name, std::size_t size) {
+        std::vector<float> values(size);
+        ORU_GL(GetUniformfv, program, ORU_GL(GetUniformLocation, program, name), values.data());
+        return values;
+    };
+    Enable(program);
+    std::vector<float> matrix(16);
+    for (std::size_t i = 0; i < 16; ++i)
+        matrix[i] = static_cast<float>(i);
+    SetUniformBool(program, "on", true);
+    SetUniformFloat4(program, "four", 1, 2, 3, 4);
+    SetUniformSampler2D(program, "image", 7);
+    SetUniformMatrix4(program, "matrix", matrix.data(), false);
+    EXPECT_EQ(std::vector<float>{1}, read("on", 1));
+    EXPECT_EQ((std::vector<float>{1, 2, 3, 4}), read("four", 4));
+    EXPECT_EQ(std::vector<float>{7}, read("image", 1));
+    EXPECT_EQ(matrix, read("matrix", 16));
+    SetUniformMatrix4(program, "matrix", matrix.data(), true);
+    EXPECT_EQ(4.f, read("matrix", 16)[1]);
+    SetUniformBool(program, "missing", true); // ignored
+    Disable(12345);
+    GLint current = -1;
+    ::glGetIntegerv(GL_CURRENT_PROGRAM, &current);
+    EXPECT_EQ(0, current);
+    ORU_GL(DeleteProgram, program);
+}
+
+TEST_F(ProgramTest, ObjectsOutliveTheirContext) {
+    {
+        ScopedContextWrapper const restore;
+        VertexShader shader;
+        Program program;
+        Load(program);
+        program.link(true);
+        ProgramEnabledScope const scope(&program);
+        ::wglMakeCurrent(nullptr, nullptr);
+        EXPECT_EQ("", GetGLString(GL_VENDOR));
+    }
+    EXPECT_NE("", GetGLString(GL_VENDOR));
+    // What went without a context is still there, and current: give it back, for the ledger.
+    ORU_GL(UseProgram, 0u);
+    for (GLuint name = 1; name < 8; ++name) {
+        if (ORU_GL(IsProgram, name))
+            ORU_GL(DeleteProgram, name);
+    }
+    for (GLuint name = 1; name < 8; ++name) {
+        if (ORU_GL(IsShader, name))
+            ORU_GL(DeleteShader, name);
+    }
+}
