@@ -14,8 +14,8 @@ Buffer::Buffer(Context const &context, MemoryAccessFlags access, std::size_t siz
 }
 
 Buffer::Buffer(Context const &context, MemoryAccessFlags access, bool allocHost, std::size_t size)
-    : Memory(ORU_CL(CreateBuffer)(context.id(), AllocationFlags(access, allocHost), size,
-                                  nullptr)) {}
+    : Memory(
+          ORU_CL(CreateBuffer)(context.id(), AllocationFlags(access, allocHost), size, nullptr)) {}
 
 Buffer::Buffer(Context const &context, MemoryAccessFlags access, bool allocHost, std::size_t size,
                void *host) {

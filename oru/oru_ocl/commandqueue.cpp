@@ -1,7 +1,7 @@
 // OpenCL command queues: work for one device.
 #include "oru/oru_ocl/commandqueue.h"
 
-#include "oru/core/math/integerrect.h"
+#include "oru/core/utility/integerrect.h"
 #include "oru/oru_ocl/internal/clcall.h"
 #include "oru/oru_ocl/internal/handlearray.h"
 
@@ -49,8 +49,7 @@ Event CommandQueue::enqueueRead(Image2D const &image, IntegerRect const &region,
 }
 
 Event CommandQueue::enqueueBlockingRead(Image2D const &image, IntegerRect const &region,
-                                        void *destination, int rowPitch,
-                                        WaitList const &waitList) {
+                                        void *destination, int rowPitch, WaitList const &waitList) {
     return enqueueReadImpl(image, true, region, 0, 1, destination, rowPitch, 0, waitList);
 }
 
@@ -59,8 +58,8 @@ Event CommandQueue::enqueueAcquireGLObjects(std::vector<Memory> const &objects,
     HandleArray<cl_mem> const memory(objects);
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueAcquireGLObjects)(id(), memory.count(), memory.data(), waits.count(),
-                                    waits.data(), &event);
+    ORU_CL(EnqueueAcquireGLObjects)
+    (id(), memory.count(), memory.data(), waits.count(), waits.data(), &event);
     return Event(event);
 }
 
@@ -69,8 +68,8 @@ Event CommandQueue::enqueueReleaseGLObjects(std::vector<Memory> const &objects,
     HandleArray<cl_mem> const memory(objects);
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueReleaseGLObjects)(id(), memory.count(), memory.data(), waits.count(),
-                                    waits.data(), &event);
+    ORU_CL(EnqueueReleaseGLObjects)
+    (id(), memory.count(), memory.data(), waits.count(), waits.data(), &event);
     return Event(event);
 }
 
@@ -97,18 +96,19 @@ Event CommandQueue::enqueueWriteImpl(Buffer &buffer, bool blocking, std::size_t 
                                      WaitList const &waitList) {
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueWriteBuffer)(id(), buffer.id(), cl_bool(blocking), offset, size, source,
-                               waits.count(), waits.data(), &event);
+    ORU_CL(EnqueueWriteBuffer)
+    (id(), buffer.id(), cl_bool(blocking), offset, size, source, waits.count(), waits.data(),
+     &event);
     return Event(event);
 }
 
 Event CommandQueue::enqueueReadImpl(Buffer const &buffer, bool blocking, std::size_t offset,
-                                    std::size_t size, void *destination,
-                                    WaitList const &waitList) {
+                                    std::size_t size, void *destination, WaitList const &waitList) {
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueReadBuffer)(id(), buffer.id(), cl_bool(blocking), offset, size, destination,
-                              waits.count(), waits.data(), &event);
+    ORU_CL(EnqueueReadBuffer)
+    (id(), buffer.id(), cl_bool(blocking), offset, size, destination, waits.count(), waits.data(),
+     &event);
     return Event(event);
 }
 
@@ -128,10 +128,9 @@ Event CommandQueue::enqueueReadImpl(Image const &image, bool blocking, IntegerRe
     std::size_t const extent[] = {region.width(), region.height(), depth};
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueReadImage)(id(), image.id(), cl_bool(blocking), origin, extent,
-                             static_cast<std::size_t>(rowPitch),
-                             static_cast<std::size_t>(slicePitch), destination, waits.count(),
-                             waits.data(), &event);
+    ORU_CL(EnqueueReadImage)
+    (id(), image.id(), cl_bool(blocking), origin, extent, static_cast<std::size_t>(rowPitch),
+     static_cast<std::size_t>(slicePitch), destination, waits.count(), waits.data(), &event);
     return Event(event);
 }
 
@@ -141,8 +140,9 @@ Event CommandQueue::enqueueKernel_(CommandQueue const &queue, Kernel const &kern
                                    WaitList const *waitList) {
     HandleArray<cl_event> const waits(*waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueNDRangeKernel)(queue.id(), kernel.id(), static_cast<cl_uint>(workDimension),
-                                 offset, global, local, waits.count(), waits.data(), &event);
+    ORU_CL(EnqueueNDRangeKernel)
+    (queue.id(), kernel.id(), static_cast<cl_uint>(workDimension), offset, global, local,
+     waits.count(), waits.data(), &event);
     return Event(event);
 }
 

@@ -40,8 +40,8 @@ public:
                        WaitList const &waitList = {});
     Event enqueueBlockingWrite(Buffer &buffer, std::size_t offset, std::size_t size,
                                void const *source, WaitList const &waitList = {});
-    Event enqueueRead(Buffer const &buffer, std::size_t offset, std::size_t size,
-                      void *destination, WaitList const &waitList = {});
+    Event enqueueRead(Buffer const &buffer, std::size_t offset, std::size_t size, void *destination,
+                      WaitList const &waitList = {});
     Event enqueueBlockingRead(Buffer const &buffer, std::size_t offset, std::size_t size,
                               void *destination, WaitList const &waitList = {});
     /// @}
@@ -65,8 +65,7 @@ public:
     template<unsigned int N>
     Event enqueueKernel(Kernel const &kernel, Range<N> const &global,
                         std::common_type_t<Range<N>> const &local,
-                        std::common_type_t<Range<N>> const &offset,
-                        WaitList const &waitList = {}) {
+                        std::common_type_t<Range<N>> const &offset, WaitList const &waitList = {}) {
         static_cast<void>(offset);
         return enqueueKernel_(*this, kernel, static_cast<int>(N), global.begin(),
                               local[0] == 0 ? nullptr : local.begin(), nullptr, &waitList);
@@ -104,8 +103,8 @@ private:
 
     Event enqueueWriteImpl(Buffer &buffer, bool blocking, std::size_t offset, std::size_t size,
                            void const *source, WaitList const &waitList);
-    Event enqueueReadImpl(Buffer const &buffer, bool blocking, std::size_t offset,
-                          std::size_t size, void *destination, WaitList const &waitList);
+    Event enqueueReadImpl(Buffer const &buffer, bool blocking, std::size_t offset, std::size_t size,
+                          void *destination, WaitList const &waitList);
     Event enqueueReadImpl(Image const &image, bool blocking, IntegerRect const &region, int z,
                           std::size_t depth, void *destination, int rowPitch, int slicePitch,
                           WaitList const &waitList);

@@ -9,7 +9,8 @@ namespace ORU::OCL {
 
 CommandQueue Event::commandQueue() const {
     cl_command_queue queue = nullptr;
-    ORU_CL(GetEventInfo)(id(), cl_event_info(CL_EVENT_COMMAND_QUEUE), sizeof queue, &queue, nullptr);
+    ORU_CL(GetEventInfo)
+    (id(), cl_event_info(CL_EVENT_COMMAND_QUEUE), sizeof queue, &queue, nullptr);
     return CommandQueue(queue, add_ref_tag());
 }
 
@@ -21,8 +22,8 @@ unsigned int Event::commandType() const {
 
 int Event::commandExecutionStatus() const {
     cl_int status = CL_QUEUED;
-    ORU_CL(GetEventInfo)(id(), cl_event_info(CL_EVENT_COMMAND_EXECUTION_STATUS), sizeof status,
-                         &status, nullptr);
+    ORU_CL(GetEventInfo)
+    (id(), cl_event_info(CL_EVENT_COMMAND_EXECUTION_STATUS), sizeof status, &status, nullptr);
     return status;
 }
 

@@ -3,6 +3,9 @@
 
 #include "oru/oru_ocl/internal/clcall.h"
 #include "oru/oru_ocl/internal/enumtable.h"
+#include "oru/oru_ogl/ogl/renderbuffer.h"
+#include "oru/oru_ogl/ogl/texture2.h"
+#include "oru/oru_ogl/ogl/texture3.h"
 
 namespace ORU::OCL {
 
@@ -16,6 +19,12 @@ constexpr unsigned int imageInfos[] = {
 void CheckHost(void const *host, char const *message) {
     if (!host)
         ORU_THROW_INTERNAL(message);
+}
+
+cl_mem FromTexture2D(Context const &context, cl_mem_flags flags, OGL::Object const &texture,
+                     unsigned int mipLevel) {
+    return ORU_CL(CreateFromGLTexture2D)(context.id(), flags, texture.target(),
+                                         static_cast<cl_GLint>(mipLevel), texture.objectID());
 }
 
 constexpr char const *noHost2D = "NULL host memory pointer passed to Image2D constructor.";
@@ -53,6 +62,18 @@ Image2D::Image2D(Context const &context, MemoryAccessFlags access, bool allocHos
     : Image(ORU_CL(CreateImage2D)(context.id(), AllocationFlags(access, allocHost), &format, width,
                                   height, rowPitch, nullptr)) {}
 
+Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::Texture2D &texture,
+                 unsigned int mipLevel)
+    : Image(FromTexture2D(context, AccessFlags(access), texture, mipLevel)) {}
+
+Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::TextureRECT &texture,
+                 unsigned int mipLevel)
+    : Image(FromTexture2D(context, AccessFlags(access), texture, mipLevel)) {}
+
+Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::Renderbuffer &renderbuffer)
+    : Image(ORU_CL(CreateFromGLRenderbuffer)(context.id(), AccessFlags(access),
+                                             renderbuffer.objectID())) {}
+
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, cl_image_format format,
                  std::size_t width, std::size_t height, std::size_t depth, std::size_t rowPitch,
                  std::size_t slicePitch, void *host) {
@@ -76,5 +97,10 @@ Image3D::Image3D(Context const &context, MemoryAccessFlags access, bool allocHos
                  std::size_t rowPitch, std::size_t slicePitch)
     : Image(ORU_CL(CreateImage3D)(context.id(), AllocationFlags(access, allocHost), &format, width,
                                   height, depth, rowPitch, slicePitch, nullptr)) {}
+
+Image3D::Image3D(Context const &context, MemoryAccessFlags access, OGL::Texture3D &texture,
+                 unsigned int mipLevel)
+    : Image(ORU_CL(CreateFromGLTexture3D)(context.id(), AccessFlags(access), texture.target(),
+                                          static_cast<cl_GLint>(mipLevel), texture.objectID())) {}
 
 } // namespace ORU::OCL

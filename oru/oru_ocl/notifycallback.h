@@ -8,8 +8,8 @@ namespace ORU::OCL {
 template<class Function>
 class NotifyCallback {
 public:
-    NotifyCallback(Function pf_notify = nullptr, void *user_data = nullptr)
-        : pf_notify_(pf_notify), user_data_(user_data) {}
+    NotifyCallback(Function notify = nullptr, void *userData = nullptr)
+        : pf_notify_(notify), user_data_(userData) {}
 
     Function pf_notify() const { return pf_notify_; }
     void *user_data() const { return user_data_; }

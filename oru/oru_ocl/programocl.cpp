@@ -56,25 +56,27 @@ void Program::buildAsync(std::vector<Device> const &devices, std::string const &
 void Program::build(std::vector<Device> const &devices, std::string const &options,
                     NotifyCallback const &callback) {
     HandleArray<cl_device_id> const ids(devices);
-    ORU_CL(BuildProgram)(id(), ids.count(), ids.data(), options.empty() ? nullptr : options.c_str(),
-                         callback.pf_notify(), callback.user_data());
+    ORU_CL(BuildProgram)
+    (id(), ids.count(), ids.data(), options.empty() ? nullptr : options.c_str(),
+     callback.pf_notify(), callback.user_data());
 }
 
 std::string Program::buildLog(Device const &device) {
     std::string const log =
         QueryText([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-            ORU_CL(GetProgramBuildInfo)(id(), device.id(), cl_program_build_info(CL_PROGRAM_BUILD_LOG),
-                                        bytes, value, bytesReturned);
+            ORU_CL(GetProgramBuildInfo)
+            (id(), device.id(), cl_program_build_info(CL_PROGRAM_BUILD_LOG), bytes, value,
+             bytesReturned);
         });
     return log.c_str();
 }
 
 Program::BuildStatus Program::buildStatus(Device const &device) {
-    std::vector<cl_build_status> const status = QueryList<cl_build_status>(
-        [&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-            ORU_CL(GetProgramBuildInfo)(id(), device.id(),
-                                        cl_program_build_info(CL_PROGRAM_BUILD_STATUS), bytes, value,
-                                        bytesReturned);
+    std::vector<cl_build_status> const status =
+        QueryList<cl_build_status>([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
+            ORU_CL(GetProgramBuildInfo)
+            (id(), device.id(), cl_program_build_info(CL_PROGRAM_BUILD_STATUS), bytes, value,
+             bytesReturned);
         });
     return status.empty() ? BUILD_STATUS_NONE : OCLBuildStatus(status.front());
 }

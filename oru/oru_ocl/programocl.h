@@ -67,7 +67,7 @@ private:
 
     Context context_;
     std::string source_;
-    std::string annotation_; ///< for hosts that derive; travels with the program
+    std::string annotation_; ///< empty; has its place in the binary interface
 };
 
 /// The binaries of a program, one per device.
