@@ -1,0 +1,70 @@
+// Memory hooks that count what passes through them.
+#pragma once
+
+#include "oru/core/memory/orumemory.h"
+
+#include <cstdlib>
+#include <map>
+#include <string>
+
+namespace oru_test {
+
+/// Installs hooks for its lifetime and keeps what they saw. Unlike a host it takes them out again,
+/// so everything allocated meanwhile must be freed meanwhile.
+class CountingHooks {
+public:
+    struct Allocation {
+        std::size_t size;
+        ORU::MemoryType type;
+        std::string file;
+        int line;
+    };
+
+    CountingHooks() {
+        Current() = this;
+        ORU::SetAllocationDeallocationFunction(Allocate, Free);
+    }
+    ~CountingHooks() {
+        ORU_private::gAllocationFunction = nullptr;
+        ORU_private::gDeallocationFunction = nullptr;
+        Current() = nullptr;
+    }
+    CountingHooks(CountingHooks const &) = delete;
+    CountingHooks &operator=(CountingHooks const &) = delete;
+
+    int allocations() const { return allocations_; }
+    /// What is not freed yet, by address.
+    std::map<void *, Allocation> const &outstanding() const { return outstanding_; }
+    /// Releases of what was not allocated here, or under another type.
+    int wrongReleases() const { return wrongReleases_; }
+
+private:
+    static CountingHooks *&Current() {
+        static CountingHooks *current = nullptr;
+        return current;
+    }
+
+    static void *Allocate(std::size_t size, ORU::MemoryType type, char const *file, int line) {
+        void *const p = std::malloc(size);
+        ++Current()->allocations_;
+        Current()->outstanding_[p] = Allocation{size, type, file, line};
+        return p;
+    }
+
+    static void Free(void *p, ORU::MemoryType type, char const *, int) {
+        auto &outstanding = Current()->outstanding_;
+        auto const found = outstanding.find(p);
+        if (found == outstanding.end() || found->second.type != type) {
+            ++Current()->wrongReleases_;
+            return;
+        }
+        outstanding.erase(found);
+        std::free(p);
+    }
+
+    int allocations_ = 0;
+    int wrongReleases_ = 0;
+    std::map<void *, Allocation> outstanding_;
+};
+
+} // namespace oru_test
