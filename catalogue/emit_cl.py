@@ -29,6 +29,8 @@ def emit(folder, writer):
     write("extensions.inc", extension_rows(extensions), EXTENSIONS)
     write("devicepropertyenum.h", property_enum(properties), PROPERTIES)
     write("deviceproperty_rows.inc", property_rows(properties), PROPERTIES)
+    writer.write("tests/oru_ocl/runtime/entrypoints.inc", entry_points(entries),
+                 f"catalogue/{ENTRY_POINTS} by emit_cl.py")
 
 
 def extension_enumerator(name):
@@ -78,6 +80,25 @@ def slots(entries):
     return f"""// One line per slot, in slot order; define ORU_CL_SLOT(Extension, Name) before.
 {lines}
 #undef ORU_CL_SLOT
+"""
+
+
+def parameter_name(parameter):
+    return re.search(r"\(CL_CALLBACK \*(\w+)\)|(\w+)$", parameter).group(1, 2)
+
+
+def entry_points(entries):
+    lines = []
+    for name, group, result, parameters in entries:
+        names = [callback or plain for callback, plain in
+                 (parameter_name(parameter) for parameter in parameters.split("; ") if parameter)]
+        lines.append(f"ORU_CL_ENTRY({extension_enumerator(group)}, {result}, {name},\n"
+                     f"    ({parameters.replace('; ', ', ')}),\n    ({', '.join(names)}))")
+    body = "\n".join(lines)
+    return f"""// What the tests' runtime exports; define ORU_CL_ENTRY(Extension, Result, Name, Parameters,
+// Arguments) before.
+{body}
+#undef ORU_CL_ENTRY
 """
 
 
