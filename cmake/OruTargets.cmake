@@ -52,12 +52,17 @@ function(oru_add_test name)
     endif()
 endfunction()
 
-# oru_add_benchmark(<name> SOURCES <file>... [LIBRARIES <target>...])
-# A Google Benchmark program; tools/bench runs every one.
+# oru_add_benchmark(<name> SOURCES <file>... [LIBRARIES <target>...] [INTERNAL])
+# A Google Benchmark program; tools/bench runs every one. INTERNAL as for a test.
 function(oru_add_benchmark name)
-    cmake_parse_arguments(arg "" "" "SOURCES;LIBRARIES" ${ARGN})
+    cmake_parse_arguments(arg "INTERNAL" "" "SOURCES;LIBRARIES" ${ARGN})
     add_executable(${name} ${arg_SOURCES})
-    target_link_libraries(${name} PRIVATE oru ${arg_LIBRARIES} benchmark::benchmark_main)
+    if(arg_INTERNAL)
+        target_link_libraries(${name} PRIVATE oru_static)
+    else()
+        target_link_libraries(${name} PRIVATE oru)
+    endif()
+    target_link_libraries(${name} PRIVATE ${arg_LIBRARIES} benchmark::benchmark_main)
     set_target_properties(${name} PROPERTIES
         RUNTIME_OUTPUT_DIRECTORY "${CMAKE_RUNTIME_OUTPUT_DIRECTORY}")
     set_property(GLOBAL APPEND PROPERTY ORU_BENCHMARKS ${name})
