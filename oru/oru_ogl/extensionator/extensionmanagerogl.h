@@ -221,6 +221,15 @@ public:
         return nonPowerOfTwo_;
     }
 
+    /// Whether 32-bit floating-point textures can be filtered linearly, which no version and no
+    /// extension tells. The first call draws a test in a context that shares with the current one
+    /// and may take a while; the answer then holds for the record's life. A test that fails in any
+    /// way answers false.
+    bool supportsFloatFiltering();
+
+    /// The same for 16-bit floats; false, without a test, where GL_EXT_gpu_shader4 is missing.
+    bool supportsHalfFiltering();
+
     /// Number of texture image units of the current context, 1 without multitexturing.
     /// @note glGetIntegerv through the chain
     unsigned int numberOfTextureUnits() const;
@@ -231,6 +240,12 @@ private:
 
     using CreateContextAttribs = HGLRC(ORU_APIENTRY *)(HDC, HGLRC, int const *);
     using GroupLoader = bool (ExtensionManager::*)();
+
+    /// An answer that is found out when first asked for.
+    struct CachedAnswer {
+        bool isKnown = false;
+        bool value = false;
+    };
 
     explicit ExtensionManager(HGLRC rc);
     explicit ExtensionManager(Context *context);
@@ -248,6 +263,8 @@ private:
     void readExtensions();
     void readWGLExtensions();
     void tryInitializing(OpenGLExtension e, bool required);
+    bool testFloatFiltering();
+    bool testHalfFiltering();
     bool loadGroup(std::size_t first, std::size_t count);
     std::string getExtensionsString() const;
     static void TokenizeExtensionString(std::string const &text, std::vector<std::string> &out);
@@ -267,6 +284,8 @@ private:
     std::string additionalVersionInfo_;
     Vendor vendor_ = VENDOR_OTHER;
     bool nonPowerOfTwo_ = false;
+    CachedAnswer halfFiltering_;
+    CachedAnswer floatFiltering_;
     std::shared_ptr<FunctionTable> tableExt_;
     DisplayDeviceKey displayDeviceKey_;
     std::vector<std::string> supportedNames_;
