@@ -106,6 +106,7 @@ void VertexBuffer::prepareHostSideResources() {
 }
 
 void VertexBuffer::prepareDeviceSideResources() {
+    ORU_ASSERT_SUPPORTED(GL_VERSION_2_0);
     ORU_ASSERT_SUPPORTED(GL_ARB_VERTEX_ARRAY_OBJECT);
     deleteDeviceSideResources();
     ORU_GL(GenVertexArrays, 1, &vertexBuffer_);

@@ -125,8 +125,8 @@ public:
 
     /// Makes the OpenGL objects anew and looks up where the program takes each field.
     /// @param programID GL name of a linked program
-    /// @throws InternalException without GL_ARB_vertex_array_object, and for a field that the
-    ///         program does not use
+    /// @throws InternalException without OpenGL 2.0 and GL_ARB_vertex_array_object, and for a field
+    ///         that the program does not use
     /// @note glGenVertexArrays, glGenBuffers, glGetAttribLocation
     void setupWithProgram(unsigned int programID);
 
