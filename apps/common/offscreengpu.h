@@ -1,0 +1,48 @@
+// The OpenGL that a program works with, without a window.
+#pragma once
+
+#include "apps/common/image.h"
+
+#include "oru/oru_ogl/libraryogl.h"
+#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+
+#include <fstream>
+#include <memory>
+#include <string>
+
+namespace ORU {
+namespace OGL {
+class OpenGLTracer;
+} // namespace OGL
+} // namespace ORU
+
+namespace App {
+
+/// An open OpenGL layer with an offscreen context on the primary display, current on the thread
+/// that made it.
+class OffscreenGpu {
+public:
+    /// @param traceFile where every OpenGL call is written, or empty
+    /// @throws Failure when the file cannot be written or the context lacks OpenGL 3.0
+    /// @throws ORU::LogicalException when there is no context to be had
+    explicit OffscreenGpu(std::string const &traceFile);
+    ~OffscreenGpu();
+    OffscreenGpu(OffscreenGpu const &) = delete;
+    OffscreenGpu &operator=(OffscreenGpu const &) = delete;
+
+    ORU::OGL::ContextOffscreen const &context() const { return *context_; }
+
+    /// What textures and viewports take.
+    SizeLimit sizeLimit() const;
+
+    /// Adapter, OpenGL version, renderer and number of capabilities, for people.
+    std::string description() const;
+
+private:
+    ORU::OGL::AutoInitializer library_;
+    std::ofstream traceStream_;
+    std::unique_ptr<ORU::OGL::OpenGLTracer> tracer_;
+    std::unique_ptr<ORU::OGL::ContextOffscreen> context_;
+};
+
+} // namespace App
