@@ -1,0 +1,226 @@
+// Makes the pictures of the guide's chapter on regions, and checks that what they show is true.
+//
+// region_pictures PHOTO FOLDER [--check]: writes them to FOLDER, or compares them with what is
+// there.
+#include "canvas.h"
+
+#include "oru/core/math/region_2d/boundingregion.h"
+
+#include <algorithm>
+#include <functional>
+#include <iostream>
+#include <stdexcept>
+
+using guide::Canvas;
+using guide::Colour;
+using guide::Mixed;
+using guide::Point;
+using ORU::BoundingRect;
+
+namespace {
+
+Colour const white{255, 255, 255};
+Colour const blue{40, 110, 230};
+Colour const orange{240, 140, 20};
+Colour const green{20, 160, 70};
+Colour const magenta{220, 40, 160};
+
+int const blurRadius = 24;
+
+/// The sums of the (2 * blurRadius + 1)^2 pixels around each pixel, border pixels repeated outside.
+class BlurSums {
+public:
+    explicit BlurSums(Canvas const &source) : width_(source.width()) {
+        int const height = source.height();
+        std::vector<Sum> const rows = along(width_, height, [&](int x, int y) {
+            Colour const &pixel = source.at(x, y);
+            return Sum{pixel[0], pixel[1], pixel[2]};
+        });
+        std::vector<Sum> const columns = along(height, width_, [&](int y, int x) {
+            return rows[static_cast<std::size_t>(y * width_ + x)];
+        });
+        sums_.resize(columns.size());
+        for (int y = 0; y < height; ++y)
+            for (int x = 0; x < width_; ++x)
+                sums_[static_cast<std::size_t>(y * width_ + x)] =
+                    columns[static_cast<std::size_t>(x * height + y)];
+    }
+
+    using Sum = std::array<int, 3>;
+
+    Sum const &at(int x, int y) const { return sums_[static_cast<std::size_t>(y * width_ + x)]; }
+
+    Colour colour(int x, int y) const {
+        int const count = (2 * blurRadius + 1) * (2 * blurRadius + 1);
+        Colour result;
+        for (std::size_t i = 0; i < 3; ++i)
+            result[i] = static_cast<std::uint8_t>((at(x, y)[i] + count / 2) / count);
+        return result;
+    }
+
+private:
+    /// Blurs along the first coordinate of `value(position, line)`; the result is stored line by
+    /// line.
+    template<class Value>
+    static std::vector<Sum> along(int length, int lines, Value value) {
+        std::vector<Sum> result;
+        for (int line = 0; line < lines; ++line) {
+            Sum sum{};
+            auto const add = [&](int position, int sign) {
+                Sum const v = value(std::clamp(position, 0, length - 1), line);
+                for (std::size_t i = 0; i < 3; ++i)
+                    sum[i] += sign * v[i];
+            };
+            for (int position = -blurRadius; position < blurRadius; ++position)
+                add(position, 1);
+            for (int position = 0; position < length; ++position) {
+                add(position + blurRadius, 1);
+                result.push_back(sum);
+                add(position - blurRadius, -1);
+            }
+        }
+        return result;
+    }
+
+    int width_;
+    std::vector<Sum> sums_;
+};
+
+/// A photo with a disc made brighter, blurred: what the edit changes, and what must be read.
+Canvas FilterPicture(Canvas const &photo) {
+    Canvas const before = photo.part(100, 0, 300, 300);
+    Point const centre(226, 104);
+    float const radius = 52;
+    BoundingRect changed(centre, centre);
+    changed.outset(Point(radius, radius));
+
+    Canvas edited = before;
+    for (int y = 0; y < edited.height(); ++y)
+        for (int x = 0; x < edited.width(); ++x) {
+            float const dx = static_cast<float>(x) + 0.5f - centre.x;
+            float const dy = static_cast<float>(y) + 0.5f - centre.y;
+            if (dx * dx + dy * dy < radius * radius)
+                edited.at(x, y) = Mixed(edited.at(x, y), white, 0.4f);
+        }
+
+    BoundingRect const frame(Point(0, 0), Point(300, 300));
+    Point const reach(blurRadius, blurRadius);
+    BoundingRect compute = changed;
+    compute.outset(reach);
+    compute.intersect(frame);
+    BoundingRect read = compute;
+    read.outset(reach);
+    read.intersect(frame);
+
+    BlurSums const sumsBefore(before);
+    BlurSums const sumsAfter(edited);
+    Canvas blurred = before;
+    BoundingRect exact;
+    for (int y = 0; y < blurred.height(); ++y)
+        for (int x = 0; x < blurred.width(); ++x) {
+            blurred.at(x, y) = sumsAfter.colour(x, y);
+            if (sumsBefore.at(x, y) == sumsAfter.at(x, y))
+                continue;
+            blurred.at(x, y) = Mixed(blurred.at(x, y), magenta, 0.35f);
+            auto const left = static_cast<float>(x);
+            auto const top = static_cast<float>(y);
+            exact.include(BoundingRect(Point(left, top), Point(left + 1, top + 1)));
+        }
+    if (exact != compute)
+        throw std::runtime_error("the blur changed " + exact.toString() + "instead of " +
+                                 compute.toString());
+
+    Canvas reading = edited;
+    for (int y = 0; y < reading.height(); ++y)
+        for (int x = 0; x < reading.width(); ++x)
+            if (!read.contains(Point(static_cast<float>(x) + 0.5f, static_cast<float>(y) + 0.5f)))
+                reading.at(x, y) = Mixed(reading.at(x, y), white, 0.7f);
+
+    Canvas panels[] = {edited, blurred, reading};
+    panels[0].outline(changed, blue, 2);
+    panels[1].outline(changed, blue, 2);
+    panels[1].outline(compute, orange, 2);
+    panels[2].outline(compute, orange, 2);
+    panels[2].outline(read, green, 2);
+    Canvas picture(3 * 300 + 2 * 12, 300, white);
+    for (int i = 0; i < 3; ++i)
+        picture.paste(panels[i], i * 312, 0);
+    return picture;
+}
+
+/// An operation on a blue and an orange rectangle, with its green result.
+struct Operation {
+    BoundingRect a;
+    BoundingRect b;
+    BoundingRect drawnB; ///< where `b` is drawn, for a footprint
+    std::function<void(BoundingRect &a, BoundingRect const &b)> apply;
+};
+
+BoundingRect Rect(float minX, float minY, float maxX, float maxY) {
+    return BoundingRect(Point(minX, minY), Point(maxX, maxY));
+}
+
+Canvas OperationsPicture() {
+    BoundingRect const footprint = Rect(-16, -10, 30, 22);
+    auto const drawn = [&](float x, float y) {
+        BoundingRect moved = footprint;
+        moved.translate(Point(x, y));
+        return moved;
+    };
+    BoundingRect const small = Rect(70, 45, 180, 115);
+    BoundingRect const large = Rect(30, 25, 220, 135);
+    BoundingRect const wide = Rect(20, 20, 150, 90);
+    BoundingRect const other = Rect(100, 60, 230, 140);
+    Operation const operations[] = {
+        {wide, other, other, [](auto &a, auto const &b) { a.include(b); }},
+        {wide, other, other, [](auto &a, auto const &b) { a.intersect(b); }},
+        {large, Rect(150, 15, 235, 145), Rect(150, 15, 235, 145),
+         [](auto &a, auto const &b) { a.subtract(b); }},
+        {large, other, other, [](auto &a, auto const &b) { a.subtract(b); }},
+        {small, footprint, drawn(180, 115), [](auto &a, auto const &b) { a.dilate(b); }},
+        {large, footprint, drawn(190, 113), [](auto &a, auto const &b) { a.erode(b); }},
+    };
+    int const panelWidth = 250;
+    int const panelHeight = 160;
+    Canvas picture(3 * panelWidth + 2 * 12, 2 * panelHeight + 12, white);
+    int i = 0;
+    for (Operation const &operation : operations) {
+        Canvas panel(panelWidth, panelHeight, Colour{244, 244, 246});
+        BoundingRect result = operation.a;
+        operation.apply(result, operation.b);
+        panel.fill(operation.a, blue, 0.3f);
+        panel.fill(operation.drawnB, orange, 0.3f);
+        panel.outline(operation.a, blue, 2);
+        panel.outline(operation.drawnB, orange, 2);
+        panel.outline(result, green, 4);
+        picture.paste(panel, i % 3 * (panelWidth + 12), i / 3 * (panelHeight + 12));
+        ++i;
+    }
+    return picture;
+}
+
+void WriteOrCheck(Canvas const &picture, std::string const &path, bool checks) {
+    if (!checks)
+        picture.write(path);
+    else if (!(Canvas::Read(path) == picture))
+        throw std::runtime_error(path + " is not what the library draws; make it anew");
+}
+
+} // namespace
+
+int main(int argc, char **argv) {
+    if (argc < 3) {
+        std::cerr << "usage: region_pictures PHOTO FOLDER [--check]\n";
+        return 2;
+    }
+    try {
+        std::string const folder = argv[2];
+        bool const checks = argc > 3;
+        WriteOrCheck(FilterPicture(Canvas::Read(argv[1])), folder + "/regions-filter.png", checks);
+        WriteOrCheck(OperationsPicture(), folder + "/regions-operations.png", checks);
+    } catch (std::exception const &failure) {
+        std::cerr << failure.what() << "\n";
+        return 1;
+    }
+    return 0;
+}
