@@ -42,8 +42,9 @@ def main(results_path, expected_path):
         print(f"ambiguous: {names[name]} tests are named {name}")
     for name in failed:
         print(f"failed: {name}")
-    print(f"Tests: {len(passed)} passed, {len(failed)} failed, {len(skipped)} skipped"
-          f" ({len(unexpected)} of these unexpectedly)")
+    if unexpected:
+        print(f"{len(unexpected)} skipped unexpectedly")
+    print(f"Tests: {len(passed)} passed, {len(failed)} failed, {len(skipped)} skipped")
     if not passed and not failed:
         raise SystemExit("No test ran.")
     return 1 if failed or unexpected or ambiguous else 0
