@@ -26,7 +26,7 @@ void Measure(benchmark::State &state, Operation operation) {
     benchmark::DoNotOptimize(region);
     benchmark::DoNotOptimize(other);
     long const before = oru_test::AllocationCount();
-    for (auto _ : state) {
+    for ([[maybe_unused]] auto const _ : state) {
         operation(*region, *other);
         benchmark::ClobberMemory();
     }
@@ -42,7 +42,7 @@ void PlainUnion(benchmark::State &state) {
     };
     Bounds a{0, 0, 640, 480};
     Bounds b{-1, -1, 641, 1};
-    for (auto _ : state) {
+    for ([[maybe_unused]] auto const _ : state) {
         benchmark::DoNotOptimize(b);
         a = Bounds{std::min(a.minX, b.minX), std::min(a.minY, b.minY), std::max(a.maxX, b.maxX),
                    std::max(a.maxY, b.maxY)};

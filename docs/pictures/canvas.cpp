@@ -3,7 +3,7 @@
 
 #include <png.h>
 
-#include <algorithm>
+#include <cmath>
 #include <cstring>
 #include <stdexcept>
 
@@ -82,7 +82,7 @@ Colour Mixed(Colour const &pixel, Colour const &colour, float share) {
     for (std::size_t i = 0; i < 3; ++i) {
         float const value =
             static_cast<float>(pixel[i]) * (1 - share) + static_cast<float>(colour[i]) * share;
-        mixed[i] = static_cast<std::uint8_t>(value + 0.5f);
+        mixed[i] = static_cast<std::uint8_t>(std::lround(value));
     }
     return mixed;
 }

@@ -13,6 +13,12 @@ namespace guide {
 using Colour = std::array<std::uint8_t, 3>;
 using Point = ambra::lumo::TVec2<float>;
 
+/// Where pixel (x, y) lies in a row-by-row array.
+inline std::size_t Index(int x, int y, int width) {
+    return static_cast<std::size_t>(y) * static_cast<std::size_t>(width) +
+           static_cast<std::size_t>(x);
+}
+
 /// An 8-bit RGB picture.
 class Canvas {
 public:
@@ -26,8 +32,8 @@ public:
 
     int width() const { return width_; }
     int height() const { return height_; }
-    Colour &at(int x, int y) { return pixels_[index(x, y)]; }
-    Colour const &at(int x, int y) const { return pixels_[index(x, y)]; }
+    Colour &at(int x, int y) { return pixels_[Index(x, y, width_)]; }
+    Colour const &at(int x, int y) const { return pixels_[Index(x, y, width_)]; }
 
     /// The part of `width` x `height` pixels whose top left is (x, y).
     Canvas part(int x, int y, int width, int height) const;
@@ -45,11 +51,6 @@ public:
     }
 
 private:
-    std::size_t index(int x, int y) const {
-        return static_cast<std::size_t>(y) * static_cast<std::size_t>(width_) +
-               static_cast<std::size_t>(x);
-    }
-
     int width_;
     int height_;
     std::vector<Colour> pixels_;

@@ -36,19 +36,17 @@ public:
             Colour const &pixel = source.at(x, y);
             return Sum{pixel[0], pixel[1], pixel[2]};
         });
-        std::vector<Sum> const columns = along(height, width_, [&](int y, int x) {
-            return rows[static_cast<std::size_t>(y * width_ + x)];
-        });
+        std::vector<Sum> const columns =
+            along(height, width_, [&](int y, int x) { return rows[guide::Index(x, y, width_)]; });
         sums_.resize(columns.size());
         for (int y = 0; y < height; ++y)
             for (int x = 0; x < width_; ++x)
-                sums_[static_cast<std::size_t>(y * width_ + x)] =
-                    columns[static_cast<std::size_t>(x * height + y)];
+                sums_[guide::Index(x, y, width_)] = columns[guide::Index(y, x, height)];
     }
 
     using Sum = std::array<int, 3>;
 
-    Sum const &at(int x, int y) const { return sums_[static_cast<std::size_t>(y * width_ + x)]; }
+    Sum const &at(int x, int y) const { return sums_[guide::Index(x, y, width_)]; }
 
     Colour colour(int x, int y) const {
         int const count = (2 * blurRadius + 1) * (2 * blurRadius + 1);
