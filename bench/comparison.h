@@ -73,7 +73,7 @@ void Compare(benchmark::State &state, int calls, Base base, Library library) {
         });
     };
     Comparison comparison(state, calls);
-    for (auto _ : state) {
+    while (state.KeepRunning()) {
         double const baseSeconds = repeat(base);
         comparison.add(baseSeconds, repeat(library));
     }

@@ -72,7 +72,7 @@ void ForwardingDecorator(benchmark::State &state) {
     };
     benchmark::DoNotOptimize(calls);
     Comparison comparison(state, kCalls);
-    for (auto _ : state) {
+    while (state.KeepRunning()) {
         OpenGLInterceptor::Instance()->addInterceptor(&forwarder);
         double const with = Seconds(calls);
         OpenGLInterceptor::Instance()->popInterceptor();
@@ -129,7 +129,7 @@ void RecordOfDevice(benchmark::State &state) {
     std::vector<PROC> addresses;
     std::vector<double> placing;
     Comparison comparison(state);
-    for (auto _ : state) {
+    while (state.KeepRunning()) {
         ExtensionManager::Terminate(); // forgets the record; no context is alive
         double const place = Seconds([&] { Displays::DisplayOrigin(key.adapterName, true); });
         double const bare = Seconds([&] { ReadEntryPoints(addresses); });

@@ -69,7 +69,7 @@ void Trace(benchmark::State &state, Call call, std::ostream &stream) {
     };
     {
         Comparison comparison(state, kCalls);
-        for (auto _ : state) {
+        while (state.KeepRunning()) {
             double const without = repeat(end);
             double const with = repeat(tracer);
             comparison.add(without, with);
@@ -133,7 +133,7 @@ void PoppedTracer(benchmark::State &state) {
     std::ostream stream(&nowhere);
     OpenGLTracer tracer(stream);
     Comparison comparison(state, kCalls);
-    for (auto _ : state) {
+    while (state.KeepRunning()) {
         double const before = Seconds(calls);
         OpenGLInterceptor::Instance()->addInterceptor(&tracer);
         OpenGLInterceptor::Instance()->popInterceptor();

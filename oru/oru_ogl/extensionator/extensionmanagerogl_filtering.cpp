@@ -58,7 +58,7 @@ void DrawEnlarged(Texture2D &tested) {
 
 /// Whether the bottom row has anything between black and white: a linear filter smears the edge.
 bool HasGrey(Texture2D const &shown) {
-    std::array<unsigned char, kShownSize * kShownSize * kChannels> pixels{};
+    std::array<unsigned char, kChannels * kShownSize * kShownSize> pixels{};
     ORU_GL(BindTexture, GL_TEXTURE_2D, shown.objectID());
     shown.getPixelData(pixels.data(), 0, Texture::FORMAT_RGB, Texture::TYPE_UNSIGNED_BYTE, 1);
     for (std::size_t x = 0; x < kShownSize; ++x) {

@@ -39,6 +39,7 @@ namespace {
 template<class... Values>
 std::string Bytes(Values const &...values) {
     std::string bytes;
+    // NOLINTNEXTLINE(bugprone-sizeof-expression): of a pointer the pointer itself is meant
     (bytes.append(reinterpret_cast<char const *>(&values), sizeof values), ...);
     return bytes;
 }
@@ -349,24 +350,26 @@ TEST(Tracer, WritesNumbersAsTheStreamDoes) {
         std::memcpy(&number, &bits, sizeof number);
         numbers.push_back(static_cast<double>(number));
     }
-    for (double number = 1000000; number < 17000000; number += 1234.5)
-        numbers.push_back(number + 0.5);
-    for (double number = 0.5; number < 1e5; number = number * 1.25 + 0.125)
+    for (int i = 0; i < 13000; ++i)
+        numbers.push_back(1000000.5 + 1234.5 * i);
+    double number = 0.5;
+    for (int i = 0; i < 60; ++i, number = number * 1.25 + 0.125)
         numbers.insert(numbers.end(), {number, number + 1. / 16, number + 3. / 64, number * 1.1});
-    for (float number = 1e-9f; number < 1e21f; number *= 10)
+    for (int power = -9; power < 21; ++power)
         for (float const side : {0.f, 1.f, 1e30f}) {
-            auto const neighbour = static_cast<double>(std::nextafter(number, side));
+            float const ten = std::pow(10.f, static_cast<float>(power));
+            auto const neighbour = static_cast<double>(std::nextafter(ten, side));
             numbers.insert(numbers.end(), {neighbour, -neighbour, neighbour * (1 + 1e-12)});
         }
 
     Recorder recorder;
     std::ostringstream text, expected;
     OpenGLTracer tracer(text, &recorder);
-    for (double const number : numbers) {
+    for (double const value : numbers) {
         text.str("");
-        tracer.cgmClearDepth("", 1, number);
+        tracer.cgmClearDepth("", 1, value);
         expected.str("");
-        expected << ":1: glClearDepth(" << number << ")\n";
+        expected << ":1: glClearDepth(" << value << ")\n";
         ASSERT_EQ(expected.str(), text.str());
     }
 }
@@ -381,9 +384,10 @@ TEST(Tracer, WritesTextsOfAnyLength) {
         tracer.cgmGetUniformLocation(file.c_str(), 5, 6, name.c_str());
         tracer.cgmUniform4f(file.c_str(), 8, 9, 0.1f, 0.1f, 0.1f, 0.1f);
         std::string const tenth = ", makeFloat(1036831949) /* 0.1 */";
-        EXPECT_EQ(file + ":5: glGetUniformLocation(6, " + name + ")\n" + file +
-                      ":8: glUniform4f(9" + tenth + tenth + tenth + tenth + ")\n",
-                  text.str());
+        std::ostringstream expected;
+        expected << file << ":5: glGetUniformLocation(6, " << name << ")\n"
+                 << file << ":8: glUniform4f(9" << tenth << tenth << tenth << tenth << ")\n";
+        EXPECT_EQ(expected.str(), text.str());
     }
 }
 
