@@ -2,6 +2,7 @@
 # fills; on a Windows machine its package manager provides them.
 include_guard(GLOBAL)
 
+find_package(Threads REQUIRED) # which the package of TBB does not look for itself
 find_package(TBB CONFIG REQUIRED COMPONENTS tbb)
 find_package(Python3 REQUIRED COMPONENTS Interpreter)
 
