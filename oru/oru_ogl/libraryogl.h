@@ -2,6 +2,7 @@
 #pragma once
 
 #include "oru/core/utility/export.h"
+#include "oru/oru_ogl/exceptionogl.h" // what a host catches
 
 #include <iosfwd>
 
