@@ -121,7 +121,7 @@ Event CommandQueue::enqueueReadImpl(Image const &image, bool blocking, IntegerRe
         (flags & (CL_MEM_READ_WRITE | CL_MEM_WRITE_ONLY | CL_MEM_READ_ONLY)) != 0;
     ORU_ASSERT(isCompatible);
 
-    // A negative coordinate or pitch becomes a huge one, which the runtime refuses.
+    // A negative coordinate or pitch becomes a huge one, for the runtime to judge.
     std::size_t const origin[] = {static_cast<std::size_t>(region.offset().x),
                                   static_cast<std::size_t>(region.offset().y),
                                   static_cast<std::size_t>(z)};
