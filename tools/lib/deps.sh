@@ -6,7 +6,8 @@ ORU_PACKAGES=(
     g++-mingw-w64-x86-64-posix libz-mingw-w64-dev nasm
     clang clang-format clang-tidy
     libboost-dev libcli11-dev opencl-headers opencl-clhpp-headers googletest
-    wine wine64 xvfb libgl1 libgl1-mesa-dri ocl-icd-libopencl1 pocl-opencl-icd)
+    wine wine64 xvfb libgl1 libgl1-mesa-dri ocl-icd-libopencl1 pocl-opencl-icd
+    apitrace)
 
 as_root() {
     if [ "$(id -u)" -eq 0 ]; then
