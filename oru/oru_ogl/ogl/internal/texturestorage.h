@@ -13,10 +13,10 @@ namespace ORU {
 namespace OGL {
 namespace internal {
 
-/// A size as OpenGL takes it; one too large for that becomes one that OpenGL refuses.
+/// A size as OpenGL takes it; one that does not fit becomes negative, which OpenGL refuses.
 inline GLsizei ToGLsizei(std::uint64_t size) {
-    auto const largest = std::numeric_limits<GLsizei>::max();
-    return static_cast<GLsizei>(std::min<std::uint64_t>(size, largest));
+    constexpr std::uint64_t largest = std::numeric_limits<GLsizei>::max();
+    return size <= largest ? static_cast<GLsizei>(size) : -1;
 }
 
 /// Whether a size is a power of two or 0.
