@@ -105,7 +105,7 @@ std::ostream &operator<<(std::ostream &os, half h) {
 }
 
 std::istream &operator>>(std::istream &is, half &h) {
-    float f;
+    float f = 0; // a stream that has already failed or ended does not set it
     is >> f;
     h = half(f);
     return is;

@@ -10,7 +10,7 @@ namespace ORU {
 
 /// Two unsigned 64-bit sizes, (width, height) throughout the library.
 struct size2 {
-    static std::size_t const dimension = 2;
+    static constexpr std::size_t dimension = 2;
 
     constexpr size2(std::size_t v = 0) : values_{v, v} {}
     constexpr size2(std::size_t a, std::size_t b) : values_{a, b} {}

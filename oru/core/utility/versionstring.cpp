@@ -1,6 +1,7 @@
 // Reading of OpenGL version texts.
 #include "oru/core/utility/versionstring.h"
 
+#include <locale>
 #include <sstream>
 
 namespace ORU {
@@ -9,7 +10,9 @@ namespace {
 
 template<class Number>
 void Read(std::string const &text, Number &number) {
+    number = 0; // a stream that is at its end before it reads leaves the number alone
     std::istringstream stream(text);
+    stream.imbue(std::locale::classic()); // a host's locale may group digits
     stream >> number;
 }
 
