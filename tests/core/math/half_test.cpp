@@ -1,0 +1,260 @@
+// Half floats against the arithmetic of their format, and the conversion of rows against the class.
+#include "oru/core/math/halfrow.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cfenv>
+#include <cmath>
+#include <cstdlib>
+#include <random>
+#include <sstream>
+#include <vector>
+
+using ORU::half;
+
+namespace {
+
+half Half(unsigned bits) {
+    half h;
+    h.setBits(static_cast<unsigned short>(bits));
+    return h;
+}
+
+std::uint32_t Bits(float f) {
+    std::uint32_t bits;
+    std::memcpy(&bits, &f, sizeof bits);
+    return bits;
+}
+
+// Bits travel in vectors of floats only by memcpy: a signalling NaN passed by value may turn quiet.
+void SetBits(float &f, std::uint32_t bits) {
+    std::memcpy(&f, &bits, sizeof bits);
+}
+
+/// The value of a finite half by the definition of the format: fraction times a power of two.
+double ValueOf(unsigned bits) {
+    int const exponent = static_cast<int>((bits >> 10) & 31);
+    int const fraction = static_cast<int>(bits & 0x3FF);
+    double const size =
+        exponent == 0 ? std::ldexp(fraction, -24) : std::ldexp(1024 + fraction, exponent - 25);
+    return bits & 0x8000 ? -size : size;
+}
+
+/// Rounds |v| to a multiple of `step`, ties away from zero; exact, as every value is a float.
+double Rounded(double size, double step) {
+    return std::floor(size / step + 0.5) * step;
+}
+
+/// The half that a float becomes, found by value and not by bits.
+unsigned Expected(std::uint32_t bits) {
+    float f;
+    SetBits(f, bits);
+    unsigned const sign = (bits >> 16) & 0x8000;
+    if (std::isnan(f)) { // the upper fraction bits stay; a NaN that has none gets the lowest
+        unsigned const fraction = (bits & 0x7FFFFF) >> 13;
+        return sign | 0x7C00 | std::max(fraction, 1u);
+    }
+    double const size = std::fmin(std::fabs(static_cast<double>(f)), 131072); // infinity as well
+    if (size < std::ldexp(1, -25)) // the sign goes where nothing of the value remains
+        return 0;
+    double const step = std::ldexp(1, std::max(std::ilogb(size), -14) - 10);
+    double const value = std::min(Rounded(size, step), 65536.0);
+    int const exponent = std::max(std::ilogb(value), -14);
+    // Adding lets a fraction of 1024 units carry from a denormal to the first normal exponent.
+    int const units = static_cast<int>(std::ldexp(value, 10 - exponent));
+    return sign | static_cast<unsigned>(((exponent + 14) << 10) + units);
+}
+
+// A float at and beside a half, and at and beside the middle to its neighbours.
+int const places[] = {-0x1001, -0x1000, -0xFFF, -1, 0, 1, 0xFFF, 0x1000, 0x1001};
+
+/// Calls `use` with blocks of float bits: all of them when ORU_TEST_ALL_FLOATS is set, otherwise
+/// every 251st and those at the `places` of all halves.
+template<class Use>
+void ForFloats(Use use) {
+    std::vector<float> block;
+    auto const add = [&](std::uint32_t bits) {
+        SetBits(block.emplace_back(), bits);
+        if (block.size() == 65536) {
+            use(block);
+            block.clear();
+        }
+    };
+    bool const all = std::getenv("ORU_TEST_ALL_FLOATS") != nullptr;
+    for (std::uint64_t bits = 0; bits < std::uint64_t(1) << 32; bits += all ? 1 : 251)
+        add(static_cast<std::uint32_t>(bits));
+    for (unsigned h = 0; h < 65536; ++h)
+        for (int const place : places)
+            add(Bits(Half(h)) + static_cast<std::uint32_t>(place));
+    use(block);
+}
+
+TEST(Half, WidensAllValuesExactly) {
+    for (unsigned bits = 0; bits < 65536; ++bits) {
+        half const h = Half(bits);
+        bool const special = (bits & 0x7C00) == 0x7C00;
+        std::uint32_t const wide = special
+                                       ? (bits & 0x8000) << 16 | 0x7F800000 | (bits & 0x3FF) << 13
+                                       : Bits(static_cast<float>(ValueOf(bits)));
+        float f[1] = {h};
+        std::uint32_t stored;
+        std::memcpy(&stored, f, sizeof stored);
+        ASSERT_EQ(stored, wide) << bits;
+
+        double const size = special ? 0 : std::fabs(ValueOf(bits));
+        bool const isNan = special && (bits & 0x3FF);
+        ASSERT_EQ(h.isNan(), isNan) << bits;
+        ASSERT_EQ(h.isInfinity(), special && !isNan) << bits;
+        ASSERT_EQ(h.isFinite(), !special) << bits;
+        ASSERT_EQ(h.isZero(), !special && size == 0) << bits;
+        ASSERT_EQ(h.isDenormalized(), size > 0 && size < std::ldexp(1, -14)) << bits;
+        ASSERT_EQ(h.isNormalized(), size >= std::ldexp(1, -14)) << bits;
+        ASSERT_EQ(h.isNegative(), bits >= 0x8000) << bits;
+        ASSERT_EQ((-h).bits(), bits ^ 0x8000);
+        // There and back, but for the sign of zero.
+        ASSERT_EQ(half(float(h)).bits(), bits == 0x8000 ? 0 : bits);
+    }
+}
+
+TEST(Half, RoundsEveryClassOfFloats) {
+    EXPECT_EQ(half(65504.0f).bits(), 0x7BFF);
+    EXPECT_EQ(half(65519.0f).bits(), 0x7BFF);
+    EXPECT_EQ(half(-65520.0f).bits(), 0xFC00);
+    EXPECT_EQ(half(-0.0f).bits(), 0);
+    EXPECT_EQ(half(-1e-9f).bits(), 0);
+    EXPECT_EQ(half(-std::ldexp(1.0f, -25)).bits(), 0x8001);
+    EXPECT_EQ(half(1.0f + std::ldexp(1.0f, -11)).bits(), 0x3C01) << "a tie goes up";
+
+    ForFloats([](std::vector<float> const &floats) {
+        for (float const &f : floats) {
+            unsigned const expected = Expected(Bits(f));
+            if (half(f).bits() != expected) { // an assertion each would take most of the time
+                FAIL() << std::hex << Bits(f) << ": " << half(f).bits() << ", not " << expected;
+            }
+        }
+    });
+}
+
+TEST(Half, RaisesOverflowOnlyWhereItOverflows) {
+    auto const raises = [](float f) {
+        std::feclearexcept(FE_ALL_EXCEPT);
+        float const volatile given = f;
+        half const volatile h(given);
+        static_cast<void>(h);
+        return std::fetestexcept(FE_OVERFLOW) != 0;
+    };
+    EXPECT_TRUE(raises(1e6f));
+    EXPECT_TRUE(raises(-65520.0f));
+    EXPECT_FALSE(raises(65519.0f));
+    EXPECT_FALSE(raises(std::numeric_limits<float>::infinity()));
+}
+
+TEST(Half, KeepsAsManyFractionBitsAsAsked) {
+    for (unsigned n = 0; n < 12; ++n) {
+        for (unsigned bits = 0; bits < 65536; ++bits) {
+            half const rounded = Half(bits).round(n);
+            unsigned expected = bits;
+            if (n < 10 && (bits & 0x7C00) != 0x7C00) {
+                // The bits of a half grow evenly with its value inside an exponent and across.
+                unsigned const step = 1u << (10 - n);
+                unsigned const size = bits & 0x7FFF;
+                unsigned const up = (size + step / 2) / step * step;
+                expected = (up < 0x7C00 ? up : size / step * step) | (bits & 0x8000);
+            } else if (n < 10) {
+                expected = bits >> (10 - n) << (10 - n);
+            }
+            ASSERT_EQ(rounded.bits(), expected) << n << ' ' << bits;
+        }
+    }
+    EXPECT_EQ(float(half(3.0f).round(0)), 4.0f);
+}
+
+TEST(Half, ComputesInSinglePrecision) {
+    half h(2048.0f);
+    EXPECT_EQ(h += half(1.0f), 2050.0f) << "2049 is a tie";
+    EXPECT_EQ(h -= 2.0f, 2048.0f);
+    EXPECT_EQ(h *= half(0.5f), 1024.0f);
+    EXPECT_EQ(h /= 3.0f, half(1024.0f / 3));
+    EXPECT_EQ((h = 70000.0f).bits(), half::posInf().bits());
+    EXPECT_TRUE((h *= 0.0f).isNan());
+    EXPECT_EQ(half::negInf().bits(), 0xFC00);
+    EXPECT_EQ(half::qNan().bits(), 0x7FFF);
+    EXPECT_EQ(half::sNan().bits(), 0x7DFF);
+
+    std::stringstream stream("0.1 -2 x");
+    half a, b, none(5.0f);
+    stream >> a >> b >> none;
+    EXPECT_EQ(a.bits(), half(0.1f).bits());
+    EXPECT_EQ(b, -2.0f);
+    EXPECT_EQ(none.bits(), 0);
+    EXPECT_TRUE(stream.fail());
+    std::ostringstream out;
+    out.precision(3);
+    out << a << ' ' << half::negInf();
+    EXPECT_EQ(out.str(), "0.1 -inf");
+}
+
+TEST(HalfRow, WidensAsTheClassDoes) {
+    std::vector<half> halves;
+    for (unsigned i = 0; i < 65536; ++i)
+        halves.push_back(Half(i)); // NaNs in rows of their own
+    for (unsigned i = 0; i < 65536; ++i)
+        halves.push_back(Half(i * 40503u)); // and scattered among the others
+    std::vector<float> single(halves.begin(), halves.end()), row(halves.size());
+    ORU::HalfToFloat(halves.data(), row.data(), row.size());
+    for (std::size_t i = 0; i < row.size(); ++i)
+        ASSERT_EQ(std::memcmp(&row[i], &single[i], sizeof(float)), 0) << halves[i].bits();
+}
+
+TEST(HalfRow, NarrowsAsTheClassDoes) {
+    std::vector<half> row(65536);
+    ForFloats([&row](std::vector<float> const &floats) {
+        ORU::FloatToHalf(floats.data(), row.data(), floats.size());
+        for (std::size_t i = 0; i < floats.size(); ++i)
+            if (row[i].bits() != half(floats[i]).bits()) {
+                FAIL() << std::hex << Bits(floats[i]) << ": " << row[i].bits();
+            }
+    });
+}
+
+// In a mixed row one value that the vectors leave to the class would hide what they do to others.
+TEST(HalfRow, NarrowsRowsOfOneValueAsTheClassDoes) {
+    std::vector<float> floats(8);
+    std::vector<half> row(8);
+    for (unsigned h = 0; h < 65536; ++h) {
+        for (int const place : places) {
+            for (float &f : floats)
+                SetBits(f, Bits(Half(h)) + static_cast<std::uint32_t>(place));
+            ORU::FloatToHalf(floats.data(), row.data(), row.size());
+            for (half const &value : row)
+                ASSERT_EQ(value.bits(), half(floats[0]).bits()) << std::hex << Bits(floats[0]);
+        }
+    }
+}
+
+TEST(HalfRow, TouchesNothingButTheRow) {
+    std::mt19937 random(3);
+    std::vector<float> floats(128), back(128);
+    std::vector<half> halves(128);
+    for (int round = 0; round < 20000; ++round) {
+        std::size_t const offset = random() % 9, count = random() % 100;
+        for (float &f : floats) { // mostly values that the vectors take, few that they leave
+            std::uint32_t const bits = static_cast<std::uint32_t>(random());
+            bool const plain = random() % 32 != 0;
+            SetBits(f, plain ? (bits & 0x807FFFFF) | (113 + bits % 29) << 23 : bits);
+        }
+        std::fill(halves.begin(), halves.end(), Half(0x1234));
+        std::fill(back.begin(), back.end(), 17.0f);
+        ORU::FloatToHalf(&floats[offset], &halves[offset], count);
+        ORU::HalfToFloat(&halves[offset], &back[offset], count);
+        for (std::size_t i = 0; i < floats.size(); ++i) {
+            bool const inside = i >= offset && i < offset + count;
+            ASSERT_EQ(halves[i].bits(), inside ? half(floats[i]).bits() : 0x1234);
+            float const expected = inside ? float(halves[i]) : 17.0f;
+            ASSERT_EQ(std::memcmp(&back[i], &expected, sizeof expected), 0);
+        }
+    }
+}
+
+} // namespace

@@ -1,0 +1,170 @@
+// The memory hooks, the owners that use them, and aligned memory.
+#include "../countinghooks.h"
+
+#include "oru/core/exceptions/internalexception.h"
+#include "oru/core/memory/orumemoryprivate.h"
+#include "oru/core/utility/scopedptr.h"
+
+#include <gmock/gmock.h>
+
+#include <cstring>
+#include <new>
+#include <stdexcept>
+#include <vector>
+
+using oru_test::CountingHooks;
+
+namespace {
+
+int gAlive = 0; ///< `Counted` objects that live
+
+struct Counted {
+    explicit Counted(bool fail = false) {
+        if (fail)
+            throw std::runtime_error("half way");
+        ++gAlive;
+    }
+    Counted(Counted const &) = delete;
+    Counted &operator=(Counted const &) = delete;
+    virtual ~Counted() { --gAlive; }
+};
+
+struct Other {
+    virtual ~Other() = default;
+    int padding = 0;
+};
+
+/// Its `Counted` does not lie at its start.
+struct Derived : Other, Counted {
+    explicit Derived(bool failAfterBases = false) : failing(failAfterBases) {}
+    Counted failing; ///< fails when the bases already live
+};
+
+/// Nothing is left, and nothing was freed in a wrong way.
+void ExpectClean(CountingHooks const &hooks) {
+    EXPECT_TRUE(hooks.outstanding().empty());
+    EXPECT_EQ(hooks.wrongReleases(), 0);
+    EXPECT_EQ(gAlive, 0);
+}
+
+TEST(MemoryHooks, SeeTheTagOfEachAllocation) {
+    CountingHooks hooks;
+    for (auto const type : {ORU::MEMORYTYPE_DEFAULT, ORU::MEMORYTYPE_IMAGE}) {
+        void *const p = operator new(33, type, "some.cpp", 44);
+        auto const &seen = hooks.outstanding().at(p);
+        EXPECT_EQ(seen.size, 33u);
+        EXPECT_EQ(seen.type, type);
+        EXPECT_EQ(seen.file, "some.cpp");
+        EXPECT_EQ(seen.line, 44);
+        operator delete(p, type, "other.cpp", 1);
+    }
+    int const line = __LINE__ + 1;
+    ORU::ScopedPtr<Counted> const object(ORU_NEW Counted);
+    EXPECT_EQ(hooks.outstanding().at(object.get()).line, line);
+    EXPECT_EQ(hooks.outstanding().at(object.get()).file, "tests/core/memory/memory_test.cpp");
+}
+
+TEST(MemoryHooks, FreeWhatAConstructorLeavesThatThrowsHalfWay) {
+    CountingHooks hooks;
+    EXPECT_THROW(ORU::MakeScoped(ORU_NEW Counted(true)), std::runtime_error);
+    EXPECT_THROW(ORU::MakeShared(ORU_NEW Derived(true)), std::runtime_error);
+    EXPECT_EQ(hooks.allocations(), 2);
+    ExpectClean(hooks);
+}
+
+TEST(MemoryHooks, AreInstalledOnce) {
+    auto const message = [](auto const &install) -> std::string {
+        try {
+            install();
+        } catch (ORU::InternalException const &e) {
+            EXPECT_STREQ(e.file(), "oru/core/memory/orumemory.cpp");
+            return e.message();
+        }
+        return "";
+    };
+    auto const installNone = [] { ORU::SetAllocationDeallocationFunction(nullptr, nullptr); };
+    EXPECT_EQ(message(installNone), "") << "null hooks install nothing";
+    {
+        CountingHooks hooks;
+        EXPECT_EQ(message(installNone), "ORU_private::gAllocationFunction == NULL");
+        auto const allocation = ORU_private::gAllocationFunction;
+        ORU_private::gAllocationFunction = nullptr;
+        EXPECT_EQ(message(installNone), "ORU_private::gDeallocationFunction == NULL");
+        EXPECT_NE(ORU_private::gDeallocationFunction, nullptr);
+        ORU_private::gAllocationFunction = allocation;
+    }
+    ORU_private::MemoryCheckFunction const check = [](void const *, std::size_t) { return false; };
+    auto const installCheck = [check] { ORU::SetMemoryCheckFunction(check); };
+    EXPECT_EQ(message(installCheck), "");
+    EXPECT_EQ(message(installCheck), "ORU_private::gMemoryCheckFunction == NULL");
+    EXPECT_EQ(ORU_private::gMemoryCheckFunction, check);
+    EXPECT_TRUE(ORU_private::CheckMemoryLegal(nullptr, 0)) << "the hook is not asked";
+    ORU_private::gMemoryCheckFunction = nullptr;
+}
+
+TEST(Owners, DestroyAndFreeThroughTheHooksOnce) {
+    CountingHooks hooks;
+    {
+        auto derived = ORU::MakeScoped(ORU_NEW Derived);
+        void const *const start = derived.get();
+        ORU::ScopedPtr<Counted> base(std::move(derived));
+        EXPECT_NE(start, base.get()) << "the base lies inside the object";
+        EXPECT_EQ(derived, nullptr);
+        EXPECT_EQ(gAlive, 2);
+
+        std::shared_ptr<Counted> const shared = ORU::MakeShared(ORU_NEW Derived);
+        std::shared_ptr<Counted> const second(shared);
+        std::shared_ptr<Counted> const guest(base.get(), ORU::NullDeleter());
+        EXPECT_EQ(hooks.outstanding().size(), 2u);
+    }
+    ORU::ORUDeleter<Counted>()(nullptr);
+    ORU::ScopedPtr<int const> const constant(ORU_NEW int const(3));
+    EXPECT_EQ(hooks.allocations(), 3);
+    const_cast<ORU::ScopedPtr<int const> &>(constant).reset();
+    ExpectClean(hooks);
+}
+
+/// Allocates, checks the layout, fills every byte the caller may use, frees.
+void UseAligned(ORU::MemoryType type, std::size_t size, int alignment, CountingHooks const *hooks) {
+    void *const p = ORU_private::NewAlignedMemory(type, size, alignment);
+    EXPECT_TRUE(ORU::IsAligned(p, alignment));
+    char *raw;
+    std::memcpy(&raw, static_cast<char *>(p) - 8, sizeof raw);
+    auto const distance = static_cast<char *>(p) - raw;
+    EXPECT_GE(distance, 8);
+    EXPECT_LE(distance, 8 + alignment);
+    if (hooks) {
+        auto const &seen = hooks->outstanding().at(raw);
+        bool const isImage = type == ORU::MEMORYTYPE_IMAGE;
+        EXPECT_EQ(seen.size, size + 8 + static_cast<std::size_t>(alignment));
+        EXPECT_EQ(seen.type, isImage ? ORU::MEMORYTYPE_IMAGE : ORU::MEMORYTYPE_DEFAULT);
+        EXPECT_THAT(seen.file, ::testing::StartsWith("oru/core/memory/orumemory"));
+    }
+    std::memset(p, 0xA5, size);
+    if (type == ORU::MEMORYTYPE_IMAGE)
+        ORU::ORUImageAlignedDeleter()(p);
+    else
+        ORU_private::DeleteAlignedMemory(type, p);
+}
+
+TEST(AlignedMemory, IsAlignedAndFreedWithAndWithoutHooks) {
+    auto const useAll = [](CountingHooks const *hooks) {
+        for (auto const type : {ORU::MEMORYTYPE_DEFAULT, ORU::MEMORYTYPE_IMAGE})
+            for (int const alignment : {1, 2, 3, 8, 24, 64, 4096})
+                for (std::size_t const size : {0u, 1u, 100u, 65536u})
+                    UseAligned(type, size, alignment, hooks);
+    };
+    useAll(nullptr);
+    CountingHooks hooks;
+    useAll(&hooks);
+    ExpectClean(hooks);
+}
+
+TEST(AlignedMemory, ExhaustionIsBadAlloc) {
+    EXPECT_THROW(ORU_private::NewAlignedMemory(ORU::MEMORYTYPE_IMAGE, std::size_t(1) << 60, 64),
+                 std::bad_alloc);
+    EXPECT_THROW(operator new(std::size_t(1) << 60, ORU::MEMORYTYPE_DEFAULT, "", 0),
+                 std::bad_alloc);
+}
+
+} // namespace

@@ -1,0 +1,155 @@
+// The small value types and helpers: sizes, rectangles, version texts, boundaries.
+#include "oru/core/utility/addressproc.h"
+#include "oru/core/utility/boundary.h"
+#include "oru/core/utility/integerrect.h"
+#include "oru/core/utility/versionstring.h"
+
+#include <gtest/gtest.h>
+
+#include <limits>
+#include <locale>
+#include <numeric>
+#include <sstream>
+
+using ambra::lumo::TVec2;
+using ORU::IntegerRect;
+using ORU::size2;
+
+namespace {
+
+template<class T>
+std::string Printed(T const &value) {
+    std::ostringstream stream;
+    stream << value;
+    return stream.str();
+}
+
+TEST(Size2, ComputesAndComparesByComponents) {
+    size2 const a(640, 481), b(7, 9);
+    EXPECT_EQ(a + b, size2(647, 490));
+    EXPECT_EQ(a * b, size2(4480, 4329));
+    EXPECT_EQ(a / b * b + a % b, a);
+    EXPECT_EQ(a / b, size2(91, 53));
+    size2 const largest(std::numeric_limits<std::size_t>::max());
+    EXPECT_EQ(largest + size2(1, 0), size2(0, largest[1])) << "64 bits, modulo 2^64";
+    size2 self(6, 4);
+    EXPECT_EQ(self += self, size2(12, 8));
+    EXPECT_EQ(self %= self, size2());
+
+    // A strict order of all pairs: the first component decides, the second between equals.
+    for (std::size_t i = 0; i < 81; ++i) {
+        size2 const x(i / 27, i / 9 % 3), y(i / 3 % 3, i % 3);
+        EXPECT_EQ(x < y, x[0] * 3 + x[1] < y[0] * 3 + y[1]);
+        EXPECT_EQ(x == y, !(x < y) && !(y < x));
+        EXPECT_NE(x == y, x != y);
+    }
+
+    EXPECT_EQ(size2::dimension, 2u);
+    EXPECT_EQ(std::accumulate(a.begin(), a.end(), std::size_t(0)), 1121u);
+    self[1] = 5;
+    *self.begin() = 3;
+    EXPECT_EQ(Printed(self), "(3, 5)");
+}
+
+TEST(IntegerRect, MovesComparesAndPrints) {
+    IntegerRect rect(TVec2<int>(10, 20), size2(640, 480));
+    EXPECT_EQ(Printed(rect), "[o=(10 20), s=(640, 480)]");
+    IntegerRect const original = rect;
+    rect.translate(TVec2<int>(-30, 1));
+    EXPECT_NE(rect, original);
+    EXPECT_EQ(rect, IntegerRect(TVec2<int>(-20, 21), size2(640, 480)));
+    EXPECT_NE(rect, IntegerRect(TVec2<int>(-20, 21), size2(640, 481)));
+    EXPECT_NE(rect, IntegerRect(TVec2<int>(-20, 20), size2(640, 480)));
+    EXPECT_EQ(rect.toString(), "[o=(-20 21), s=(640, 480)]");
+
+    for (size2 const &size : {size2(0, 5), size2(5, 0), size2()}) {
+        rect.setSize(size);
+        EXPECT_TRUE(rect.isEmpty());
+        EXPECT_EQ(rect.toString(), "Empty");
+    }
+    EXPECT_EQ(IntegerRect(), IntegerRect(TVec2<int>(0, 0), size2(0)));
+}
+
+struct Version {
+    char const *text;
+    unsigned major, minor;
+    int release;
+    char const *vendor;
+};
+
+/// A locale that would read "1,024" as one number.
+struct Grouping : std::numpunct<char> {
+    char do_thousands_sep() const override { return ','; }
+    std::string do_grouping() const override { return "\3"; }
+};
+
+TEST(VersionString, SplitsWhatDriversSay) {
+    Version const versions[] = {
+        {"3.3.0 - Build 26.20", 3, 3, 0, "- Build 26.20"},
+        {"4.5 (Compatibility Profile) Mesa 22.3.6", 4, 5, -1,
+         "(Compatibility Profile) Mesa 22.3.6"},
+        {"4.6.0 NVIDIA 535.54.03", 4, 6, 0, "NVIDIA 535.54.03"},
+        {"4.50", 4, 50, -1, ""},
+        {"1.2.11", 1, 2, 11, ""},
+        {" 2.1  two blanks", 2, 1, -1, " two blanks"},
+        {"2.1.x y", 2, 1, 0, "y"},
+        {"4", 4, 4, -1, ""},
+        {"4 none. at all", 4, 0, -1, "at all"},
+        {"1,024.0", 1, 0, -1, ""},
+        {"3.", 3, 0, -1, ""},
+        {"3.2. gone", 3, 2, 0, "gone"},
+        {".", 0, 0, -1, ""},
+        {"", 0, 0, -1, ""},
+    };
+    std::locale const before =
+        std::locale::global(std::locale(std::locale::classic(), new Grouping));
+    for (Version const &version : versions) {
+        unsigned major = 77, minor = 77;
+        int release = 77;
+        std::string vendor = "stale";
+        ORU::TokenizeVersionString(version.text, major, minor, release, vendor);
+        SCOPED_TRACE(version.text);
+        EXPECT_EQ(major, version.major);
+        EXPECT_EQ(minor, version.minor);
+        EXPECT_EQ(release, version.release);
+        EXPECT_EQ(vendor, version.vendor);
+    }
+    std::locale::global(before);
+}
+
+TEST(Boundary, IsTheNextMultiple) {
+    for (int boundary = 1; boundary <= 17; ++boundary) {
+        for (int value = 0; value <= 100; ++value) {
+            int next = value;
+            while (next % boundary != 0)
+                ++next;
+            EXPECT_EQ(ORU::IncrementToBoundary(value, boundary), next);
+            EXPECT_EQ(ORU::IncrementToBoundaryPtr(static_cast<std::size_t>(value), boundary),
+                      static_cast<std::size_t>(next));
+        }
+    }
+    EXPECT_EQ(ORU::IncrementToBoundary(-17, 16), 0) << "-17 + 16 - (-1)";
+    EXPECT_EQ(ORU::IncrementToBoundary(-16, 16), -16);
+    EXPECT_EQ(ORU::IncrementToBoundaryPtr(0xFFFF'FFFF'0001, 4096), 0x1'0000'0000'0000u - 0xF000);
+    EXPECT_EQ(ORU::IncrementToBoundaryPtr(5, -16), std::size_t(0) - 16) << "signed when widened";
+
+    int powers = 0;
+    for (unsigned x = 1; x <= 1u << 16; ++x)
+        powers += ORU::IsPowerOfTwo(x);
+    EXPECT_EQ(powers, 17);
+    EXPECT_TRUE(ORU::IsPowerOfTwo(0));
+    EXPECT_TRUE(ORU::IsPowerOfTwo(1u << 31));
+    EXPECT_FALSE(ORU::IsPowerOfTwo(0xFFFFFFFF));
+}
+
+TEST(AddressProc, IsKeptForWhoAsks) {
+    EXPECT_EQ(ORU::GetZURGetAddressProc(), nullptr);
+    ORU::ZURGetAddressProc const proc = [](char const *, char const *, char const *) -> void * {
+        return nullptr;
+    };
+    ORU::SetZURGetAddressProc(proc);
+    EXPECT_EQ(ORU::GetZURGetAddressProc(), proc);
+    ORU::SetZURGetAddressProc(nullptr);
+}
+
+} // namespace
