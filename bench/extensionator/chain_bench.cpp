@@ -6,7 +6,7 @@
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/extensionator/openglforwarder.h"
 
-#include <memory>
+#include <iterator>
 #include <vector>
 
 using namespace ORU::OGL;
@@ -97,9 +97,16 @@ char const *const kNames[] = {
 };
 std::size_t const kFirstExtended = 336;
 
-/// The least that reading a device's entry points takes: a throw-away context on a window, and one
-/// look-up for each name.
+/// Looks every name up, which is the least that reading a device's entry points takes.
 void ReadEntryPoints(std::vector<PROC> &addresses) {
+    addresses.clear();
+    for (std::size_t i = kFirstExtended; i < std::size(kNames); ++i)
+        addresses.push_back(::wglGetProcAddress(kNames[i]));
+}
+
+/// Does something in a throw-away context, made by plain calls.
+template<class Work>
+void InPlainContext(Work work) {
     HWND const window = ::CreateWindowA("STATIC", "", WS_OVERLAPPEDWINDOW, 0, 0, 8, 8, nullptr,
                                         nullptr, ::GetModuleHandleW(nullptr), nullptr);
     HDC const dc = ::GetDC(window);
@@ -108,14 +115,27 @@ void ReadEntryPoints(std::vector<PROC> &addresses) {
     ::SetPixelFormat(dc, 1, &descriptor);
     HGLRC const context = ::wglCreateContext(dc);
     ::wglMakeCurrent(dc, context);
-    addresses.clear();
-    for (std::size_t i = kFirstExtended; i < std::size(kNames); ++i)
-        addresses.push_back(::wglGetProcAddress(kNames[i]));
+    work();
     ::wglMakeCurrent(nullptr, nullptr);
     ::wglDeleteContext(context);
     ::ReleaseDC(window, dc);
     ::DestroyWindow(window);
 }
+
+// The record of a context that the host made, against the bare look-ups; both with making the
+// context.
+void RecordOfContext(benchmark::State &state) {
+    oru_bench::OpenLibrary();
+    std::vector<PROC> addresses;
+    auto const record = [] { benchmark::DoNotOptimize(&ExtensionManager::CurrentTable()); };
+    Comparison comparison(state);
+    while (state.KeepRunning()) {
+        ExtensionManager::Terminate(); // forgets the record; no context is alive
+        double const bare = Seconds([&] { InPlainContext([&] { ReadEntryPoints(addresses); }); });
+        comparison.add(bare, Seconds([&] { InPlainContext(record); }));
+    }
+}
+BENCHMARK(RecordOfContext)->UseManualTime()->Iterations(100)->Unit(benchmark::kMillisecond);
 
 struct Displays : Context {
     using Context::DisplayOrigin;
@@ -132,7 +152,7 @@ void RecordOfDevice(benchmark::State &state) {
     while (state.KeepRunning()) {
         ExtensionManager::Terminate(); // forgets the record; no context is alive
         double const place = Seconds([&] { Displays::DisplayOrigin(key.adapterName, true); });
-        double const bare = Seconds([&] { ReadEntryPoints(addresses); });
+        double const bare = Seconds([&] { InPlainContext([&] { ReadEntryPoints(addresses); }); });
         placing.push_back(place * 1e9);
         comparison.add(place + bare, Seconds([&] { ExtensionManager::Instance(key); }));
     }
