@@ -1,7 +1,7 @@
 // OpenCL buffers: one-dimensional device memory.
 #include "oru/oru_ocl/bufferocl.h"
 
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 
 namespace ORU::OCL {

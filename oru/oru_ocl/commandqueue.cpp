@@ -2,7 +2,7 @@
 #include "oru/oru_ocl/commandqueue.h"
 
 #include "oru/core/utility/integerrect.h"
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/internal/handlearray.h"
 
 namespace ORU::OCL {

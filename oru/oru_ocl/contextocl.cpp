@@ -1,7 +1,7 @@
 // An OpenCL context and its properties.
 #include "oru/oru_ocl/contextocl.h"
 
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/internal/handlearray.h"
 #include "oru/oru_ocl/internal/infoquery.h"
 

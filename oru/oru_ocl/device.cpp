@@ -1,7 +1,7 @@
 // An OpenCL device.
 #include "oru/oru_ocl/device.h"
 
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/internal/infoquery.h"
 #include "oru/oru_ocl/internal/profiletext.h"
 #include "oru/oru_ocl/platform.h"

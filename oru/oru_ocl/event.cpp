@@ -2,7 +2,7 @@
 #include "oru/oru_ocl/event.h"
 
 #include "oru/oru_ocl/commandqueue.h"
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/internal/handlearray.h"
 
 namespace ORU::OCL {

@@ -95,6 +95,7 @@ std::vector<Version> PlatformVersions(FunctionTable const &table) {
 } // namespace
 
 ExtensionManager *ExtensionManager::extMgrInstance_ = nullptr;
+FunctionTable const *ExtensionManager::sTable_ = nullptr;
 
 ExtensionManager::ExtensionManager(HINSTANCE library)
     : library_(library), table_(ORU_NEW FunctionTable) {
@@ -109,6 +110,7 @@ ExtensionManager *ExtensionManager::create(HINSTANCE library) {
     ORU_ASSERT(extMgrInstance_ == 0);
     extMgrInstance_ = ORU_NEW ExtensionManager(library);
     ORU_ASSERT(extMgrInstance_);
+    sTable_ = extMgrInstance_->table_.get();
     std::vector<Version> const platformVersions = PlatformVersions(extMgrInstance_->table());
     ORU_ASSERT(platformVersions.size() > 0);
     // The loader exports one set of entry points for all platforms; the first platform decides, so
@@ -120,6 +122,7 @@ ExtensionManager *ExtensionManager::create(HINSTANCE library) {
 }
 
 void ExtensionManager::destroy() noexcept {
+    sTable_ = nullptr;
     ORUDeleter<ExtensionManager>()(extMgrInstance_);
     extMgrInstance_ = nullptr;
 }

@@ -31,6 +31,9 @@ public:
     /// The instance; null while the layer is not initialised.
     static ExtensionManager *instance() { return extMgrInstance_; }
 
+    /// The instance's table; null while there is no instance. One load, for the layer's own calls.
+    static FunctionTable const *currentTable() { return sTable_; }
+
     /// The function table.
     /// @throws InternalException "table_ != 0"
     FunctionTable const &table() const {
@@ -69,6 +72,7 @@ private:
     bool resolve(Enum::Extension extension);
 
     static ExtensionManager *extMgrInstance_;
+    static FunctionTable const *sTable_;
 
     HINSTANCE library_;
     ScopedPtr<FunctionTable> table_;

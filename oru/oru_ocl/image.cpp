@@ -1,7 +1,7 @@
 // OpenCL images: two- and three-dimensional device memory with a pixel format.
 #include "oru/oru_ocl/image.h"
 
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/internal/enumtable.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/texture2.h"

@@ -1,10 +1,12 @@
 // OpenCL kernels: functions of a program that are launched on a device.
 #pragma once
 
-#include "oru/core/utility/export.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/openclobjectwrapper.h"
 
 #include <cstddef>
+#include <type_traits>
+#include <utility>
 
 namespace ORU::OCL {
 
@@ -12,21 +14,38 @@ namespace ORU::OCL {
 /// `CommandQueue::enqueueKernel`. Copies are the same kernel and share the arguments.
 class ORU_API Kernel : public OpenCLObjectWrapper<cl_kernel> {
 public:
-    /// Sets an argument from raw bytes (clSetKernelArg): a scalar, a vector, the address of a
-    /// `handle()`, or null with the size of a piece of local memory.
+    /// Sets an argument from raw bytes (clSetKernelArg), for example null with the size of a piece
+    /// of local memory.
     /// @param index argument number from 0
     /// @param size bytes
     /// @throws ExceptionOCL when the runtime refuses
-    void setArg(unsigned int index, void const *value, std::size_t size);
+    void setArg(unsigned int index, void const *value, std::size_t size) {
+        ORU_CL(SetKernelArg)(id(), index, size, value);
+    }
 
-    /// Sets an argument to a Buffer or an Image2D, or to a TVec2 or TVec4 of float or int, which
-    /// the kernel sees as float2, float4, int2 or int4.
+    /// Sets an argument to a memory object or a sampler, or to a plain value: a TVec2 or TVec4 of
+    /// float or int is the kernel's float2, float4, int2 or int4, a float its float.
     /// @throws ExceptionOCL when the runtime refuses
     template<class T>
-    void setArg(unsigned int index, T const &value);
+    void setArg(unsigned int index, T const &value) {
+        // Inline, as the call itself takes no longer than one through another module.
+        if constexpr (IsWrapper<T>::value) {
+            setArg(index, &value.id(), sizeof value.id());
+        } else {
+            static_assert(std::is_trivially_copyable_v<T> && !std::is_pointer_v<T>,
+                          "an argument is an object of the layer or a plain value");
+            setArg(index, &value, sizeof value);
+        }
+    }
 
 private:
     friend class Program;
+
+    template<class T, class = void>
+    struct IsWrapper : std::false_type {};
+    template<class T>
+    struct IsWrapper<T, std::void_t<decltype(std::declval<T const &>().handle())>>
+        : std::true_type {};
 
     /// Takes over the caller's reference.
     explicit Kernel(cl_kernel kernel) : OpenCLObjectWrapper(kernel) {}

@@ -1,7 +1,7 @@
 // The base of OpenCL buffers and images.
 #include "oru/oru_ocl/memory.h"
 
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/internal/enumtable.h"
 
 namespace ORU::OCL {

@@ -1,7 +1,7 @@
 // What retains and releases each kind of OpenCL handle.
 #include "oru/oru_ocl/openclobjectwrapper.h"
 
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 
 namespace ORU::OCL {
 

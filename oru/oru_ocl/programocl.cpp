@@ -1,7 +1,7 @@
 // OpenCL programs: what is built for a device from source or binaries.
 #include "oru/oru_ocl/programocl.h"
 
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/internal/enumtable.h"
 #include "oru/oru_ocl/internal/handlearray.h"
 #include "oru/oru_ocl/internal/infoquery.h"

@@ -1,7 +1,7 @@
 // OpenCL samplers: how kernels read images.
 #include "oru/oru_ocl/sampler.h"
 
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/internal/enumtable.h"
 
 namespace ORU::OCL {

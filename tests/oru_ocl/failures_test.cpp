@@ -103,7 +103,7 @@ std::vector<FailuresTest::Case> FailuresTest::cases() {
         {"CreateKernel", 1, "programocl.cpp", [this] { program.kernel("f"); }},
         {"CreateKernelsInProgram", 1, "programocl.cpp", [this] { program.kernels(); }},
         {"CreateKernelsInProgram", 2, "programocl.cpp", [this] { program.kernels(); }},
-        {"SetKernelArg", 1, "kernel.cpp", [this] { kernel.setArg(0, buffer); }},
+        {"SetKernelArg", 1, "kernel.h", [this] { kernel.setArg(0, buffer); }},
         {"WaitForEvents", 1, "event.cpp", [this] { event.wait(); }},
         {"WaitForEvents", 1, "event.cpp", [this] { Event::WaitForEvents({event}); }},
         {"GetEventInfo", 1, "event.cpp", [this] { event.commandType(); }},

@@ -1,5 +1,7 @@
 // Loading of the OpenCL runtime. Each case runs in a process of its own under CTest, as the answer
 // of IsOpenCLAvailable is one for the process.
+#include "tests/messageof.h"
+
 #include "oru/core/exceptions/internalexception.h"
 #include "oru/oru_ocl/extensionmanagerocl.h"
 #include "oru/oru_ocl/ocllibrary.h"
@@ -14,18 +16,9 @@
 #include <vector>
 
 using namespace ORU::OCL;
+using oru_test::MessageOf;
 
 namespace {
-
-template<class Call>
-std::string MessageOf(Call call) {
-    try {
-        call();
-    } catch (ORU::LogicalException const &e) {
-        return e.message();
-    }
-    return "nothing was thrown";
-}
 
 /// The runtime as the system loads it, to ask for its exports directly.
 HMODULE SystemRuntime() {

@@ -1,4 +1,4 @@
-// Calls OpenCL entry points, turning their error codes into exceptions.
+// The short form of OpenCL calls through the function table, with errors as exceptions.
 #pragma once
 
 #include "oru/oru_ocl/extensionmanagerocl.h"
@@ -10,13 +10,13 @@ namespace ORU::OCL {
 /// The function table.
 /// @throws InternalException "table_ != 0" when the layer is not initialised
 inline FunctionTable const &Table() {
-    ExtensionManager const *const table_ = ExtensionManager::instance();
+    FunctionTable const *const table_ = ExtensionManager::currentTable();
     ORU_ASSERT(table_ != 0);
-    return table_->table();
+    return *table_;
 }
 
 /// Throws `ExceptionOCL` with an empty message.
-[[noreturn]] ORU_COLD void ThrowOCL(char const *file, unsigned int line, cl_int code);
+[[noreturn]] ORU_API ORU_COLD void ThrowOCL(char const *file, unsigned int line, cl_int code);
 
 /// One entry point at one place of the source; what `ORU_CL` makes.
 template<class Function>
@@ -51,8 +51,10 @@ CheckedCall(Function, char const *, unsigned int) -> CheckedCall<Function>;
 
 } // namespace ORU::OCL
 
-/// `ORU_CL(CreateBuffer)(context, flags, size, host)` calls clCreateBuffer of the function table.
-/// Throws InternalException "table_ != 0" before the call, ExceptionOCL when it fails.
+/// `ORU_CL(CreateBuffer)(context, flags, size, host)` calls clCreateBuffer of the function table,
+/// which must have it: the entry points of OpenCL 1.0 always, others where `table()` shows them.
+/// Throws InternalException "table_ != 0" before the call, ExceptionOCL with this source position
+/// when it fails.
 #define ORU_CL(Name)                                                                               \
     ::ORU::OCL::CheckedCall {                                                                      \
         ::ORU::OCL::Table().cl##Name, __FILE__, __LINE__                                           \

@@ -1,5 +1,5 @@
 // The one place where a failed OpenCL call throws.
-#include "oru/oru_ocl/internal/clcall.h"
+#include "oru/oru_ocl/clcall.h"
 
 #include "oru/oru_ocl/exceptionocl.h"
 
