@@ -3,7 +3,7 @@
 #include "oru/core/exceptions/internalexception.h"
 #include "oru/oru_ocl/contextocl.h"
 #include "oru/oru_ocl/extensionmanagerocl.h"
-#include "tests/core/countinghooks.h"
+#include "tests/countinghooks.h"
 #include "tests/oru_ocl/testruntime.h"
 
 #include <gtest/gtest.h>

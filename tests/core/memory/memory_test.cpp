@@ -1,18 +1,19 @@
 // The memory hooks, the owners that use them, and aligned memory.
-#include "../countinghooks.h"
+#include "tests/countinghooks.h"
+#include "tests/messageof.h"
 
 #include "oru/core/exceptions/internalexception.h"
 #include "oru/core/memory/orumemoryprivate.h"
 #include "oru/core/utility/scopedptr.h"
 
-#include <gmock/gmock.h>
+#include <gtest/gtest.h>
 
 #include <cstring>
 #include <new>
 #include <stdexcept>
-#include <vector>
 
 using oru_test::CountingHooks;
+using oru_test::MessageOf;
 
 namespace {
 
@@ -29,15 +30,14 @@ struct Counted {
     virtual ~Counted() { --gAlive; }
 };
 
-struct Other {
-    virtual ~Other() = default;
+/// Its `Counted` does not lie at its start, and another may fail when its bases already live.
+struct First {
+    virtual ~First() = default;
     int padding = 0;
 };
-
-/// Its `Counted` does not lie at its start.
-struct Derived : Other, Counted {
-    explicit Derived(bool failAfterBases = false) : failing(failAfterBases) {}
-    Counted failing; ///< fails when the bases already live
+struct Derived : First, Counted {
+    explicit Derived(bool fail = false) : failing(fail) {}
+    Counted failing;
 };
 
 /// Nothing is left, and nothing was freed in a wrong way.
@@ -61,7 +61,6 @@ TEST(MemoryHooks, SeeTheTagOfEachAllocation) {
     int const line = __LINE__ + 1;
     ORU::ScopedPtr<Counted> const object(ORU_NEW Counted);
     EXPECT_EQ(hooks.outstanding().at(object.get()).line, line);
-    EXPECT_EQ(hooks.outstanding().at(object.get()).file, "tests/core/memory/memory_test.cpp");
 }
 
 TEST(MemoryHooks, FreeWhatAConstructorLeavesThatThrowsHalfWay) {
@@ -73,30 +72,21 @@ TEST(MemoryHooks, FreeWhatAConstructorLeavesThatThrowsHalfWay) {
 }
 
 TEST(MemoryHooks, AreInstalledOnce) {
-    auto const message = [](auto const &install) -> std::string {
-        try {
-            install();
-        } catch (ORU::InternalException const &e) {
-            EXPECT_STREQ(e.file(), "oru/core/memory/orumemory.cpp");
-            return e.message();
-        }
-        return "";
-    };
     auto const installNone = [] { ORU::SetAllocationDeallocationFunction(nullptr, nullptr); };
-    EXPECT_EQ(message(installNone), "") << "null hooks install nothing";
+    EXPECT_EQ(MessageOf(installNone), "") << "null hooks install nothing";
     {
         CountingHooks hooks;
-        EXPECT_EQ(message(installNone), "ORU_private::gAllocationFunction == NULL");
+        EXPECT_EQ(MessageOf(installNone), "ORU_private::gAllocationFunction == NULL");
         auto const allocation = ORU_private::gAllocationFunction;
         ORU_private::gAllocationFunction = nullptr;
-        EXPECT_EQ(message(installNone), "ORU_private::gDeallocationFunction == NULL");
+        EXPECT_EQ(MessageOf(installNone), "ORU_private::gDeallocationFunction == NULL");
         EXPECT_NE(ORU_private::gDeallocationFunction, nullptr);
         ORU_private::gAllocationFunction = allocation;
     }
     ORU_private::MemoryCheckFunction const check = [](void const *, std::size_t) { return false; };
     auto const installCheck = [check] { ORU::SetMemoryCheckFunction(check); };
-    EXPECT_EQ(message(installCheck), "");
-    EXPECT_EQ(message(installCheck), "ORU_private::gMemoryCheckFunction == NULL");
+    EXPECT_EQ(MessageOf(installCheck), "");
+    EXPECT_EQ(MessageOf(installCheck), "ORU_private::gMemoryCheckFunction == NULL");
     EXPECT_EQ(ORU_private::gMemoryCheckFunction, check);
     EXPECT_TRUE(ORU_private::CheckMemoryLegal(nullptr, 0)) << "the hook is not asked";
     ORU_private::gMemoryCheckFunction = nullptr;
@@ -135,10 +125,8 @@ void UseAligned(ORU::MemoryType type, std::size_t size, int alignment, CountingH
     EXPECT_LE(distance, 8 + alignment);
     if (hooks) {
         auto const &seen = hooks->outstanding().at(raw);
-        bool const isImage = type == ORU::MEMORYTYPE_IMAGE;
         EXPECT_EQ(seen.size, size + 8 + static_cast<std::size_t>(alignment));
-        EXPECT_EQ(seen.type, isImage ? ORU::MEMORYTYPE_IMAGE : ORU::MEMORYTYPE_DEFAULT);
-        EXPECT_THAT(seen.file, ::testing::StartsWith("oru/core/memory/orumemory"));
+        EXPECT_EQ(seen.type, type);
     }
     std::memset(p, 0xA5, size);
     if (type == ORU::MEMORYTYPE_IMAGE)

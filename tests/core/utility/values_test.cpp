@@ -1,5 +1,4 @@
 // The small value types and helpers: sizes, rectangles, version texts, boundaries.
-#include "oru/core/utility/addressproc.h"
 #include "oru/core/utility/boundary.h"
 #include "oru/core/utility/integerrect.h"
 #include "oru/core/utility/versionstring.h"
@@ -8,7 +7,6 @@
 
 #include <limits>
 #include <locale>
-#include <numeric>
 #include <sstream>
 
 using ambra::lumo::TVec2;
@@ -17,19 +15,10 @@ using ORU::size2;
 
 namespace {
 
-template<class T>
-std::string Printed(T const &value) {
-    std::ostringstream stream;
-    stream << value;
-    return stream.str();
-}
-
 TEST(Size2, ComputesAndComparesByComponents) {
     size2 const a(640, 481), b(7, 9);
-    EXPECT_EQ(a + b, size2(647, 490));
-    EXPECT_EQ(a * b, size2(4480, 4329));
-    EXPECT_EQ(a / b * b + a % b, a);
     EXPECT_EQ(a / b, size2(91, 53));
+    EXPECT_EQ(a / b * b + a % b, a);
     size2 const largest(std::numeric_limits<std::size_t>::max());
     EXPECT_EQ(largest + size2(1, 0), size2(0, largest[1])) << "64 bits, modulo 2^64";
     size2 self(6, 4);
@@ -43,31 +32,21 @@ TEST(Size2, ComputesAndComparesByComponents) {
         EXPECT_EQ(x == y, !(x < y) && !(y < x));
         EXPECT_NE(x == y, x != y);
     }
-
-    EXPECT_EQ(size2::dimension, 2u);
-    EXPECT_EQ(std::accumulate(a.begin(), a.end(), std::size_t(0)), 1121u);
-    self[1] = 5;
-    *self.begin() = 3;
-    EXPECT_EQ(Printed(self), "(3, 5)");
 }
 
 TEST(IntegerRect, MovesComparesAndPrints) {
     IntegerRect rect(TVec2<int>(10, 20), size2(640, 480));
-    EXPECT_EQ(Printed(rect), "[o=(10 20), s=(640, 480)]");
-    IntegerRect const original = rect;
     rect.translate(TVec2<int>(-30, 1));
-    EXPECT_NE(rect, original);
     EXPECT_EQ(rect, IntegerRect(TVec2<int>(-20, 21), size2(640, 480)));
     EXPECT_NE(rect, IntegerRect(TVec2<int>(-20, 21), size2(640, 481)));
     EXPECT_NE(rect, IntegerRect(TVec2<int>(-20, 20), size2(640, 480)));
-    EXPECT_EQ(rect.toString(), "[o=(-20 21), s=(640, 480)]");
-
-    for (size2 const &size : {size2(0, 5), size2(5, 0), size2()}) {
+    std::ostringstream stream;
+    stream << rect;
+    EXPECT_EQ(stream.str(), "[o=(-20 21), s=(640, 480)]");
+    for (size2 const &size : {size2(0, 5), size2(5, 0)}) {
         rect.setSize(size);
-        EXPECT_TRUE(rect.isEmpty());
         EXPECT_EQ(rect.toString(), "Empty");
     }
-    EXPECT_EQ(IntegerRect(), IntegerRect(TVec2<int>(0, 0), size2(0)));
 }
 
 struct Version {
@@ -86,19 +65,13 @@ struct Grouping : std::numpunct<char> {
 TEST(VersionString, SplitsWhatDriversSay) {
     Version const versions[] = {
         {"3.3.0 - Build 26.20", 3, 3, 0, "- Build 26.20"},
-        {"4.5 (Compatibility Profile) Mesa 22.3.6", 4, 5, -1,
-         "(Compatibility Profile) Mesa 22.3.6"},
-        {"4.6.0 NVIDIA 535.54.03", 4, 6, 0, "NVIDIA 535.54.03"},
         {"4.50", 4, 50, -1, ""},
         {"1.2.11", 1, 2, 11, ""},
         {" 2.1  two blanks", 2, 1, -1, " two blanks"},
         {"2.1.x y", 2, 1, 0, "y"},
         {"4", 4, 4, -1, ""},
-        {"4 none. at all", 4, 0, -1, "at all"},
         {"1,024.0", 1, 0, -1, ""},
-        {"3.", 3, 0, -1, ""},
         {"3.2. gone", 3, 2, 0, "gone"},
-        {".", 0, 0, -1, ""},
         {"", 0, 0, -1, ""},
     };
     std::locale const before =
@@ -129,7 +102,6 @@ TEST(Boundary, IsTheNextMultiple) {
         }
     }
     EXPECT_EQ(ORU::IncrementToBoundary(-17, 16), 0) << "-17 + 16 - (-1)";
-    EXPECT_EQ(ORU::IncrementToBoundary(-16, 16), -16);
     EXPECT_EQ(ORU::IncrementToBoundaryPtr(0xFFFF'FFFF'0001, 4096), 0x1'0000'0000'0000u - 0xF000);
     EXPECT_EQ(ORU::IncrementToBoundaryPtr(5, -16), std::size_t(0) - 16) << "signed when widened";
 
@@ -137,19 +109,8 @@ TEST(Boundary, IsTheNextMultiple) {
     for (unsigned x = 1; x <= 1u << 16; ++x)
         powers += ORU::IsPowerOfTwo(x);
     EXPECT_EQ(powers, 17);
-    EXPECT_TRUE(ORU::IsPowerOfTwo(0));
-    EXPECT_TRUE(ORU::IsPowerOfTwo(1u << 31));
+    EXPECT_TRUE(ORU::IsPowerOfTwo(0) && ORU::IsPowerOfTwo(1u << 31));
     EXPECT_FALSE(ORU::IsPowerOfTwo(0xFFFFFFFF));
-}
-
-TEST(AddressProc, IsKeptForWhoAsks) {
-    EXPECT_EQ(ORU::GetZURGetAddressProc(), nullptr);
-    ORU::ZURGetAddressProc const proc = [](char const *, char const *, char const *) -> void * {
-        return nullptr;
-    };
-    ORU::SetZURGetAddressProc(proc);
-    EXPECT_EQ(ORU::GetZURGetAddressProc(), proc);
-    ORU::SetZURGetAddressProc(nullptr);
 }
 
 } // namespace

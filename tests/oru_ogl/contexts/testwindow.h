@@ -1,7 +1,8 @@
-// What the context tests share: a plain window, messages of failures, counting of leftovers.
+// What the context tests share: a plain window, counting of leftovers.
 #pragma once
 
-#include "oru/core/exceptions/logicalexception.h"
+#include "tests/messageof.h"
+
 #include "oru/oru_ogl/extensionator/wgl/wglforwarder.h"
 #include "oru/oru_ogl/platformgl.h"
 
@@ -14,8 +15,8 @@ namespace oru_test {
 /// A window of the host.
 class TestWindow {
 public:
-    TestWindow(int x = 20, int y = 20, int width = 64, int height = 48)
-        : hwnd_(::CreateWindowA("STATIC", "", WS_POPUP | WS_VISIBLE, x, y, width, height, nullptr,
+    TestWindow()
+        : hwnd_(::CreateWindowA("STATIC", "", WS_POPUP | WS_VISIBLE, 20, 20, 64, 48, nullptr,
                                 nullptr, ::GetModuleHandleW(nullptr), nullptr)) {}
     ~TestWindow() { ::DestroyWindow(hwnd_); }
     TestWindow(TestWindow const &) = delete;
@@ -26,17 +27,6 @@ public:
 private:
     HWND hwnd_;
 };
-
-/// The message of the exception that a call throws.
-template<class Call>
-std::string MessageOf(Call call) {
-    try {
-        call();
-    } catch (ORU::LogicalException const &e) {
-        return e.message();
-    }
-    return "nothing was thrown";
-}
 
 /// The class names of this thread's hidden windows of the library.
 inline std::vector<std::string> InternalWindowClasses() {
@@ -59,10 +49,7 @@ public:
     ~ContextCounter() override { ORU::OGL::WGLInterceptor::Instance()->popInterceptor(); }
 
     HGLRC wcgmCreateContext(char const *file, unsigned int line, HDC dc) override {
-        HGLRC const made = WGLForwarder::wcgmCreateContext(file, line, dc);
-        sAlive += made ? 1 : 0;
-        ++sMade;
-        return made;
+        return Counted(WGLForwarder::wcgmCreateContext(file, line, dc));
     }
     BOOL wcgmDeleteContext(char const *file, unsigned int line, HGLRC rc) override {
         BOOL const deleted = WGLForwarder::wcgmDeleteContext(file, line, rc);
@@ -82,11 +69,13 @@ public:
     static int Made() { return sMade; }
 
 private:
-    static HGLRC WINAPI CreateContextAttribs(HDC dc, HGLRC share, int const *attributes) {
-        HGLRC const made = sCreate(dc, share, attributes);
+    static HGLRC Counted(HGLRC made) {
         sAlive += made ? 1 : 0;
         ++sMade;
         return made;
+    }
+    static HGLRC WINAPI CreateContextAttribs(HDC dc, HGLRC share, int const *attributes) {
+        return Counted(sCreate(dc, share, attributes));
     }
 
     static inline std::atomic<int> sAlive{0};

@@ -1,6 +1,7 @@
 // Where records come from: one per device, one per foreign context, none before the library is
 // open.
 #include "../glfixture.h"
+#include "tests/messageof.h"
 
 #include "oru/core/exceptions/internalexception.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
@@ -15,18 +16,9 @@
 #include <vector>
 
 using namespace ORU::OGL;
+using oru_test::MessageOf;
 
 namespace {
-
-template<class Call>
-std::string MessageOf(Call call) {
-    try {
-        call();
-    } catch (ORU::LogicalException const &e) {
-        return e.message();
-    }
-    return "nothing was thrown";
-}
 
 /// A window and context that the host makes with plain calls.
 class HostContext {

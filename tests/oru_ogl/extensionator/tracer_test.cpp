@@ -2,7 +2,7 @@
 #include "oru/oru_ogl/extensionator/opengltracer.h"
 
 #include "../glfixture.h"
-#include "allocationcount.h"
+#include "tests/allocationcount.h"
 
 #include "oru/oru_ogl/exceptionogl.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"

@@ -2,8 +2,8 @@
 #pragma once
 
 #include "../glfixture.h"
+#include "tests/messageof.h"
 
-#include "oru/core/exceptions/logicalexception.h"
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 
 #include <optional>
@@ -13,17 +13,6 @@
 #include <vector>
 
 namespace oru_test {
-
-/// The message of the exception that a call throws, empty when it throws none.
-template<class Call>
-std::string MessageOf(Call call) {
-    try {
-        call();
-    } catch (ORU::LogicalException const &e) {
-        return e.message();
-    }
-    return "";
-}
 
 /// Follows the names of GL objects from generation to deletion.
 class NameLedger : public ORU::OGL::OpenGLForwarder {

@@ -1,6 +1,6 @@
 // That rectangles allocate nothing, counted in the library's objects: a DLL has its own operator
 // new.
-#include "../../../oru_ogl/extensionator/allocationcount.h"
+#include "tests/allocationcount.h"
 
 #include "oru/core/math/region_2d/boundingrect.h"
 #include "oru/core/math/region_2d/boundingregion.h"

@@ -5,6 +5,8 @@
 
 #include <cstdlib>
 #include <map>
+#include <new>
+#include <set>
 #include <string>
 
 namespace oru_test {
@@ -33,6 +35,10 @@ public:
     CountingHooks &operator=(CountingHooks const &) = delete;
 
     int allocations() const { return allocations_; }
+    /// The allocation that runs out of memory, counted from 1.
+    void failAt(int allocation) { failAt_ = allocation; }
+    /// The sources that allocated.
+    std::set<std::string> const &files() const { return files_; }
     /// What is not freed yet, by address.
     std::map<void *, Allocation> const &outstanding() const { return outstanding_; }
     /// Releases of what was not allocated here, or under another type.
@@ -45,8 +51,10 @@ private:
     }
 
     static void *Allocate(std::size_t size, ORU::MemoryType type, char const *file, int line) {
+        Current()->files_.insert(file);
+        if (++Current()->allocations_ == Current()->failAt_)
+            throw std::bad_alloc();
         void *const p = std::malloc(size);
-        ++Current()->allocations_;
         Current()->outstanding_[p] = Allocation{size, type, file, line};
         return p;
     }
@@ -63,6 +71,8 @@ private:
     }
 
     int allocations_ = 0;
+    int failAt_ = 0;
+    std::set<std::string> files_;
     int wrongReleases_ = 0;
     std::map<void *, Allocation> outstanding_;
 };

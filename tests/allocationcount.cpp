@@ -1,5 +1,5 @@
 // Counts what a program allocates with the plain operator new.
-#include "allocationcount.h"
+#include "tests/allocationcount.h"
 
 #include <atomic>
 #include <cstdlib>
