@@ -6,8 +6,9 @@ set(CMAKE_CXX_COMPILER clang++)
 
 file(GLOB ORU_MINGW_CXX_DIRS /usr/lib/gcc/x86_64-w64-mingw32/*-posix/include/c++)
 list(GET ORU_MINGW_CXX_DIRS -1 ORU_MINGW_CXX_DIR)
+# The GNU run-time library's thread-local variables are emulated ones.
 string(JOIN " " CMAKE_CXX_FLAGS_INIT
-    "--target=x86_64-w64-mingw32 -nostdinc++ -nostdlibinc"
+    "--target=x86_64-w64-mingw32 -femulated-tls -nostdinc++ -nostdlibinc"
     "-isystem ${ORU_MINGW_CXX_DIR}"
     "-isystem ${ORU_MINGW_CXX_DIR}/x86_64-w64-mingw32"
     "-isystem ${ORU_MINGW_CXX_DIR}/backward"
