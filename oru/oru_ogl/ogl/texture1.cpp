@@ -39,9 +39,13 @@ void Texture1::setWrap(WrapMode s) {
     ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_S, static_cast<GLint>(WrapMode2GL(s)));
 }
 
+void Texture1::checkPart(char const *operation, int level, std::uint64_t width) const {
+    internal::CheckPart(operation, level, internal::Side{"width", "width", width, this->width(0)});
+}
+
 void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Type type,
                         void const *data, PixelUnpackParameters const &params) {
-    internal::CheckPart("subimage", level, {{"width", "width", width, this->width(0)}});
+    checkPart("subimage", level, width);
     unsigned int const glFormat = Format2GL(format);
     unsigned int const glType = Type2GL(type);
     internal::WithUnpackState(params, [&] {
@@ -52,7 +56,7 @@ void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Ty
 
 void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Type type,
                         Buffer *buffer, std::size_t offset, PixelUnpackParameters const &params) {
-    internal::CheckPart("subimage", level, {{"width", "width", width, this->width(0)}});
+    checkPart("subimage", level, width);
     internal::CheckUnpackBuffer(buffer, offset);
     unsigned int const glFormat = Format2GL(format);
     unsigned int const glType = Type2GL(type);
@@ -68,7 +72,7 @@ void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Ty
 }
 
 void Texture1::copyTexSubImage(int level, int xOffset, int x, int y, std::uint64_t width) {
-    internal::CheckPart("copySubimage", level, {{"width", "width", width, this->width(0)}});
+    checkPart("copySubimage", level, width);
     ORU_GL(CopyTexSubImage1D, target(), level, xOffset, x, y, static_cast<GLsizei>(width));
 }
 

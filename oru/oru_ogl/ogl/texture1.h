@@ -63,6 +63,9 @@ protected:
     /// @note glTexImage1D
     Texture1(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
              bool mipmapped);
+
+private:
+    void checkPart(char const *operation, int level, std::uint64_t width) const;
 };
 
 /// GL_TEXTURE_1D.

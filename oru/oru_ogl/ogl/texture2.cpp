@@ -73,12 +73,16 @@ void Texture2::setWrap(WrapMode s, WrapMode t) {
     ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_T, static_cast<GLint>(WrapMode2GL(t)));
 }
 
+void Texture2::checkPart(char const *operation, int level, std::uint64_t width,
+                         std::uint64_t height) const {
+    internal::CheckPart(operation, level, internal::Side{"width", "width", width, this->width(0)},
+                        internal::Side{"height", "height", height, this->height(0)});
+}
+
 void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint64_t height,
                         Format format, Type type, void const *data,
                         PixelUnpackParameters const &params) {
-    internal::CheckPart(
-        "subimage", level,
-        {{"width", "width", width, this->width(0)}, {"height", "height", height, this->height(0)}});
+    checkPart("subimage", level, width, height);
     unsigned int const glFormat = Format2GL(format);
     unsigned int const glType = Type2GL(type);
     internal::WithUnpackState(params, [&] {
@@ -90,9 +94,7 @@ void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint6
 void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint64_t height,
                         Format format, Type type, Buffer *buffer, std::size_t offset,
                         PixelUnpackParameters const &params) {
-    internal::CheckPart(
-        "subimage", level,
-        {{"width", "width", width, this->width(0)}, {"height", "height", height, this->height(0)}});
+    checkPart("subimage", level, width, height);
     internal::CheckUnpackBuffer(buffer, offset);
     unsigned int const glFormat = Format2GL(format);
     unsigned int const glType = Type2GL(type);
@@ -108,9 +110,7 @@ void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint6
 
 void Texture2::copyTexSubImage(int level, int xOffset, int yOffset, int x, int y,
                                std::uint64_t width, std::uint64_t height) {
-    internal::CheckPart(
-        "copySubimage", level,
-        {{"width", "width", width, this->width(0)}, {"height", "height", height, this->height(0)}});
+    checkPart("copySubimage", level, width, height);
     ORU_GL(CopyTexSubImage2D, target(), level, xOffset, yOffset, x, y, static_cast<GLsizei>(width),
            static_cast<GLsizei>(height));
 }

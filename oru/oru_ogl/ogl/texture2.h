@@ -80,6 +80,8 @@ protected:
              std::uint64_t height, bool mipmapped, void *clientStorage, Type type);
 
 private:
+    void checkPart(char const *operation, int level, std::uint64_t width,
+                   std::uint64_t height) const;
     void allocate(bool mipmapped, Type type);
 
     void *clientStorage_;

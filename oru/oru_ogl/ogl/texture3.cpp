@@ -70,13 +70,17 @@ void Texture3::setWrap(WrapMode s, WrapMode t, WrapMode r) {
     ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_R, static_cast<GLint>(WrapMode2GL(r)));
 }
 
+void Texture3::checkPart(int level, std::uint64_t width, std::uint64_t height,
+                         std::uint64_t depth) const {
+    internal::CheckPart("subimage", level, internal::Side{"width", "width ", width, this->width(0)},
+                        internal::Side{"height", "height", height, this->height(0)},
+                        internal::Side{"depth", "depth ", depth, this->depth(0)});
+}
+
 void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std::uint64_t height,
                         std::uint64_t depth, Format format, Type type, void const *data,
                         PixelUnpackParameters const &params) {
-    internal::CheckPart("subimage", level,
-                        {{"width", "width ", width, this->width(0)},
-                         {"height", "height", height, this->height(0)},
-                         {"depth", "depth ", depth, this->depth(0)}});
+    checkPart(level, width, height, depth);
     unsigned int const glFormat = Format2GL(format);
     unsigned int const glType = Type2GL(type);
     internal::WithUnpackState(params, [&] {
@@ -88,10 +92,7 @@ void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std
 void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std::uint64_t height,
                         std::uint64_t depth, Format format, Type type, Buffer *buffer,
                         std::size_t offset, PixelUnpackParameters const &params) {
-    internal::CheckPart("subimage", level,
-                        {{"width", "width ", width, this->width(0)},
-                         {"height", "height", height, this->height(0)},
-                         {"depth", "depth ", depth, this->depth(0)}});
+    checkPart(level, width, height, depth);
     internal::CheckUnpackBuffer(buffer, offset);
     unsigned int const glFormat = Format2GL(format);
     unsigned int const glType = Type2GL(type);
@@ -108,9 +109,9 @@ void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std
 
 void Texture3::copyTexSubImage(int level, int xOffset, int yOffset, int zOffset, int x, int y,
                                std::uint64_t width, std::uint64_t height) {
-    internal::CheckPart(
-        "copySubimage", level,
-        {{"width", "width", width, this->width(0)}, {"height", "height", height, this->height(0)}});
+    internal::CheckPart("copySubimage", level,
+                        internal::Side{"width", "width", width, this->width(0)},
+                        internal::Side{"height", "height", height, this->height(0)});
     ORU_GL(CopyTexSubImage3D, target(), level, xOffset, yOffset, zOffset, x, y,
            static_cast<GLsizei>(width), static_cast<GLsizei>(height));
 }

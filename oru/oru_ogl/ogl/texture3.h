@@ -75,6 +75,7 @@ protected:
              Type type, void const *data, PixelUnpackParameters const &params);
 
 private:
+    void checkPart(int level, std::uint64_t width, std::uint64_t height, std::uint64_t depth) const;
     template<class Allocate>
     void initialize(Allocate allocate);
 };

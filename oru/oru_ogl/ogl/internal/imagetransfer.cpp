@@ -1,14 +1,13 @@
 // What the image transfers of all textures share: checks, bindings and client state.
 #include "oru/oru_ogl/ogl/internal/imagetransfer.h"
 
-#include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/composetext.h"
 
 namespace ORU {
 namespace OGL {
 namespace internal {
 
-void CheckPart(char const *operation, int level, std::initializer_list<Side> sides) {
+void ThrowPart(char const *operation, int level, std::initializer_list<Side> sides) {
     for (Side const &side : sides) {
         if (side.size == 0)
             ORU_THROW_INTERNAL(
@@ -21,6 +20,7 @@ void CheckPart(char const *operation, int level, std::initializer_list<Side> sid
             ORU_THROW_INTERNAL(ComposeText(side.name, "(", side.size, ") is greater than ",
                                            side.padded, " of image (", side.limit, ") "));
     }
+    ORU_ASSERT(!"A part that breaks no rule.");
 }
 
 void CheckBuffer(Buffer const *buffer) {

@@ -1,6 +1,7 @@
 // What the image transfers of all textures share: checks, bindings and client state.
 #pragma once
 
+#include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/internal/ending.h"
@@ -23,9 +24,19 @@ struct Side {
     std::uint64_t limit; ///< the same side of the texture's level 0
 };
 
+/// Throws the InternalException of the first rule that a part breaks; see `CheckPart`.
+[[noreturn]] ORU_COLD void ThrowPart(char const *operation, int level,
+                                     std::initializer_list<Side> sides);
+
 /// @param operation "subimage" or "copySubimage", for the messages
 /// @throws InternalException for an empty side, a negative level or a side over its limit
-void CheckPart(char const *operation, int level, std::initializer_list<Side> sides);
+template<class... Sides>
+void CheckPart(char const *operation, int level, Sides const &...sides) {
+    // An empty side wraps around and so is over its limit, too.
+    bool const fits = ((sides.size - 1 < sides.limit) && ...);
+    if (!fits || level < 0)
+        ThrowPart(operation, level, {sides...});
+}
 
 /// @throws InternalException unless a transfer can use the buffer: there is one, and not mapped
 void CheckBuffer(Buffer const *buffer);
