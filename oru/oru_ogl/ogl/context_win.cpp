@@ -15,7 +15,7 @@
 #include <dxgi.h>
 #include <wrl/client.h>
 
-#include <cstring>
+#include <climits>
 #include <vector>
 
 namespace ORU {
@@ -130,10 +130,12 @@ std::string WindowOutputName(HWND theWindow) {
 
     ComPtr<IDXGISwapChain> swapChain;
     ComPtr<ID3D11Device> d3dDevice;
-    ORU_ASSERT_SUCCEEDED(D3D11CreateDeviceAndSwapChain(
-        nullptr, D3D_DRIVER_TYPE_HARDWARE, nullptr, 0x0, nullptr, 0, D3D11_SDK_VERSION,
-        &swapChainDesc, swapChain.ReleaseAndGetAddressOf(), d3dDevice.ReleaseAndGetAddressOf(),
-        nullptr, nullptr));
+    // The call's own text is the message, where a line break after a parenthesis would be a blank.
+    // clang-format off
+    ORU_ASSERT_SUCCEEDED(D3D11CreateDeviceAndSwapChain(nullptr, D3D_DRIVER_TYPE_HARDWARE, nullptr,
+        0x0, nullptr, 0, D3D11_SDK_VERSION, &swapChainDesc, swapChain.ReleaseAndGetAddressOf(),
+        d3dDevice.ReleaseAndGetAddressOf(), nullptr, nullptr));
+    // clang-format on
     ComPtr<IDXGIOutput> primaryOutput;
     ORU_ASSERT_SUCCEEDED(swapChain->GetContainingOutput(&primaryOutput));
     DXGI_OUTPUT_DESC outputDesc;
@@ -322,6 +324,12 @@ void Context::initialize(HDC dc, BufferFormat const &format, Buffering buffering
             ORU_THROW_INTERNAL("ContextWindowed::ContextWindowed failed to destroy context: "
                                "fatal exception!");
         throw LogicalException(failure);
+    } catch (...) {
+        // Not a failure of the layer, memory running out say: it passes as it is.
+        if (renderContext_)
+            ORU_WGL(DeleteContext, renderContext_);
+        renderContext_ = nullptr;
+        throw;
     }
 }
 
