@@ -180,8 +180,8 @@ void ExtensionManager::readExtensions() {
 
 void ExtensionManager::readWGLExtensions() {
     InitializeWGLExtension(WGL_ARB_EXTENSIONS_STRING);
-    if (_wcgmGetExtensionsStringARB) {
-        char const *const text = _wcgmGetExtensionsStringARB(ORU_WGL0(GetCurrentDC));
+    if (auto const stored = _wcgmGetExtensionsStringARB) {
+        char const *const text = stored(ORU_WGL0(GetCurrentDC));
         std::vector<std::string> tokens;
         TokenizeExtensionString(text ? text : "", tokens);
         for (std::string const &token : tokens)

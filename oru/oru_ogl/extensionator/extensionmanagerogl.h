@@ -91,6 +91,7 @@ public:
 
     /// The record of a rendering context, made when it has none.
     /// @param rc the calling thread's current context
+    /// @throws InternalException as `CurrentTable`
     static ExtensionManager *InstanceGuaranteed(HGLRC const &rc);
 
     /// The function table of the calling thread's current context, whose record is made when it has
@@ -104,8 +105,10 @@ public:
 
     /// Maps a context of the library to its device's record, building the record when it is the
     /// device's first. A context that is mapped already stays so.
+    /// @throws InternalException when the record cannot be built
     static void RegisterContext(Context const &context);
 
+    /// Ends the mapping of a context.
     /// @throws InternalException when the context is not registered
     static void UnRegisterContext(Context const &context);
     /// @}
@@ -113,12 +116,16 @@ public:
     /// @name Records of display devices
     /// @{
 
-    /// The record of a display device, built when it does not exist yet.
+    /// The record of a display device, built when it does not exist yet; the calling thread's
+    /// current context is the same afterwards.
+    /// @throws InternalException when there is no such adapter, or when its context does not even
+    ///         tell its version
     static ExtensionManager *Instance(DisplayDeviceKey const &key);
 
     /// The record of a context's display device, built when it does not exist yet.
     /// @return for a null context null
-    /// @throws InternalException for a null context while the library is not initialized
+    /// @throws InternalException for a null context while the library is not initialized, and as
+    ///         above
     static ExtensionManager *Instance(Context const *context);
 
     /// Forgets all contexts and destroys the records of all display devices.
@@ -192,6 +199,7 @@ public:
     bool initializeGL(OpenGLExtension e);
 
     /// Adds a GL or WGL capability to the supported ones when its entry points can be loaded.
+    /// @return whether it is supported now
     bool initialize(OpenGLExtension e);
 
     /// The entry points.

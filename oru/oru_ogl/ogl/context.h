@@ -43,7 +43,7 @@ public:
     /// @note wglMakeCurrent
     virtual void makeCurrent() const;
 
-    /// The calling thread's current rendering context, or null.
+    /// The calling thread's current rendering context, or null. @note wglGetCurrentContext
     static HGLRC CurrentContext();
 
     HGLRC renderContext() const { return renderContext_; }
@@ -68,6 +68,7 @@ public:
     OpenGLProfile openGLProfile() const { return initOptions_.openGLProfile(); }
 
     /// Whether the current context can wait for the vertical retrace (WGL_EXT_swap_control).
+    /// @throws InternalException when it has no record and the library is not initialized
     static bool SupportsVerticalRetraceControl();
 
     /// @name Display devices
@@ -98,32 +99,52 @@ protected:
     void initialize(HDC dc, BufferFormat const &format, Buffering buffering,
                     Multisampling multisampling, Context const *share);
 
-    /// A pixel format by GDI. @throws InternalException when there is none
+    /// A pixel format by GDI, of integer channels and one sample.
+    /// @throws InternalException for a null device context, or when there is no such format
+    /// @note ChoosePixelFormat
     static int ChoosePixelFormat(HDC dc, BufferFormat const &format, bool doubleBuffered);
 
-    /// A pixel format by wglChoosePixelFormatARB, for which a context must be current.
-    /// @throws InternalException without that function or a suitable format
+    /// A pixel format by wglChoosePixelFormatARB (WGL_ARB_pixel_format; with more than one sample
+    /// WGL_ARB_multisample), for which a context must be current.
+    /// @throws InternalException without that function, for a null device context, for several
+    ///         samples without double buffering, or when there is no such format
     static int ChoosePixelFormat(HDC dc, BufferFormat const &format, Buffering buffering,
                                  Multisampling multisampling, Windowing windowing);
 
+    /// Sets a device context's pixel format, which the system allows once for a window.
+    /// @throws InternalException for an index below 1 or one that the system refuses
+    /// @note SetPixelFormat
     void setPixelFormat(HDC dc, int pixelFormat);
+
+    /// Chooses a pixel format by GDI, sets it and makes a rendering context.
+    /// @throws InternalException when one of these steps fails
     HGLRC setupRenderingContext(HDC dc, BufferFormat const &format, bool doubleBuffered,
                                 Context const *share);
 
     /// A rendering context that shares with `share`; of version 3.0 or later where attributes can
     /// be asked for.
+    /// @throws InternalException for a null device context, or when the context cannot be made or
+    ///         cannot share
+    /// @note wglCreateContextAttribsARB (WGL_ARB_create_context) or wglCreateContext, wglShareLists
     HGLRC createRenderingContext(HDC dc, Context const *share);
 
-    /// Shares this context's objects with another rendering context, from which they come.
+    /// Makes this context use another rendering context's objects.
+    /// @throws InternalException when the system refuses
+    /// @note wglShareLists
     void shareLists(HGLRC other);
 
     /// Registers the new context and puts it into `share`'s group (or one of its own); destroys
     /// the rendering context when that fails.
+    /// @throws InternalException when `share` is in no group
     void publish(Context const *share);
 
     /// Deletes the rendering context; another context that was current is current again.
+    /// @throws InternalException when the system refuses
+    /// @note wglMakeCurrent, wglDeleteContext
     void destroyContext();
 
+    /// Maps the rendering context to its device's record, or ends that; nothing without one.
+    /// @throws InternalException when the record cannot be built, or when there is nothing to end
     void registerWithExtensionMgr();
     void unregisterWithExtensionMgr();
     ExtensionManager::InitOptions const &initOptions() const { return initOptions_; }
@@ -133,19 +154,27 @@ protected:
     /// @{
 
     /// Joins a sibling's group, or makes a new one when it is null.
+    /// @throws InternalException when the sibling is this context or in no group
     void addShareContext(Context const *sibling) const;
     void registerSharedContext(Context const *sibling);
     void unregisterSharedContext();
 
     /// Finds the group of an adopted context by trying whether display lists are shared.
+    /// @note glGenLists, glIsList, glDeleteLists, not through the chain
     static void RegisterContextWrapped(Context const *context);
+
+    /// Leaves its group; nothing for a context in none.
     static void UnregisterShareContext(Context const *context);
     /// @}
 
     /// The key of the output that shows a window, and of its adapter.
+    /// @throws InternalException for no window, or when the system does not tell
+    /// @note a Direct3D 11 swap chain on the window, which goes at once
     static DisplayDeviceKey DisplayDeviceFromWindow(HWND const &window);
 
-    /// The key of the output at the desktop's origin, found out once.
+    /// The key of the output at the desktop's origin, found out once. The first call must not
+    /// overlap another.
+    /// @throws InternalException when there is none
     static DisplayDeviceKey const &PrimaryDisplayDevice();
 
     /// The desktop position of the first output of the adapter with this description.

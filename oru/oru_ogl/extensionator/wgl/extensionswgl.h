@@ -17,9 +17,8 @@ namespace OGL {
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl_pointers.inc"
 
 /// Loads the entry points of a WGL extension from the current context.
-/// @return whether `extension` is a WGL extension and every one of its entry points was found;
-/// those
-///         that were found are stored in any case. True for one without entry points.
+/// @return whether it is a WGL extension and all of its entry points were found (of some it has
+///         none); those found are stored in any case
 /// @note wglGetProcAddress through the WGL chain
 ORU_API bool InitializeWGLExtension(OpenGLExtension extension);
 
