@@ -3,43 +3,63 @@
 
 #include "apps/common/image.h"
 #include "apps/develop/pass.h"
+#include "apps/develop/sharpener.h"
+#include "apps/develop/spotpainter.h"
 
 #include "oru/oru_ogl/ogl/texture2.h"
 
 #include <memory>
+#include <vector>
 
 namespace Develop {
 
 /// What is done to a picture.
 struct Recipe {
     double exposure = 0; ///< stops
+    Sharpening sharpening;
+    std::vector<Spot> spots;
 };
 
-/// Upload a picture, develop it, read it back:
+/// Takes a picture, or the part of it that is to be developed, through the stages, one after the
+/// other:
 ///
-///     developer.upload(photo);
+///     developer.upload(photo, Frame(photo.width, photo.height), recipe);
+///     developer.sharpen(recipe);
 ///     developer.develop(recipe);
 ///     Image const result = developer.readBack();
 ///
-/// Works on the context that was current when it was made.
+/// The GPU may still be at work when a stage returns. Works on the context that was current when it
+/// was made.
 class Developer {
 public:
-    Developer();
+    /// @param sharpener how to sharpen; null when no recipe will ask for it
+    explicit Developer(std::unique_ptr<Sharpener> sharpener);
 
-    /// Takes a picture to the GPU.
-    void upload(App::Image const &photo);
+    /// Takes as much of a picture to the GPU as developing an area needs.
+    /// @param area not empty, within the picture
+    void upload(App::Image const &photo, ORU::IntegerRect const &area, Recipe const &recipe);
 
-    /// Computes the developed picture from the uploaded one. The GPU may still be at work
-    /// afterwards.
+    /// Decodes to linear light and sharpens, if the recipe asks for it.
+    void sharpen(Recipe const &recipe);
+
+    /// Computes the area's developed pixels.
     void develop(Recipe const &recipe);
 
-    /// The developed picture, of the same kind as the uploaded one.
+    /// The developed area, of the same kind as the picture.
     App::Image readBack();
 
 private:
-    Pass pass_;
-    App::Shape shape_;
+    std::unique_ptr<Sharpener> sharpener_;
+    CoverPass decode_;
+    CoverPass encode_;
+    CoverPass decodeAndEncode_;
+    SpotPainter spotPainter_;
+
+    App::Shape shape_;        ///< of the area
+    ORU::IntegerRect area_;   ///< in the picture
+    ORU::IntegerRect source_; ///< the uploaded part of the picture
     std::unique_ptr<ORU::OGL::Texture2D> photo_;
+    std::unique_ptr<ORU::OGL::Texture2D> light_; ///< sharpened; null without sharpening
     std::unique_ptr<ORU::OGL::Texture2D> developed_;
 };
 

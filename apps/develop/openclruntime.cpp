@@ -1,27 +1,36 @@
-// The OpenCL runtime of this machine, if it has one.
+// The OpenCL runtime of this machine, if it has one, and its devices.
 #include "apps/develop/openclruntime.h"
 
-#include "oru/core/exceptions/logicalexception.h"
+#include "oru/oru_ocl/exceptionocl.h"
 #include "oru/oru_ocl/ocllibrary.h"
-#include "oru/oru_ocl/platform.h"
+
+#include <exception>
 
 namespace Develop {
 
 namespace OCL = ORU::OCL;
 
-OpenCLRuntime::OpenCLRuntime() {
-    if (!OCL::Library::IsOpenCLAvailable(std::string()))
+namespace {
+
+/// The layer takes a directory only with the separator at its end.
+std::string Directory(std::string const &folder) {
+    bool const complete = folder.empty() || folder.back() == '/' || folder.back() == '\\';
+    return complete ? folder : folder + "\\";
+}
+
+} // namespace
+
+OpenCLRuntime::OpenCLRuntime(std::string const &folder) {
+    if (!OCL::Library::IsOpenCLAvailable(Directory(folder)))
         return;
     try {
         library_ = std::make_unique<OCL::AutoInitializer>();
-    } catch (ORU::LogicalException const &) {
+    } catch (std::exception const &) {
         // A runtime that cannot be used is as good as none.
     }
 }
 
 OpenCLRuntime::~OpenCLRuntime() = default;
-OpenCLRuntime::OpenCLRuntime(OpenCLRuntime &&) noexcept = default;
-OpenCLRuntime &OpenCLRuntime::operator=(OpenCLRuntime &&) noexcept = default;
 
 std::string OpenCLRuntime::description() const {
     if (!isAvailable())
@@ -30,6 +39,26 @@ std::string OpenCLRuntime::description() const {
     for (OCL::Platform const &platform : OCL::platforms())
         names += (names.empty() ? "OpenCL by " : ", ") + platform.name();
     return names;
+}
+
+std::vector<OpenCLDevice> OpenCLRuntime::devices() const {
+    std::vector<OpenCLDevice> found;
+    if (!isAvailable())
+        return found;
+    std::vector<OCL::Platform> const platforms = OCL::platforms();
+    for (std::size_t p = 0; p < platforms.size(); ++p) {
+        std::vector<OCL::Device> devices;
+        try {
+            devices = platforms[p].devices(OCL::Device::TYPE_ALL);
+        } catch (OCL::ExceptionOCL const &) {
+            // A platform without devices.
+        }
+        for (std::size_t d = 0; d < devices.size(); ++d)
+            found.push_back({platforms[p], devices[d],
+                             std::to_string(p) + "." + std::to_string(d) + " " + devices[d].name() +
+                                 " (" + platforms[p].name() + ")"});
+    }
+    return found;
 }
 
 } // namespace Develop

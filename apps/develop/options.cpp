@@ -3,7 +3,7 @@
 
 #include <CLI/CLI.hpp>
 
-#include <cmath>
+#include <sstream>
 
 namespace Develop {
 
@@ -11,12 +11,17 @@ namespace {
 
 constexpr int cUsageError = 2;
 
-CLI::Validator Finite() {
+/// A check that a number lies between two others. (CLI::Range lets through what is no number.)
+CLI::Validator Between(double least, double most) {
     return CLI::Validator(
-        [](std::string const &text) {
+        [=](std::string const &text) {
             double value = 0;
-            bool const finite = CLI::detail::lexical_cast(text, value) && std::isfinite(value);
-            return finite ? std::string() : "'" + text + "' is not a number";
+            bool const good =
+                CLI::detail::lexical_cast(text, value) && value >= least && value <= most;
+            std::ostringstream complaint;
+            if (!good)
+                complaint << "'" << text << "' is not a number from " << least << " to " << most;
+            return complaint.str();
         },
         std::string());
 }
@@ -29,12 +34,37 @@ void Describe(CLI::App &app, Options &options) {
         ->option_text("...");
     app.add_option("--exposure", options.exposure, "Brighten by EV stops; negative darkens")
         ->type_name("EV")
-        ->check(Finite());
+        ->check(Between(-100, 100));
+    auto *const sharpen = app.add_option("--sharpen", options.sharpening.amount,
+                                         "Sharpen by an unsharp mask of this strength, 0 to 100")
+                              ->type_name("AMOUNT")
+                              ->check(Between(0, 100));
+    app.add_option("--radius", options.sharpening.sigma,
+                   "Standard deviation of its blur in pixels, 0.3 to 20")
+        ->type_name("SIGMA")
+        ->check(Between(0.3, 20))
+        ->needs(sharpen)
+        ->capture_default_str();
+    app.add_option("--device", options.device,
+                   "Sharpen on this OpenCL device: its numbers as in 0.1 or a part of its name;\n"
+                   "none for OpenGL alone")
+        ->type_name("DEVICE");
+    app.add_option("--opencl", options.openCLFolder, "Folder of the OpenCL.dll to use")
+        ->type_name("DIR");
+    auto *const spots =
+        app.add_option("--spots", options.spots,
+                       "Local edits: a file with centre x, centre y, radius and EV in each line")
+            ->type_name("FILE");
+    app.add_option("--base", options.base,
+                   "The picture developed without the spots; only they are then computed")
+        ->type_name("PICTURE")
+        ->needs(spots);
     app.add_option("--output", options.output, "Folder for the developed PNG pictures")
         ->type_name("DIR")
         ->capture_default_str();
     app.add_option("--trace", options.trace, "Write every OpenGL call to a file")
         ->type_name("FILE");
+    app.add_flag("--report", options.report, "Tell how each picture was made, and the times");
     app.add_flag("--quiet", options.quiet, "Print problems only");
     app.footer("Exit code: 0 when every picture was developed, 1 when one was not, 2 when the\n"
                "command line is wrong.");

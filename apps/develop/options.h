@@ -1,6 +1,8 @@
 // What the command line of develop asks for.
 #pragma once
 
+#include "apps/develop/sharpener.h"
+
 #include <optional>
 #include <string>
 #include <vector>
@@ -11,7 +13,13 @@ struct Options {
     std::vector<std::string> inputs; ///< pictures and folders, UTF-8
     std::string output = "out";      ///< folder of the developed pictures
     double exposure = 0;             ///< stops
-    std::string trace;               ///< file for the OpenGL calls, or empty
+    Sharpening sharpening;
+    std::string openCLFolder; ///< where OpenCL.dll lies; empty for the system's folder
+    std::string device;       ///< OpenCL device to sharpen on, see ChooseSharpener
+    std::string spots;        ///< file of local edits, or empty
+    std::string base;         ///< the picture developed without the spots, or empty
+    bool report = false;      ///< whether to print how each picture was made
+    std::string trace;        ///< file for the OpenGL calls, or empty
     bool quiet = false;
 };
 

@@ -1,4 +1,4 @@
-// A fragment shader run over every pixel of a texture.
+// A fragment shader run over the pixels of a texture.
 #include "apps/develop/pass.h"
 
 #include "apps/common/failure.h"
@@ -6,6 +6,7 @@
 
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/ogl/texture2.h"
+#include "oru/oru_ogl/platformgl.h"
 
 namespace Develop {
 
@@ -13,41 +14,45 @@ using namespace ORU::OGL;
 
 namespace {
 
-constexpr unsigned int cVertices = 3;
-
-/// One triangle that covers everything: no diagonal, along which pixels would be computed twice.
+/// One triangle that covers everything.
 VertexBuffer MakeCover() {
-    static constexpr float sCorners[cVertices][2] = {{-1, -1}, {3, -1}, {-1, 3}};
+    static constexpr float sCorners[3][2] = {{-1, -1}, {3, -1}, {-1, 3}};
     VertexBuffer cover(
         {{"position", VertexBuffer::ATTRIBUTETYPE_FLOAT2, VertexBuffer::EXPECTEDUSAGE_STATIC_DRAW}},
-        cVertices, VertexBuffer::PRIMITIVETYPE_TRIANGLES);
+        3, VertexBuffer::PRIMITIVETYPE_TRIANGLES);
     cover.setField("position", reinterpret_cast<unsigned char const *>(sCorners), false, 0, 0);
     return cover;
 }
 
 } // namespace
 
-Pass::Pass(std::string const &fragmentShader) : cover_(MakeCover()) {
+Pass::Pass(std::string const &vertexShader, std::string const &fragmentShader) {
     std::string const language = ShadingLanguageLine();
-    char const *const vertex[] = {language.c_str(), cCoverVertexShader};
+    char const *const vertex[] = {language.c_str(), vertexShader.c_str()};
     char const *const fragment[] = {language.c_str(), fragmentShader.c_str()};
     program_.loadVertexShader(2, vertex, nullptr);
     program_.loadFragmentShader(2, fragment, nullptr);
     program_.link(true);
-    cover_.setupWithProgram(&program_);
-    cover_.marshallData();
 }
 
-void Pass::draw(Texture2D &target) {
+void Pass::draw(Texture2D &target, VertexBuffer &vertices, bool cleared) {
     framebuffer_.bind();
     framebuffer_.attach(&target, 0, 0);
     if (!framebuffer_.statusOkay(nullptr))
         throw App::Failure("this OpenGL cannot draw into such a picture");
     ORU_GL(Viewport, 0, 0, static_cast<GLsizei>(target.width(0)),
            static_cast<GLsizei>(target.height(0)));
-    cover_.drawPrimitives();
+    if (cleared)
+        ORU_GL(Clear, GL_COLOR_BUFFER_BIT);
+    vertices.drawPrimitives();
     framebuffer_.detach(&target, 0);
     framebuffer_.unbind();
+}
+
+CoverPass::CoverPass(std::string const &fragmentShader)
+    : Pass(cCoverVertexShader, fragmentShader), cover_(MakeCover()) {
+    cover_.setupWithProgram(&program());
+    cover_.marshallData();
 }
 
 } // namespace Develop

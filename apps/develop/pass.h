@@ -1,4 +1,4 @@
-// A fragment shader run over every pixel of a texture.
+// A fragment shader run over the pixels of a texture.
 #pragma once
 
 #include "oru/oru_ogl/ogl/framebuffer.h"
@@ -15,22 +15,35 @@ class Texture2D;
 
 namespace Develop {
 
-/// Compiles once; then, for each target: enable `program()`, set its uniforms, bind the textures
-/// that it reads, and draw.
+/// A program and the framebuffer through which it draws into textures.
 class Pass {
 public:
-    /// @throws ORU::InternalException with the log when the shader does not compile
-    explicit Pass(std::string const &fragmentShader);
+    /// @throws ORU::InternalException with the log when a shader does not compile
+    Pass(std::string const &vertexShader, std::string const &fragmentShader);
 
+    /// To be enabled, and its uniforms set, before drawing.
     ORU::OGL::Program &program() { return program_; }
 
-    /// Computes every pixel of a texture, which must not be bound.
-    void draw(ORU::OGL::Texture2D &target);
+    /// Draws vertices, set up with the program, into a texture, which must not be bound.
+    /// @param cleared whether the texture is to be zero before
+    /// @throws Failure when this OpenGL cannot draw into such a texture
+    void draw(ORU::OGL::Texture2D &target, ORU::OGL::VertexBuffer &vertices, bool cleared);
 
 private:
     ORU::OGL::Program program_;
-    ORU::OGL::VertexBuffer cover_;
     ORU::OGL::Framebuffer framebuffer_;
+};
+
+/// A pass over every pixel.
+class CoverPass : public Pass {
+public:
+    explicit CoverPass(std::string const &fragmentShader);
+
+    /// Computes every pixel of a texture, which must not be bound.
+    void draw(ORU::OGL::Texture2D &target) { Pass::draw(target, cover_, false); }
+
+private:
+    ORU::OGL::VertexBuffer cover_;
 };
 
 } // namespace Develop

@@ -64,11 +64,14 @@ std::string Photo::name() const {
 }
 
 std::vector<Photo> ListPhotos(std::vector<std::string> const &inputs, fs::path const &outputFolder,
+                              std::vector<std::string> const &alsoRead,
                               ProblemHandler const &onProblem) {
     std::vector<fs::path> const files = ListFiles(inputs, onProblem);
     std::set<std::string> inputFiles;
     for (fs::path const &file : files)
         inputFiles.insert(Identity(file));
+    for (std::string const &file : alsoRead)
+        inputFiles.insert(Identity(App::ToPath(file)));
 
     std::vector<Photo> photos;
     std::map<std::string, std::string> writers; // by output

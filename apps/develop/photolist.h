@@ -21,8 +21,10 @@ using ProblemHandler = std::function<void(std::string const &name, std::string c
 /// The pictures of a command line: files as they come, folders as their PNG and JPEG files in the
 /// order of their names. A picture whose output another one writes already, or whose output would
 /// replace one of the inputs, is a problem and left out.
+/// @param alsoRead further files that no output may replace
 std::vector<Photo> ListPhotos(std::vector<std::string> const &inputs,
                               std::filesystem::path const &outputFolder,
+                              std::vector<std::string> const &alsoRead,
                               ProblemHandler const &onProblem);
 
 } // namespace Develop

@@ -1,17 +1,43 @@
 // The GLSL programs of develop.
 #pragma once
 
+#include <array>
+#include <cstddef>
 #include <string>
+
+namespace ORU {
+namespace OGL {
+class Program;
+} // namespace OGL
+} // namespace ORU
 
 namespace Develop {
 
-/// The vertex shader of every pass: its attribute `position` covers the target.
+/// Vertices whose attribute `position` is in clip coordinates.
 extern char const *const cCoverVertexShader;
 
-/// sRGB to linear light, times 2^exposure, clamped, and back to sRGB.
-extern char const *const cDevelopShader;
+/// What a developing pass does.
+enum class Steps { Decode, Encode, DecodeAndEncode };
+
+/// From sRGB to linear light, and from there, brightened and clamped, to sRGB.
+std::string DevelopShader(Steps steps);
+
+/// Unsharp mask, first and second pass.
+extern char const *const cBlurRowsShader;
+extern char const *const cSharpenColumnsShader;
+
+/// The exposure that a spot adds at each pixel.
+extern char const *const cSpotVertexShader;
+extern char const *const cSpotShader;
 
 /// The first line of a shader for the current context.
 std::string ShadingLanguageLine();
+
+/// 1 for the channels of a texel that hold colours, 0 for alpha.
+/// @param channels of the picture
+std::array<float, 4> ColourMask(std::size_t channels);
+
+/// Sets the uniform `colours` of the current program to the mask.
+void SetColourMask(ORU::OGL::Program &program, std::size_t channels);
 
 } // namespace Develop

@@ -23,12 +23,6 @@ std::wstring Quoted(fs::path const &argument) {
     return L"\"" + argument.wstring() + L"\"";
 }
 
-fs::path ProgramFolder() {
-    wchar_t path[MAX_PATH];
-    ::GetModuleFileNameW(nullptr, path, MAX_PATH);
-    return fs::path(path).parent_path();
-}
-
 /// A file that a child process may write to.
 class CaptureFile {
 public:
@@ -60,6 +54,12 @@ std::vector<std::string> Outcome::errorLines() const {
     for (std::string line; std::getline(text, line);)
         lines.push_back(line);
     return lines;
+}
+
+fs::path ProgramFolder() {
+    wchar_t path[MAX_PATH];
+    ::GetModuleFileNameW(nullptr, path, MAX_PATH);
+    return fs::path(path).parent_path();
 }
 
 Outcome RunProgram(std::string const &name, std::vector<std::string> const &arguments,

@@ -16,6 +16,9 @@ struct Outcome {
     std::vector<std::string> errorLines() const;
 };
 
+/// The folder of the test and of what is built beside it.
+std::filesystem::path ProgramFolder();
+
 /// Runs a program that stands beside the test.
 /// @param arguments UTF-8
 /// @param folder its current folder

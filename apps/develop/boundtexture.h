@@ -1,0 +1,34 @@
+// A texture bound to a unit for a scope.
+#pragma once
+
+#include "oru/oru_ogl/ogl/texture2.h"
+#include "oru/oru_ogl/ogl/texturestate.h"
+#include "oru/oru_ogl/ogl/textureunit.h"
+
+namespace Develop {
+
+/// Binds a 2-D texture to a unit, which stays active; at the end the unit has none and unit 0 is
+/// active.
+class BoundTexture {
+public:
+    explicit BoundTexture(ORU::OGL::Texture2D const &texture, unsigned int unit = 0) : unit_(unit) {
+        ORU::OGL::TextureState::SetActiveTextureUnit(unit_);
+        ORU::OGL::TextureUnit::Unit(unit_)->bind(&texture);
+    }
+    ~BoundTexture() {
+        try {
+            ORU::OGL::TextureState::SetActiveTextureUnit(unit_);
+            ORU::OGL::TextureUnit::Unit(unit_)->bind2DDefault();
+            ORU::OGL::TextureState::SetActiveTextureUnit(0);
+        } catch (...) {
+            // An error of an earlier call is reported by the exception that ended the scope.
+        }
+    }
+    BoundTexture(BoundTexture const &) = delete;
+    BoundTexture &operator=(BoundTexture const &) = delete;
+
+private:
+    unsigned int unit_;
+};
+
+} // namespace Develop

@@ -1,0 +1,39 @@
+// Local edits: round spots of more or less exposure.
+#pragma once
+
+#include "oru/core/math/region_2d/boundingregion.h"
+#include "oru/core/utility/integerrect.h"
+
+#include <cstddef>
+#include <filesystem>
+#include <vector>
+
+namespace Develop {
+
+/// Adds stops × (1 − smoothstep(0, radius, d)) to the exposure of a pixel whose centre is d pixels
+/// from the spot's centre. (0, 0) is the upper left corner of the picture.
+struct Spot {
+    double x = 0;
+    double y = 0;
+    double radius = 0;
+    double stops = 0;
+
+    bool changesSomething() const { return radius > 0 && stops != 0; }
+};
+
+/// Reads a text file with a spot on each line: centre x, centre y, radius, stops. A `#` begins a
+/// comment.
+/// @throws Failure, with the line's number when a line is malformed
+std::vector<Spot> ReadSpots(std::filesystem::path const &path);
+
+/// Where spots can change a picture.
+ORU::BoundingRegion RegionOf(std::vector<Spot> const &spots);
+
+/// The whole of a picture.
+ORU::IntegerRect Frame(std::size_t width, std::size_t height);
+
+/// The pixels of a frame within `reach` pixels of a region.
+ORU::IntegerRect PixelsAround(ORU::BoundingRegion region, std::size_t reach,
+                              ORU::IntegerRect const &frame);
+
+} // namespace Develop
