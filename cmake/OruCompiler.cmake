@@ -14,6 +14,10 @@ add_compile_definitions(NOMINMAX WIN32_LEAN_AND_MEAN UNICODE _UNICODE _WIN32_WIN
 
 if(MSVC)
     add_compile_options(/W4 /permissive- /utf-8 /bigobj /Zc:__cplusplus)
+    # 4251, 4275: the standard library's classes in exported ones, which library and host compile alike.
+    # 4324: padding that an alignas asks for.
+    add_compile_options(/wd4251 /wd4275 /wd4324)
+    add_compile_definitions(_CRT_SECURE_NO_WARNINGS) # std::getenv
     if(ORU_WARNINGS_AS_ERRORS)
         add_compile_options(/WX)
     endif()
