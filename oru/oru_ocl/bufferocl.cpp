@@ -10,22 +10,22 @@ Buffer::Buffer(Context const &context, MemoryAccessFlags access, std::size_t siz
     if (!host)
         ORU_THROW_INTERNAL("NULL host memory pointer passed to Buffer constructor.");
     cl_mem_flags const flags = AccessFlags(access) | CL_MEM_USE_HOST_PTR;
-    adopt(ORU_CL(CreateBuffer)(context.id(), flags, size, host));
+    adopt(ORU_CL(CreateBuffer, context.id(), flags, size, host));
 }
 
 Buffer::Buffer(Context const &context, MemoryAccessFlags access, bool allocHost, std::size_t size)
     : Memory(
-          ORU_CL(CreateBuffer)(context.id(), AllocationFlags(access, allocHost), size, nullptr)) {}
+          ORU_CL(CreateBuffer, context.id(), AllocationFlags(access, allocHost), size, nullptr)) {}
 
 Buffer::Buffer(Context const &context, MemoryAccessFlags access, bool allocHost, std::size_t size,
                void *host) {
     if (!host)
         ORU_THROW_INTERNAL("Must allocate host memory passed to Buffer constructor.");
     cl_mem_flags const flags = AllocationFlags(access, allocHost) | CL_MEM_COPY_HOST_PTR;
-    adopt(ORU_CL(CreateBuffer)(context.id(), flags, size, host));
+    adopt(ORU_CL(CreateBuffer, context.id(), flags, size, host));
 }
 
 Buffer::Buffer(Context const &context, MemoryAccessFlags access, OGL::Buffer &buffer)
-    : Memory(ORU_CL(CreateFromGLBuffer)(context.id(), AccessFlags(access), buffer.objectID())) {}
+    : Memory(ORU_CL(CreateFromGLBuffer, context.id(), AccessFlags(access), buffer.objectID())) {}
 
 } // namespace ORU::OCL

@@ -3,7 +3,10 @@
 
 #include "oru/oru_ocl/extensionmanagerocl.h"
 
+#include <cstddef>
+#include <tuple>
 #include <type_traits>
+#include <utility>
 
 namespace ORU::OCL {
 
@@ -18,20 +21,29 @@ inline FunctionTable const &Table() {
 /// Throws `ExceptionOCL` with an empty message.
 [[noreturn]] ORU_API ORU_COLD void ThrowOCL(char const *file, unsigned int line, cl_int code);
 
-/// One entry point at one place of the source; what `ORU_CL` makes.
-template<class Function>
-struct CheckedCall {
-    Function function;
+/// Whether an entry point reports its error through a last argument instead of its result.
+template<class Result, class... Parameters>
+constexpr bool ReportsByArgument =
+    !std::is_same_v<Result, cl_int> &&
+    std::is_same_v<std::tuple_element_t<sizeof...(Parameters), std::tuple<int, Parameters...>>,
+                   cl_int *>;
+
+/// One entry point at one place of the source, called with the parameters of `Indices`.
+template<class Function, class Indices>
+struct CheckedCall;
+
+template<class Result, class... Parameters, std::size_t... Indices>
+struct CheckedCall<Result(CL_API_CALL *)(Parameters...), std::index_sequence<Indices...>> {
+    Result(CL_API_CALL *function)(Parameters...);
     char const *file;
     unsigned int line;
 
-    /// Calls the entry point. One that reports its error through a last argument is called without
-    /// that argument and its result returned; of the others the result is the error.
-    template<class... Arguments>
-    auto operator()(Arguments... arguments) const {
-        if constexpr (std::is_invocable_v<Function, Arguments..., cl_int *>) {
+    /// Calls the entry point; without its last argument and for its result when that argument
+    /// reports the error, for nothing when the result is the error.
+    auto operator()(std::tuple_element_t<Indices, std::tuple<Parameters...>>... arguments) const {
+        if constexpr (sizeof...(Indices) < sizeof...(Parameters)) {
             cl_int error = CL_SUCCESS;
-            auto const result = function(arguments..., &error);
+            Result const result = function(arguments..., &error);
             check(error);
             return result;
         } else {
@@ -46,16 +58,20 @@ private:
     }
 };
 
-template<class Function>
-CheckedCall(Function, char const *, unsigned int) -> CheckedCall<Function>;
+/// The call of an entry point, for `ORU_CL`.
+template<class Result, class... Parameters>
+auto MakeCheckedCall(Result(CL_API_CALL *function)(Parameters...), char const *file,
+                     unsigned int line) {
+    constexpr std::size_t count =
+        sizeof...(Parameters) - (ReportsByArgument<Result, Parameters...> ? 1 : 0);
+    return CheckedCall<decltype(function), std::make_index_sequence<count>>{function, file, line};
+}
 
 } // namespace ORU::OCL
 
-/// `ORU_CL(CreateBuffer)(context, flags, size, host)` calls clCreateBuffer of the function table,
+/// `ORU_CL(CreateBuffer, context, flags, size, host)` calls clCreateBuffer of the function table,
 /// which must have it: the entry points of OpenCL 1.0 always, others where `table()` shows them.
 /// Throws InternalException "table_ != 0" before the call, ExceptionOCL with this source position
 /// when it fails.
-#define ORU_CL(Name)                                                                               \
-    ::ORU::OCL::CheckedCall {                                                                      \
-        ::ORU::OCL::Table().cl##Name, __FILE__, __LINE__                                           \
-    }
+#define ORU_CL(Name, ...)                                                                          \
+    ::ORU::OCL::MakeCheckedCall(::ORU::OCL::Table().cl##Name, __FILE__, __LINE__)(__VA_ARGS__)

@@ -20,8 +20,8 @@ cl_command_queue_properties QueueProperties(bool outOfOrder, bool profiling) {
 
 CommandQueue::CommandQueue(Context const &context, Device const &device, bool outOfOrder,
                            bool profiling)
-    : OpenCLObjectWrapper(ORU_CL(CreateCommandQueue)(context.id(), device.id(),
-                                                     QueueProperties(outOfOrder, profiling))) {}
+    : OpenCLObjectWrapper(ORU_CL(CreateCommandQueue, context.id(), device.id(),
+                                 QueueProperties(outOfOrder, profiling))) {}
 
 Event CommandQueue::enqueueWrite(Buffer &buffer, std::size_t offset, std::size_t size,
                                  void const *source, WaitList const &waitList) {
@@ -58,8 +58,8 @@ Event CommandQueue::enqueueAcquireGLObjects(std::vector<Memory> const &objects,
     HandleArray<cl_mem> const memory(objects);
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueAcquireGLObjects)
-    (id(), memory.count(), memory.data(), waits.count(), waits.data(), &event);
+    ORU_CL(EnqueueAcquireGLObjects, id(), memory.count(), memory.data(), waits.count(),
+           waits.data(), &event);
     return Event(event);
 }
 
@@ -68,27 +68,27 @@ Event CommandQueue::enqueueReleaseGLObjects(std::vector<Memory> const &objects,
     HandleArray<cl_mem> const memory(objects);
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueReleaseGLObjects)
-    (id(), memory.count(), memory.data(), waits.count(), waits.data(), &event);
+    ORU_CL(EnqueueReleaseGLObjects, id(), memory.count(), memory.data(), waits.count(),
+           waits.data(), &event);
     return Event(event);
 }
 
 Event CommandQueue::enqueueMarker() {
     cl_event event = nullptr;
-    ORU_CL(EnqueueMarker)(id(), &event);
+    ORU_CL(EnqueueMarker, id(), &event);
     return Event(event);
 }
 
 void CommandQueue::enqueueBarrier() {
-    ORU_CL(EnqueueBarrier)(id());
+    ORU_CL(EnqueueBarrier, id());
 }
 
 void CommandQueue::finish() {
-    ORU_CL(Finish)(id());
+    ORU_CL(Finish, id());
 }
 
 void CommandQueue::flush() {
-    ORU_CL(Flush)(id());
+    ORU_CL(Flush, id());
 }
 
 Event CommandQueue::enqueueWriteImpl(Buffer &buffer, bool blocking, std::size_t offset,
@@ -96,9 +96,8 @@ Event CommandQueue::enqueueWriteImpl(Buffer &buffer, bool blocking, std::size_t 
                                      WaitList const &waitList) {
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueWriteBuffer)
-    (id(), buffer.id(), cl_bool(blocking), offset, size, source, waits.count(), waits.data(),
-     &event);
+    ORU_CL(EnqueueWriteBuffer, id(), buffer.id(), blocking, offset, size, source, waits.count(),
+           waits.data(), &event);
     return Event(event);
 }
 
@@ -106,9 +105,8 @@ Event CommandQueue::enqueueReadImpl(Buffer const &buffer, bool blocking, std::si
                                     std::size_t size, void *destination, WaitList const &waitList) {
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueReadBuffer)
-    (id(), buffer.id(), cl_bool(blocking), offset, size, destination, waits.count(), waits.data(),
-     &event);
+    ORU_CL(EnqueueReadBuffer, id(), buffer.id(), blocking, offset, size, destination, waits.count(),
+           waits.data(), &event);
     return Event(event);
 }
 
@@ -128,9 +126,9 @@ Event CommandQueue::enqueueReadImpl(Image const &image, bool blocking, IntegerRe
     std::size_t const extent[] = {region.width(), region.height(), depth};
     HandleArray<cl_event> const waits(waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueReadImage)
-    (id(), image.id(), cl_bool(blocking), origin, extent, static_cast<std::size_t>(rowPitch),
-     static_cast<std::size_t>(slicePitch), destination, waits.count(), waits.data(), &event);
+    ORU_CL(EnqueueReadImage, id(), image.id(), blocking, origin, extent,
+           static_cast<std::size_t>(rowPitch), static_cast<std::size_t>(slicePitch), destination,
+           waits.count(), waits.data(), &event);
     return Event(event);
 }
 
@@ -140,9 +138,8 @@ Event CommandQueue::enqueueKernel_(CommandQueue const &queue, Kernel const &kern
                                    WaitList const *waitList) {
     HandleArray<cl_event> const waits(*waitList);
     cl_event event = nullptr;
-    ORU_CL(EnqueueNDRangeKernel)
-    (queue.id(), kernel.id(), static_cast<cl_uint>(workDimension), offset, global, local,
-     waits.count(), waits.data(), &event);
+    ORU_CL(EnqueueNDRangeKernel, queue.id(), kernel.id(), static_cast<cl_uint>(workDimension),
+           offset, global, local, waits.count(), waits.data(), &event);
     return Event(event);
 }
 

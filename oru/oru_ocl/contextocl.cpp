@@ -39,22 +39,22 @@ Context::Context(ContextProperties const &properties, Device const &device,
 
 Context::Context(ContextProperties const &properties, Device::Type type,
                  NotifyCallback const &callback) {
-    adopt(ORU_CL(CreateContextFromType)(properties.properties().data(), cl_device_type(type),
-                                        callback.pf_notify(), callback.user_data()));
+    adopt(ORU_CL(CreateContextFromType, properties.properties().data(), cl_device_type(type),
+                 callback.pf_notify(), callback.user_data()));
 }
 
 void Context::initialize(ContextProperties const &properties, std::vector<Device> const &devices,
                          NotifyCallback const &callback) {
     HandleArray<cl_device_id> const ids(devices);
-    adopt(ORU_CL(CreateContext)(properties.properties().data(), ids.count(), ids.data(),
-                                callback.pf_notify(), callback.user_data()));
+    adopt(ORU_CL(CreateContext, properties.properties().data(), ids.count(), ids.data(),
+                 callback.pf_notify(), callback.user_data()));
 }
 
 std::vector<Device> Context::devices() const {
     auto const ids =
         QueryList<cl_device_id>([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-            ORU_CL(GetContextInfo)
-            (id(), cl_context_info(CL_CONTEXT_DEVICES), bytes, value, bytesReturned);
+            ORU_CL(GetContextInfo, id(), cl_context_info(CL_CONTEXT_DEVICES), bytes, value,
+                   bytesReturned);
         });
     return std::vector<Device>(ids.begin(), ids.end());
 }
@@ -62,8 +62,8 @@ std::vector<Device> Context::devices() const {
 Platform Context::platform() const {
     auto const list = QueryList<cl_context_properties>(
         [&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-            ORU_CL(GetContextInfo)
-            (id(), cl_context_info(CL_CONTEXT_PROPERTIES), bytes, value, bytesReturned);
+            ORU_CL(GetContextInfo, id(), cl_context_info(CL_CONTEXT_PROPERTIES), bytes, value,
+                   bytesReturned);
         });
     for (std::size_t i = 0; i + 1 < list.size() && list[i] != 0; i += 2)
         if (list[i] == CL_CONTEXT_PLATFORM)

@@ -14,7 +14,7 @@ namespace ORU::OCL {
 void Device::getInfoImpl(Enum::DeviceProperty property, std::size_t size, void *value,
                          std::size_t *sizeReturned) const {
     ORU_ASSERT(id() != 0);
-    ORU_CL(GetDeviceInfo)(id(), cl_device_info(property), size, value, sizeReturned);
+    ORU_CL(GetDeviceInfo, id(), cl_device_info(property), size, value, sizeReturned);
 }
 
 std::string Device::getStringInfo(Enum::DeviceProperty property) const {

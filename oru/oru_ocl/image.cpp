@@ -23,8 +23,8 @@ void CheckHost(void const *host, char const *message) {
 
 cl_mem FromTexture2D(Context const &context, cl_mem_flags flags, OGL::Object const &texture,
                      unsigned int mipLevel) {
-    return ORU_CL(CreateFromGLTexture2D)(context.id(), flags, texture.target(),
-                                         static_cast<cl_GLint>(mipLevel), texture.objectID());
+    return ORU_CL(CreateFromGLTexture2D, context.id(), flags, texture.target(),
+                  static_cast<cl_GLint>(mipLevel), texture.objectID());
 }
 
 constexpr char const *noHost2D = "NULL host memory pointer passed to Image2D constructor.";
@@ -34,7 +34,7 @@ constexpr char const *noHost3D = "NULL host memory pointer passed to Image3D con
 
 void Image::getInfo(ImageInfo info, std::size_t size, void *value,
                     std::size_t *sizeReturned) const {
-    ORU_CL(GetImageInfo)(id(), ConvertImageInfo(info), size, value, sizeReturned);
+    ORU_CL(GetImageInfo, id(), ConvertImageInfo(info), size, value, sizeReturned);
 }
 
 unsigned int Image::ConvertImageInfo(ImageInfo info) {
@@ -45,7 +45,7 @@ Image2D::Image2D(Context const &context, MemoryAccessFlags access, cl_image_form
                  std::size_t width, std::size_t height, std::size_t rowPitch, void *host) {
     CheckHost(host, noHost2D);
     cl_mem_flags const flags = AccessFlags(access) | CL_MEM_USE_HOST_PTR;
-    adopt(ORU_CL(CreateImage2D)(context.id(), flags, &format, width, height, rowPitch, host));
+    adopt(ORU_CL(CreateImage2D, context.id(), flags, &format, width, height, rowPitch, host));
 }
 
 Image2D::Image2D(Context const &context, MemoryAccessFlags access, bool allocHost,
@@ -53,14 +53,14 @@ Image2D::Image2D(Context const &context, MemoryAccessFlags access, bool allocHos
                  std::size_t rowPitch, void *host) {
     CheckHost(host, noHost2D);
     cl_mem_flags const flags = AllocationFlags(access, allocHost) | CL_MEM_COPY_HOST_PTR;
-    adopt(ORU_CL(CreateImage2D)(context.id(), flags, &format, width, height, rowPitch, host));
+    adopt(ORU_CL(CreateImage2D, context.id(), flags, &format, width, height, rowPitch, host));
 }
 
 Image2D::Image2D(Context const &context, MemoryAccessFlags access, bool allocHost,
                  cl_image_format format, std::size_t width, std::size_t height,
                  std::size_t rowPitch)
-    : Image(ORU_CL(CreateImage2D)(context.id(), AllocationFlags(access, allocHost), &format, width,
-                                  height, rowPitch, nullptr)) {}
+    : Image(ORU_CL(CreateImage2D, context.id(), AllocationFlags(access, allocHost), &format, width,
+                   height, rowPitch, nullptr)) {}
 
 Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::Texture2D &texture,
                  unsigned int mipLevel)
@@ -71,16 +71,16 @@ Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::TextureR
     : Image(FromTexture2D(context, AccessFlags(access), texture, mipLevel)) {}
 
 Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::Renderbuffer &renderbuffer)
-    : Image(ORU_CL(CreateFromGLRenderbuffer)(context.id(), AccessFlags(access),
-                                             renderbuffer.objectID())) {}
+    : Image(ORU_CL(CreateFromGLRenderbuffer, context.id(), AccessFlags(access),
+                   renderbuffer.objectID())) {}
 
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, cl_image_format format,
                  std::size_t width, std::size_t height, std::size_t depth, std::size_t rowPitch,
                  std::size_t slicePitch, void *host) {
     CheckHost(host, noHost3D);
     cl_mem_flags const flags = AccessFlags(access) | CL_MEM_USE_HOST_PTR;
-    adopt(ORU_CL(CreateImage3D)(context.id(), flags, &format, width, height, depth, rowPitch,
-                                slicePitch, host));
+    adopt(ORU_CL(CreateImage3D, context.id(), flags, &format, width, height, depth, rowPitch,
+                 slicePitch, host));
 }
 
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, bool allocHost,
@@ -88,19 +88,19 @@ Image3D::Image3D(Context const &context, MemoryAccessFlags access, bool allocHos
                  std::size_t rowPitch, std::size_t slicePitch, void *host) {
     CheckHost(host, noHost3D);
     cl_mem_flags const flags = AllocationFlags(access, allocHost) | CL_MEM_COPY_HOST_PTR;
-    adopt(ORU_CL(CreateImage3D)(context.id(), flags, &format, width, height, depth, rowPitch,
-                                slicePitch, host));
+    adopt(ORU_CL(CreateImage3D, context.id(), flags, &format, width, height, depth, rowPitch,
+                 slicePitch, host));
 }
 
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, bool allocHost,
                  cl_image_format format, std::size_t width, std::size_t height, std::size_t depth,
                  std::size_t rowPitch, std::size_t slicePitch)
-    : Image(ORU_CL(CreateImage3D)(context.id(), AllocationFlags(access, allocHost), &format, width,
-                                  height, depth, rowPitch, slicePitch, nullptr)) {}
+    : Image(ORU_CL(CreateImage3D, context.id(), AllocationFlags(access, allocHost), &format, width,
+                   height, depth, rowPitch, slicePitch, nullptr)) {}
 
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, OGL::Texture3D &texture,
                  unsigned int mipLevel)
-    : Image(ORU_CL(CreateFromGLTexture3D)(context.id(), AccessFlags(access), texture.target(),
-                                          static_cast<cl_GLint>(mipLevel), texture.objectID())) {}
+    : Image(ORU_CL(CreateFromGLTexture3D, context.id(), AccessFlags(access), texture.target(),
+                   static_cast<cl_GLint>(mipLevel), texture.objectID())) {}
 
 } // namespace ORU::OCL

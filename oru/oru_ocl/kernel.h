@@ -20,7 +20,7 @@ public:
     /// @param size bytes
     /// @throws ExceptionOCL when the runtime refuses
     void setArg(unsigned int index, void const *value, std::size_t size) {
-        ORU_CL(SetKernelArg)(id(), index, size, value);
+        ORU_CL(SetKernelArg, id(), index, size, value);
     }
 
     /// Sets an argument to a memory object or a sampler, or to a plain value: a TVec2 or TVec4 of

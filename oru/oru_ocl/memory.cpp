@@ -25,7 +25,7 @@ constexpr unsigned int objectTypes[] = {
 
 void Memory::getInfo(MemoryInfo info, std::size_t size, void *value,
                      std::size_t *sizeReturned) const {
-    ORU_CL(GetMemObjectInfo)(id(), ConvertMemoryInfo(info), size, value, sizeReturned);
+    ORU_CL(GetMemObjectInfo, id(), ConvertMemoryInfo(info), size, value, sizeReturned);
 }
 
 Memory::MemoryObjectType Memory::memType() const {

@@ -11,7 +11,7 @@ std::string Platform::info(cl_platform_info query) const {
     ORU_ASSERT(id() != 0);
     std::string const text =
         QueryText([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-            ORU_CL(GetPlatformInfo)(id(), query, bytes, value, bytesReturned);
+            ORU_CL(GetPlatformInfo, id(), query, bytes, value, bytesReturned);
         });
     return text.c_str();
 }
@@ -39,7 +39,7 @@ Enum::Profile Platform::profile() const {
 std::vector<Device> Platform::devices(Device::Type type) const {
     auto const ids =
         QueryHandles<cl_device_id>([&](cl_uint count, cl_device_id *devices, cl_uint *found) {
-            ORU_CL(GetDeviceIDs)(id(), cl_device_type(type), count, devices, found);
+            ORU_CL(GetDeviceIDs, id(), cl_device_type(type), count, devices, found);
         });
     return std::vector<Device>(ids.begin(), ids.end());
 }
@@ -52,7 +52,7 @@ bool Platform::isSupported(Enum::Extension extension) const {
 std::vector<Platform> platforms() {
     auto const ids =
         QueryHandles<cl_platform_id>([](cl_uint count, cl_platform_id *platforms, cl_uint *found) {
-            ORU_CL(GetPlatformIDs)(count, platforms, found);
+            ORU_CL(GetPlatformIDs, count, platforms, found);
         });
     return std::vector<Platform>(ids.begin(), ids.end());
 }

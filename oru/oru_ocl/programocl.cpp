@@ -21,14 +21,13 @@ constexpr int buildStatuses[] = {
 
 cl_program CreateWithSource(Context const &context, char const *source) {
     std::size_t const length = std::strlen(source);
-    return ORU_CL(CreateProgramWithSource)(context.id(), cl_uint(1), &source, &length);
+    return ORU_CL(CreateProgramWithSource, context.id(), 1, &source, &length);
 }
 
 cl_program CreateWithBinaries(Context const &context, Program::BinaryArray const &array) {
     std::vector<unsigned char const *> binaries = array.binaries();
-    return ORU_CL(CreateProgramWithBinary)(context.id(), static_cast<cl_uint>(array.nBinary()),
-                                           array.devices().data(), array.sizes(), binaries.data(),
-                                           nullptr);
+    return ORU_CL(CreateProgramWithBinary, context.id(), static_cast<cl_uint>(array.nBinary()),
+                  array.devices().data(), array.sizes(), binaries.data(), nullptr);
 }
 
 } // namespace
@@ -56,17 +55,15 @@ void Program::buildAsync(std::vector<Device> const &devices, std::string const &
 void Program::build(std::vector<Device> const &devices, std::string const &options,
                     NotifyCallback const &callback) {
     HandleArray<cl_device_id> const ids(devices);
-    ORU_CL(BuildProgram)
-    (id(), ids.count(), ids.data(), options.empty() ? nullptr : options.c_str(),
-     callback.pf_notify(), callback.user_data());
+    ORU_CL(BuildProgram, id(), ids.count(), ids.data(), options.empty() ? nullptr : options.c_str(),
+           callback.pf_notify(), callback.user_data());
 }
 
 std::string Program::buildLog(Device const &device) {
     std::string const log =
         QueryText([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-            ORU_CL(GetProgramBuildInfo)
-            (id(), device.id(), cl_program_build_info(CL_PROGRAM_BUILD_LOG), bytes, value,
-             bytesReturned);
+            ORU_CL(GetProgramBuildInfo, id(), device.id(), CL_PROGRAM_BUILD_LOG, bytes, value,
+                   bytesReturned);
         });
     return log.c_str();
 }
@@ -74,15 +71,14 @@ std::string Program::buildLog(Device const &device) {
 Program::BuildStatus Program::buildStatus(Device const &device) {
     std::vector<cl_build_status> const status =
         QueryList<cl_build_status>([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-            ORU_CL(GetProgramBuildInfo)
-            (id(), device.id(), cl_program_build_info(CL_PROGRAM_BUILD_STATUS), bytes, value,
-             bytesReturned);
+            ORU_CL(GetProgramBuildInfo, id(), device.id(), CL_PROGRAM_BUILD_STATUS, bytes, value,
+                   bytesReturned);
         });
     return status.empty() ? BUILD_STATUS_NONE : OCLBuildStatus(status.front());
 }
 
 Kernel Program::kernel(std::string const &name) const {
-    return Kernel(ORU_CL(CreateKernel)(id(), name.c_str()));
+    return Kernel(ORU_CL(CreateKernel, id(), name.c_str()));
 }
 
 std::vector<Kernel> Program::kernels() const {
@@ -91,7 +87,7 @@ std::vector<Kernel> Program::kernels() const {
         QueryHandles<cl_kernel>([&](cl_uint count, cl_kernel *created, cl_uint *found) {
             // Room before the references exist: nothing may fail once there is something to leak.
             kernels.reserve(count);
-            ORU_CL(CreateKernelsInProgram)(id(), count, created, found);
+            ORU_CL(CreateKernelsInProgram, id(), count, created, found);
         });
     for (cl_kernel const handle : handles)
         kernels.push_back(Kernel(handle));

@@ -37,13 +37,12 @@ int FromOpenCL(unsigned int const (&modes)[Size], unsigned int constant, char co
 
 Sampler::Sampler(Context const &context, bool normalizedCoordinates,
                  SamplerAddressingMode addressing, SamplerFilterMode filter)
-    : OpenCLObjectWrapper(ORU_CL(CreateSampler)(context.id(), cl_bool(normalizedCoordinates),
-                                                OpenCLAddressingMode(addressing),
-                                                OpenCLFilterMode(filter))) {}
+    : OpenCLObjectWrapper(ORU_CL(CreateSampler, context.id(), normalizedCoordinates,
+                                 OpenCLAddressingMode(addressing), OpenCLFilterMode(filter))) {}
 
 unsigned int Sampler::info(cl_sampler_info query) const {
     unsigned int value = 0;
-    ORU_CL(GetSamplerInfo)(id(), query, sizeof value, &value, nullptr);
+    ORU_CL(GetSamplerInfo, id(), query, sizeof value, &value, nullptr);
     return value;
 }
 

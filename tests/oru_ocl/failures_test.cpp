@@ -168,7 +168,7 @@ TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
             EXPECT_EQ(std::string("oru/oru_ocl/") + failing.file, e.file());
             EXPECT_NE(std::string::npos,
                       SourceLine(e.file(), e.line())
-                          .find("ORU_CL(" + std::string(failing.entryPoint) + ")"))
+                          .find("ORU_CL(" + std::string(failing.entryPoint) + ","))
                 << e.file() << ":" << e.line();
         }
         EXPECT_EQ(failing.call, runtime()->calls(entryPoint.c_str()))
