@@ -105,14 +105,14 @@ void OpenCLSharpener::sharpenShared(Texture2D &light, Work &work) {
 }
 
 void OpenCLSharpener::sharpenCopy(Texture2D &light, Work &work) {
-    std::vector<float> host(work.bytes / sizeof(float));
+    host_.resize(work.bytes / sizeof(float));
     BoundTexture const bound(light);
-    light.getPixelData(host.data(), 0, cLightFormat.layout, cLightFormat.type, 1);
-    queue_.enqueueBlockingWrite(work.light, 0, work.bytes, host.data());
+    light.getPixelData(host_.data(), 0, cLightFormat.layout, cLightFormat.type, 1);
+    queue_.enqueueBlockingWrite(work.light, 0, work.bytes, host_.data());
     sharpenBuffer(work);
-    queue_.enqueueBlockingRead(work.light, 0, work.bytes, host.data());
+    queue_.enqueueBlockingRead(work.light, 0, work.bytes, host_.data());
     light.subImage(0, 0, 0, work.width, work.height, cLightFormat.layout, cLightFormat.type,
-                   host.data(), ORU::OGL::PixelUnpackParameters());
+                   host_.data(), ORU::OGL::PixelUnpackParameters());
 }
 
 void OpenCLSharpener::sharpenBuffer(Work &work) {

@@ -51,6 +51,7 @@ private:
     ORU::OCL::Context context_;
     ORU::OCL::CommandQueue queue_;
     Kernels kernels_;
+    std::vector<float> host_; ///< the copy; kept, for new memory costs as much as copying
 };
 
 } // namespace Develop
