@@ -71,7 +71,7 @@ TEST_F(TransferChecksTest, PartsAreCheckedInOrder) {
                       }));
             if (row.sides == 3)
                 continue;
-            auto const [w, h] = std::pair(Size(row.size[0]), Size(row.size[1]));
+            std::uint64_t const w = Size(row.size[0]), h = Size(row.size[1]);
             EXPECT_EQ(with(row.plain, "copySubimage"), MessageOf([&] {
                           if (auto *one = dynamic_cast<Texture1 *>(texture.get()))
                               one->copyTexSubImage(row.level, 0, 0, 0, w);
