@@ -1,24 +1,15 @@
 // The interceptor chain and the error checker at its end.
 #include "../glfixture.h"
+#include "tests/messageof.h"
 
-#include "oru/core/exceptions/internalexception.h"
 #include "oru/oru_ogl/exceptionogl.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/openglerrorchecker.h"
 
-#include <memory>
-#include <vector>
-
 using namespace ORU::OGL;
-using oru_test::CountingForwarder;
-using oru_test::OffscreenTest;
-using oru_test::Pushed;
+using oru_test::MessageOf;
 
 namespace {
-
-std::string ErrorString(unsigned int error) {
-    return reinterpret_cast<char const *>(OpenGLErrorChecker::GetOpenGLErrorString(error));
-}
 
 /// Writes its letter down when a call passes.
 class Marker : public OpenGLForwarder {
@@ -48,52 +39,28 @@ ExceptionOGL Failure(Call call) {
 
 } // namespace
 
-TEST(ErrorChecker, NamesErrors) {
-    EXPECT_EQ("GL_INVALID_ENUM", ErrorString(0x0500));
-    EXPECT_EQ("GL_INVALID_FRAMEBUFFER_OPERATION", ErrorString(0x0506));
-    EXPECT_EQ("GL_CONTEXT_LOST", ErrorString(0x0507));
-    EXPECT_EQ("GL_TABLE_TOO_LARGE", ErrorString(0x8031));
-    EXPECT_EQ("Unspecified GL error", ErrorString(0));
-    EXPECT_EQ("Unspecified GL error", ErrorString(0x1234));
-}
-
-class ChainTest : public OffscreenTest {};
-
-TEST_F(ChainTest, EndsInOneErrorChecker) {
-    OpenGLInterceptor *const first = OpenGLInterceptor::Instance();
-    EXPECT_NE(nullptr, dynamic_cast<OpenGLErrorChecker *>(first));
-    EXPECT_EQ(first, OpenGLInterceptor::Instance());
-    EXPECT_EQ(nullptr, first->popInterceptor());
-    EXPECT_EQ(first, OpenGLInterceptor::Instance());
-    OpenGLInterceptor::Destroy();
-    OpenGLInterceptor::Destroy(); // an empty chain has nothing to destroy
-    EXPECT_NE(nullptr, dynamic_cast<OpenGLErrorChecker *>(OpenGLInterceptor::Instance()));
-}
+class ChainTest : public oru_test::OffscreenTest {};
 
 TEST_F(ChainTest, CallsTheLastPushedFirst) {
     std::string log;
     Marker a('a', log), b('b', log);
     ExtensionManager &record = *ExtensionManager::Instance();
     OpenGLInterceptor *const checker = OpenGLInterceptor::Instance();
+    ASSERT_NE(nullptr, dynamic_cast<OpenGLErrorChecker *>(checker));
     checker->addInterceptor(&a);
     record.addInterceptor(&b);
-    EXPECT_EQ(&b, OpenGLInterceptor::Instance());
     EXPECT_EQ(&a, b.interceptor());
-    EXPECT_EQ(checker, a.interceptor());
     ORU_GL0(Flush);
     EXPECT_EQ("ba", log);
-
-    try {
-        OpenGLInterceptor::Destroy();
-        ADD_FAILURE() << "a pushed decorator was ignored";
-    } catch (ORU::InternalException const &e) {
-        EXPECT_STREQ("Enforce dynamic_cast<OpenGLErrorChecker *>(sInterceptor_) != NULL",
-                     e.message());
-    }
+    EXPECT_EQ("Enforce dynamic_cast<OpenGLErrorChecker *>(sInterceptor_) != NULL",
+              MessageOf([] { OpenGLInterceptor::Destroy(); }));
     EXPECT_EQ(&b, record.popInterceptor());
     EXPECT_EQ(&a, OpenGLInterceptor::Instance()->popInterceptor());
     EXPECT_EQ(nullptr, OpenGLInterceptor::Instance()->popInterceptor());
     EXPECT_EQ(checker, OpenGLInterceptor::Instance());
+    OpenGLInterceptor::Destroy();
+    OpenGLInterceptor::Destroy(); // an empty chain has nothing to destroy
+    EXPECT_NE(nullptr, dynamic_cast<OpenGLErrorChecker *>(OpenGLInterceptor::Instance()));
 }
 
 TEST_F(ChainTest, ThrowsAtTheCallersFileAndLine) {
@@ -103,11 +70,8 @@ TEST_F(ChainTest, ThrowsAtTheCallersFileAndLine) {
     ExceptionOGL const core = Failure([&] { ORU_GL(BindTexture, 0x1234, name); });
     EXPECT_STREQ("GL_INVALID_ENUM", core.message());
     EXPECT_EQ(0x0500u, core.errorNumber());
-    EXPECT_STREQ(__FILE__, core.file());
+    EXPECT_STREQ("tests/oru_ogl/extensionator/chain_test.cpp", core.file());
     EXPECT_EQ(line, core.line());
-    EXPECT_STREQ("ORU logical exception", core.what());
-    EXPECT_EQ(0u, std::string(core.file()).find("tests/oru_ogl/"))
-        << "source positions are relative to the repository";
     ORU_GL(DeleteTextures, 1, &name);
 
     ExceptionOGL const extended =
@@ -119,7 +83,6 @@ TEST_F(ChainTest, ThrowsAtTheCallersFileAndLine) {
 }
 
 TEST_F(ChainTest, ReturnsResults) {
-    EXPECT_EQ(GL_TRUE, ORU_GL(IsEnabled, GL_DITHER));
     GLuint const program = ORU_GL0(CreateProgram);
     EXPECT_NE(0u, program);
     EXPECT_EQ(GL_TRUE, ORU_GL(IsProgram, program));
@@ -144,14 +107,4 @@ TEST_F(ChainTest, BalancesBeginAndEnd) {
     EXPECT_NO_THROW(ORU_GL(Vertex2f, 0.f, 0.f));
     EXPECT_NE(0u, Failure([] { ORU_GL0(End); }).errorNumber());
     EXPECT_STREQ("Unbalanced glEnd()!", Failure([] { ORU_GL0(End); }).message());
-}
-
-TEST_F(ChainTest, DecoratorSeesEveryCallOnce) {
-    Pushed<CountingForwarder> counter;
-    ORU_GL(Viewport, 0, 0, 4, 4);
-    ORU_GL(UseProgram, 0u);
-    ORU_GL(UseProgram, 0u);
-    EXPECT_EQ(1, counter->count("Viewport"));
-    EXPECT_EQ(2, counter->count("UseProgram"));
-    EXPECT_EQ(3, counter->total());
 }

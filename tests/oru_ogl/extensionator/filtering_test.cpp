@@ -27,9 +27,9 @@ public:
 
     void cgmTexParameteri(char const *file, unsigned int line, GLenum target, GLenum pname,
                           GLint param) override {
-        GLint const nearest = GL_NEAREST;
-        bool const replace = !filters && param == GL_LINEAR;
-        OpenGLForwarder::cgmTexParameteri(file, line, target, pname, replace ? nearest : param);
+        if (!filters && param == GL_LINEAR)
+            param = GL_NEAREST;
+        OpenGLForwarder::cgmTexParameteri(file, line, target, pname, param);
     }
     void cgmTexCoord2f(char const *file, unsigned int line, GLfloat s, GLfloat t) override {
         if (fails && s > 0)
@@ -121,19 +121,16 @@ TEST_F(FilteringTest, SeesANearestFilter) {
     obstacle->filters = false;
     EXPECT_FALSE(Record().supportsFloatFiltering());
     obstacle->filters = true;
-    EXPECT_FALSE(Record().supportsFloatFiltering()); // cached
+    EXPECT_FALSE(Record().supportsFloatFiltering()) << "the answer is kept";
 }
 
 TEST_F(FilteringTest, AnswersNoWhenItFailsHalfWay) {
-    {
-        Pushed<Obstacle> obstacle;
-        obstacle->fails = true;
-        EXPECT_FALSE(Record().supportsFloatFiltering());
-    }
-    EXPECT_TRUE(hasMadeContexts());
-    Pushed<CountingForwarder> calls;
+    Pushed<Obstacle> obstacle;
+    obstacle->fails = true;
     EXPECT_FALSE(Record().supportsFloatFiltering());
-    EXPECT_EQ(0, calls->total());
+    EXPECT_TRUE(hasMadeContexts());
+    obstacle->fails = false;
+    EXPECT_FALSE(Record().supportsFloatFiltering()) << "the answer is kept";
 }
 
 TEST(FilteringWithoutRenderTexture, AnswersNoWithoutDrawing) {

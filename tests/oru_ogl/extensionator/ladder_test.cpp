@@ -39,7 +39,7 @@ std::vector<std::string> NamesByThePlainCalls() {
 
 class LadderTest : public OffscreenTest {
 protected:
-    ExtensionManager const &record() { return *ExtensionManager::Instance(); }
+    ExtensionManager &record() { return *ExtensionManager::Instance(); }
 };
 
 TEST_F(LadderTest, HoldsEveryVersionUpToItsOwn) {
@@ -54,16 +54,13 @@ TEST_F(LadderTest, HoldsEveryVersionUpToItsOwn) {
     EXPECT_FALSE(record().hasReleaseVersion() && record().releaseVersion() > 1000);
     EXPECT_NE(std::string::npos, record().additionalVersionInfo().find("Mesa"));
 
-    struct {
-        unsigned int number;
-        OpenGLExtension value;
-    } const versions[] = {{12, GL_VERSION_1_2}, {13, GL_VERSION_1_3}, {14, GL_VERSION_1_4},
-                          {15, GL_VERSION_1_5}, {20, GL_VERSION_2_0}, {21, GL_VERSION_2_1},
-                          {30, GL_VERSION_3_0}, {31, GL_VERSION_3_1}, {32, GL_VERSION_3_2},
-                          {33, GL_VERSION_3_3}, {40, GL_VERSION_4_0}, {41, GL_VERSION_4_1}};
+    std::pair<unsigned int, OpenGLExtension> const versions[] = {
+        {12, GL_VERSION_1_2}, {13, GL_VERSION_1_3}, {14, GL_VERSION_1_4}, {15, GL_VERSION_1_5},
+        {20, GL_VERSION_2_0}, {21, GL_VERSION_2_1}, {30, GL_VERSION_3_0}, {31, GL_VERSION_3_1},
+        {32, GL_VERSION_3_2}, {33, GL_VERSION_3_3}, {40, GL_VERSION_4_0}, {41, GL_VERSION_4_1}};
     for (auto const &version : versions)
-        EXPECT_EQ(major * 10 + minor >= version.number, record().isSupported(version.value))
-            << version.number;
+        EXPECT_EQ(major * 10 + minor >= version.first, record().isSupported(version.second))
+            << version.first;
     EXPECT_FALSE(record().isSupported(GL_VERSION_1_2_1)) << "no rung adds it";
 
     // What comes with a version only: no extension string names it, or not in this version.
@@ -82,23 +79,19 @@ TEST_F(LadderTest, KeepsEveryNameOfTheImplementation) {
     for (std::size_t i = expected.size(); i < names.size(); ++i)
         EXPECT_EQ(0u, names[i].find("WGL_")) << names[i];
     EXPECT_TRUE(record().isSupported(WGL_ARB_PIXEL_FORMAT));
-    EXPECT_TRUE(record().supportsPixelBuffers());
 
-    ExtensionManager &loader = *ExtensionManager::Instance();
     for (std::string const &name : expected) {
-        OpenGLExtension const e = loader.nameToEnumGL(name.c_str());
-        if (e == UNKNOWN_OPENGL_EXTENSION)
-            continue;
-        EXPECT_EQ(loader.initializeGL(e), record().isSupported(e)) << name;
+        OpenGLExtension const e = record().nameToEnumGL(name.c_str());
+        if (e != UNKNOWN_OPENGL_EXTENSION) {
+            EXPECT_EQ(record().initializeGL(e), record().isSupported(e)) << name;
+        }
     }
 }
 
 TEST_F(LadderTest, AnswersItsShortcutsFromTheSet) {
     auto const has = [this](OpenGLExtension e) { return record().isSupported(e); };
-    EXPECT_EQ(has(GL_VERSION_1_2) || has(GL_EXT_TEXTURE3D), record().supportsTexture3D());
     EXPECT_EQ(has(GL_ARB_TEXTURE_NON_POWER_OF_TWO) || has(GL_VERSION_2_0),
               record().supportsNonPowerOfTwoTextures());
-    EXPECT_EQ(has(GL_VERSION_2_0) || has(GL_ARB_DRAW_BUFFERS), record().supportsDrawBuffers());
     GLint units = 1;
     ::glGetIntegerv(
         has(GL_ARB_FRAGMENT_PROGRAM) ? GL_MAX_TEXTURE_IMAGE_UNITS : GL_MAX_TEXTURE_UNITS, &units);
@@ -124,9 +117,8 @@ TEST_F(LadderTest, LacksWhatTheImplementationLacks) {
 }
 
 TEST_F(LadderTest, PrintsVersionsAndNames) {
-    std::ostringstream text;
+    std::ostringstream text, expected;
     text << record();
-    std::ostringstream expected;
     expected << "ExtensionManager for context version " << record().majorVersion() << '.'
              << record().minorVersion() << "\n                        glsl version "
              << record().glslMajorVersion() << '.' << record().glslMinorVersion()
