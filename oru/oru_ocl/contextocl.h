@@ -18,8 +18,8 @@ public:
     Platform const &platform() const { return platform_; }
     void setPlatform(Platform const &platform) { platform_ = platform; }
 
-    /// The OpenGL rendering context to share objects with, null for none. It should be current on
-    /// the thread that constructs the OpenCL context.
+    /// The OpenGL rendering context to share objects with, null for none. It must outlive the
+    /// OpenCL context and its queues, and is best current on the thread that makes them.
     HGLRC const &sharedRenderContext() const { return sharedRenderContext_; }
     void setSharedRenderContext(HGLRC const &context) { sharedRenderContext_ = context; }
 

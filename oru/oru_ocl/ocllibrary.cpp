@@ -115,10 +115,11 @@ bool Library::IsOpenCLAvailable(std::string const &path) {
     try {
         // A static whose initialiser throws is initialised again by the next call.
         static bool const available = [&] {
+            std::string copy = path;
             HMODULE const module = LoadRuntime(path);
             {
                 std::lock_guard const lock(mutex_);
-                libraryPath_ = path;
+                libraryPath_.swap(copy);
             }
             if (!module)
                 return false;

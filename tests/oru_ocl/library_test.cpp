@@ -10,9 +10,7 @@
 #include <windows.h>
 
 #include <algorithm>
-#include <atomic>
 #include <cstring>
-#include <thread>
 #include <vector>
 
 using namespace ORU::OCL;
@@ -106,28 +104,6 @@ TEST(OpenCLRuntime, OpensAndClosesOnce) {
         layer.release();
     }
     EXPECT_TRUE(Library::IsInitialized());
-    Library::Terminate();
-}
-
-TEST(OpenCLRuntime, IsInitialisedByOneOfManyThreads) {
-    std::atomic<int> refused{0};
-    std::vector<std::thread> threads;
-    threads.reserve(8);
-    for (int i = 0; i < 8; ++i)
-        threads.emplace_back([&, i] {
-            if (i % 2)
-                Library::InitializeIfNecessary();
-            else if (MessageOf([] { Library::Initialize(); }) == "!bInitialized_")
-                ++refused;
-        });
-    for (std::thread &thread : threads)
-        thread.join();
-    EXPECT_TRUE(Library::IsInitialized());
-    EXPECT_GE(refused, 3);
-    cl_uint platforms = 0;
-    EXPECT_EQ(CL_SUCCESS,
-              ExtensionManager::instance()->table().clGetPlatformIDs(0, nullptr, &platforms));
-    EXPECT_GE(platforms, 1u);
     Library::Terminate();
 }
 
