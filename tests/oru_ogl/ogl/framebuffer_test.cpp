@@ -5,6 +5,7 @@
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"
+#include "oru/oru_ogl/ogl/vertexbufferogl.h"
 
 #include <functional>
 #include <memory>
@@ -238,4 +239,26 @@ TEST_F(FramebufferTest, RenderbufferLeavesTheBinding) {
     outer.unbind();
     EXPECT_EQ("Framebuffer object must be bound before calling unbind()",
               MessageOf([&] { outer.unbind(); }));
+}
+
+TEST_F(FramebufferTest, ObjectsOutliveTheirContext) {
+    GLuint framebufferID = 0, renderbufferID = 0;
+    {
+        ScopedContextWrapper const restore;
+        Framebuffer const framebuffer;
+        Renderbuffer const renderbuffer(GL_RGBA8, 1, 1);
+        VertexBuffer vertices({VertexBuffer::Field("", VertexBuffer::ATTRIBUTETYPE_FLOAT, {})}, 1,
+                              VertexBuffer::PRIMITIVETYPE_POINTS);
+        EXPECT_NE("", MessageOf([&] { vertices.setupWithProgram(0u); })) << "no program, but names";
+        framebufferID = framebuffer.objectID();
+        renderbufferID = renderbuffer.objectID();
+        ::wglMakeCurrent(nullptr, nullptr);
+    }
+    // Nothing was deleted in another context's stead: give it back, for the ledger.
+    EXPECT_TRUE(ORU_GL(IsRenderbufferEXT, renderbufferID));
+    ORU_GL(DeleteFramebuffersEXT, 1, &framebufferID);
+    ORU_GL(DeleteRenderbuffersEXT, 1, &renderbufferID);
+    GLuint const first = 1;
+    ORU_GL(DeleteVertexArrays, 1, &first);
+    ORU_GL(DeleteBuffers, 1, &first);
 }
