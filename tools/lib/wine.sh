@@ -64,8 +64,9 @@ start_idle() {
     [ "$idle" -nt "$ORU_ROOT/tools/lib/idle.c" ] ||
         x86_64-w64-mingw32-gcc-posix -O2 -s -mwindows -municode -o "$idle" "$ORU_ROOT/tools/lib/idle.c"
     start_detached "$ORU_WINE_DIR/idle.log" "$WINE" "$idle"
-    # One program that waits until the services are up; the next ones find them running.
-    "$WINE" cmd /c exit </dev/null >>"$ORU_WINE_DIR/idle.log" 2>&1 8>&- ||
+    # Waits until the services and the desktop are up. Started later, by a test, they would inherit
+    # CTest's pipes, and CTest would wait for them.
+    "$WINE" "$idle" once </dev/null >>"$ORU_WINE_DIR/idle.log" 2>&1 8>&- ||
         die "Wine runs no program (log: $ORU_WINE_DIR/idle.log)"
 }
 
