@@ -47,8 +47,7 @@ def enumeration(catalogue):
 
 #include "oru/oru_ogl/extensionator/openglextension_undef.inc"
 
-namespace ORU {{
-namespace OGL {{
+namespace ORU::OGL {{
 
 /// The capabilities an OpenGL implementation can have: versions, GL extensions, WGL extensions.
 enum OpenGLExtension : unsigned int {{
@@ -56,8 +55,7 @@ enum OpenGLExtension : unsigned int {{
     UNKNOWN_OPENGL_EXTENSION = {unknown} ///< the answer for any other name; never stored
 }};
 
-}} // namespace OGL
-}} // namespace ORU
+}} // namespace ORU::OGL
 """
 
 
@@ -71,8 +69,7 @@ def function_table(catalogue):
 
 #include "oru/oru_ogl/gltypes.h"
 
-namespace ORU {{
-namespace OGL {{
+namespace ORU::OGL {{
 
 /// The addresses of one context's OpenGL entry points beyond OpenGL 1.1, in catalogue order.
 ///
@@ -82,8 +79,7 @@ struct FunctionTable {{
 {chr(10).join(blocks)}
 }};
 
-}} // namespace OGL
-}} // namespace ORU
+}} // namespace ORU::OGL
 """
 
 
@@ -120,8 +116,7 @@ def loaders(catalogue):
 
 #include "oru/oru_ogl/extensionator/catalogueogl.h"
 
-namespace ORU {{
-namespace OGL {{
+namespace ORU::OGL {{
 
 char const *const kEntryPointNames[{len(catalogue.extended)}] = {{
 {names}
@@ -137,8 +132,7 @@ ExtensionManager::GroupLoader const ExtensionManager::sGroupLoaders_[{len(dispat
 {chr(10).join(dispatch)}
 }};
 
-}} // namespace OGL
-}} // namespace ORU
+}} // namespace ORU::OGL
 """
 
 
@@ -165,16 +159,14 @@ def prototype_checks(catalogue):
 // loaders rely on: entry i lies i pointers from the start.
 {core}
 
-namespace ORU {{
-namespace OGL {{
+namespace ORU::OGL {{
 
 {extended}
 
 static_assert(sizeof(FunctionTable) == {len(catalogue.extended)} * sizeof(void *), "FunctionTable");
 {offsets}
 
-}} // namespace OGL
-}} // namespace ORU
+}} // namespace ORU::OGL
 """
 
 
@@ -194,11 +186,9 @@ def error_checker(entries):
     return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/openglerrorcheck.h"
 
-namespace ORU {{
-namespace OGL {{
+namespace ORU::OGL {{
 
 {chr(10).join(bodies)}
 
-}} // namespace OGL
-}} // namespace ORU
+}} // namespace ORU::OGL
 """

@@ -59,11 +59,9 @@ def operations(entries):
     return f"""#include "oru/oru_ogl/extensionator/internal/traceline.h"
 #include "oru/oru_ogl/extensionator/opengltracer.h"
 
-namespace ORU {{
-namespace OGL {{
+namespace ORU::OGL {{
 
 {bodies}
 
-}} // namespace OGL
-}} // namespace ORU
+}} // namespace ORU::OGL
 """

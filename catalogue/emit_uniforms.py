@@ -104,14 +104,12 @@ def bodies(rows):
 #include "oru/oru_ogl/ogl/internal/programimplcore.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {{
-namespace OGL {{
+namespace ORU::OGL {{
 
 // A guarded setter tests that the program is current, lets the body assert the uniform's type, and uploads; an _Unsafe
 // one uploads unless the location is -1.
 
 {chr(10).join(functions)}
 
-}} // namespace OGL
-}} // namespace ORU
+}} // namespace ORU::OGL
 """

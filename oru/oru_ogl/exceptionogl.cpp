@@ -3,8 +3,7 @@
 
 #include "oru/core/memory/orumemory.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 ExceptionOGL::ExceptionOGL(char const *file, unsigned int line, char const *message,
                            unsigned int errorNumber)
@@ -20,5 +19,4 @@ ExceptionBase *ExceptionOGL::clone() const {
     return ORU_NEW ExceptionOGL(*this);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

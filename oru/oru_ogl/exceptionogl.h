@@ -3,8 +3,7 @@
 
 #include "oru/core/exceptions/logicalexception.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// An OpenGL call failed: `message()` names the GL error, `file()` and `line()` the call.
 class ORU_API ExceptionOGL : public LogicalException {
@@ -30,5 +29,4 @@ private:
     unsigned int errorNumber_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -6,8 +6,7 @@
 
 #include <boost/format.hpp>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -64,5 +63,4 @@ std::string InternalWindow::className() const {
     return (boost::format("OpenGL%p") % static_cast<void const *>(this)).str();
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -5,8 +5,7 @@
 
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// An 8 by 8 window of its own class, never shown. Windows demands that the thread that made it
 /// destroys it.
@@ -31,5 +30,4 @@ private:
     HWND window_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -9,8 +9,7 @@
 
 #include <fstream>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 bool Library::sIsInitialized_ = false;
 Library::InitOptions Library::sInitOptions_;
@@ -62,5 +61,4 @@ AutoInitializer::~AutoInitializer() {
     }
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -6,8 +6,7 @@
 
 #include <iosfwd>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Opens and closes a host's use of the OpenGL layer; static members only.
 ///
@@ -74,5 +73,4 @@ private:
     bool active_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include <cstddef>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Number of entry points in a FunctionTable, and of capabilities in OpenGLExtension.
 std::size_t const kEntryPointCount = 846;
@@ -16,5 +15,4 @@ extern char const *const kEntryPointNames[kEntryPointCount];
 /// The exact extension string of each OpenGLExtension value.
 extern char const *const kExtensionStrings[kExtensionCount];
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -17,8 +17,7 @@
 #include <initializer_list>
 #include <ostream>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -353,5 +352,4 @@ std::ostream &operator<<(std::ostream &os, ExtensionManager const &m) {
     return os;
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

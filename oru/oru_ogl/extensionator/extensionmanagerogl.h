@@ -15,8 +15,7 @@
 #include <string>
 #include <vector>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class Context;
 class OpenGLInterceptorDecorator;
@@ -305,5 +304,4 @@ private:
 /// Prints the versions and the names of the supported extensions, one a line.
 ORU_API std::ostream &operator<<(std::ostream &os, ExtensionManager const &m);
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -12,8 +12,7 @@
 #include <array>
 #include <cstddef>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -132,5 +131,4 @@ bool ExtensionManager::supportsHalfFiltering() {
     return halfFiltering_.value;
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -13,8 +13,7 @@
 #include <tbb/concurrent_hash_map.h>
 #include <tbb/spin_mutex.h>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 using internal::ContextBootstrap;
 using internal::ContextRegistry;
@@ -172,5 +171,4 @@ WGLInterceptorDecorator *ExtensionManager::popWGLInterceptor() {
     return WGLInterceptor::Instance()->popInterceptor();
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

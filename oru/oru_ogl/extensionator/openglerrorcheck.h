@@ -7,8 +7,7 @@
 
 #include <atomic>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Throws the ExceptionOGL of a GL error value.
 [[noreturn]] ORU_COLD void ThrowOpenGLError(char const *file, unsigned int line,
@@ -24,5 +23,4 @@ inline void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const
         ThrowOpenGLError(file, line, error);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -4,8 +4,7 @@
 #include "oru/oru_ogl/exceptionogl.h"
 #include "oru/oru_ogl/extensionator/openglerrorcheck.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 OpenGLErrorChecker::~OpenGLErrorChecker() = default;
 
@@ -72,5 +71,4 @@ GLenum OpenGLErrorChecker::cgmGetError(char const *file, unsigned int line) {
     return error;
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -5,8 +5,7 @@
 
 #include <atomic>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Makes each OpenGL call and throws ExceptionOGL when `glGetError` reports an error after it.
 ///
@@ -31,5 +30,4 @@ private:
     std::atomic<bool> insideBeginEnd_{false};
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/extensionator/openglinterceptordecorator.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Forwards every operation to the next link. Override the operations of interest and call
 /// `OpenGLForwarder::cgm<Name>` from them to go on along the chain.
@@ -19,5 +18,4 @@ public:
 #include "oru/oru_ogl/extensionator/gloperations.inc"
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -6,8 +6,7 @@
 #include "oru/oru_ogl/extensionator/openglerrorchecker.h"
 #include "oru/oru_ogl/extensionator/openglinterceptordecorator.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 OpenGLInterceptor *OpenGLInterceptor::sInterceptor_ = nullptr;
 
@@ -39,5 +38,4 @@ OpenGLInterceptorDecorator *OpenGLInterceptor::popInterceptor() {
     return decorator;
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

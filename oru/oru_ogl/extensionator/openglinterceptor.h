@@ -4,8 +4,7 @@
 #include "oru/core/utility/export.h"
 #include "oru/oru_ogl/gltypes.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class OpenGLInterceptorDecorator;
 
@@ -54,5 +53,4 @@ private:
     static OpenGLInterceptor *sInterceptor_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/extensionator/openglinterceptor.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Base of decorators: knows the next link. A concrete decorator implements every operation and
 /// forwards it to `interceptor()`; derive from OpenGLForwarder to write only those of interest.
@@ -23,5 +22,4 @@ private:
     OpenGLInterceptor *next_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

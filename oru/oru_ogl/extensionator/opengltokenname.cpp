@@ -6,9 +6,7 @@
 #include <array>
 #include <cstddef>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 namespace {
 
@@ -76,9 +74,7 @@ OpenGLToken const &FindOpenGLToken(GLenum value) {
     return kUnknown;
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal
 
 char const *ORUOGLTokenName(GLenum value) {
     return ORU::OGL::internal::FindOpenGLToken(value).name;

@@ -5,8 +5,7 @@
 
 #include <iostream>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Writes each OpenGL call with its arguments and the source position of the caller, then forwards
 /// it.
@@ -48,5 +47,4 @@ private:
     std::ostream *stream_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -6,8 +6,7 @@
 #include "oru/oru_ogl/ogl/internal/release.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 using internal::Release;
 
@@ -63,5 +62,4 @@ TemporaryAlphaBlendScope::TemporaryAlphaBlendScope() {
 
 TemporaryAlphaBlendScope::~TemporaryAlphaBlendScope() = default;
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include "oru/core/utility/export.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// The blending of the current context: switch, factors and equations.
 struct ORU_API BlendState {
@@ -53,5 +52,4 @@ public:
     ~TemporaryAlphaBlendScope() override;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

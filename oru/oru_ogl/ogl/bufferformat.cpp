@@ -3,8 +3,7 @@
 
 #include "oru/core/exceptions/checks.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -34,5 +33,4 @@ BufferFormat Predefined(unsigned int format) {
 BufferFormat::BufferFormat(PredefinedFormat format)
     : BufferFormat(Predefined(static_cast<unsigned int>(format))) {}
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

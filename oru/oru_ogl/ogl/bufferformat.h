@@ -3,8 +3,7 @@
 
 #include "oru/core/utility/export.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Bits per channel of a drawable, from which a context chooses its pixel format.
 class ORU_API BufferFormat {
@@ -66,5 +65,4 @@ private:
     bool floatingPointColor_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -9,8 +9,7 @@
 #include "oru/oru_ogl/ogl/internal/translation.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -207,5 +206,4 @@ bool Buffer::IsSupported() {
            internal::Supports(GL_ARB_VERTEX_BUFFER_OBJECT);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

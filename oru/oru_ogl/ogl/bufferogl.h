@@ -5,8 +5,7 @@
 
 #include <cstdint>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// One OpenGL buffer object, used as pixel unpack, pixel pack, array or element array buffer.
 ///
@@ -139,5 +138,4 @@ private:
     bool mapped_ = false;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -11,8 +11,7 @@
 #include <cstddef>
 #include <vector>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -142,5 +141,4 @@ bool Context::isSharingWithCurrentContext() const {
     return false;
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

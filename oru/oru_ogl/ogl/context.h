@@ -11,8 +11,7 @@
 #include <cstddef>
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// An OpenGL rendering context on a device context of one display device.
 ///
@@ -198,5 +197,4 @@ protected:
     void setDisplayDeviceKey(DisplayDeviceKey const &key) { displayDeviceKey_ = key; }
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -18,8 +18,7 @@
 #include <climits>
 #include <vector>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 using internal::TemporaryContext;
 using Microsoft::WRL::ComPtr;
@@ -472,5 +471,4 @@ void Context::destroyContext() {
         ORU_ASSERT(!"ContextOffscreen::destroyContext() failed to restore context");
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

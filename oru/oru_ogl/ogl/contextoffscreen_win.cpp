@@ -6,8 +6,7 @@
 #include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -41,5 +40,4 @@ ContextOffscreen::~ContextOffscreen() {
     internal::DropExceptions([this] { destroyContext(); });
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

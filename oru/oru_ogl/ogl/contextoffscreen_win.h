@@ -4,8 +4,7 @@
 #include "oru/core/utility/scopedptr.h"
 #include "oru/oru_ogl/ogl/context.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class InternalWindow;
 
@@ -30,5 +29,4 @@ private:
     ScopedPtr<InternalWindow> window_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -6,8 +6,7 @@
 #include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 ContextWindowed::ContextWindowed(HWND window, BufferFormat const &format, Buffering buffering,
                                  Multisampling multisampling, Context const *share)
@@ -28,5 +27,4 @@ void ContextWindowed::enableSyncToVerticalRetrace(bool enable) {
     _wcgmSwapIntervalEXT(enable ? 1 : 0);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

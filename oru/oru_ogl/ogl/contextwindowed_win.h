@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/ogl/context.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// A rendering context on a host's window, which it neither owns nor touches otherwise.
 class ORU_API ContextWindowed : public Context {
@@ -32,5 +31,4 @@ private:
     HWND window_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -6,8 +6,7 @@
 #include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 ContextWrapped::ContextWrapped(HDC deviceContext, HGLRC renderContext, HWND window)
     : Context(renderContext) {
@@ -50,5 +49,4 @@ void ContextWrapped::makeCurrent() const {
     }
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

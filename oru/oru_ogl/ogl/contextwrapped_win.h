@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/ogl/context.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Adopts a rendering context so that contexts of the library can share with it. Its owner keeps
 /// it, and should destroy this object first.
@@ -34,5 +33,4 @@ private:
     void adopt(HDC deviceContext, HWND window);
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -5,8 +5,7 @@
 
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Identifies one desktop output and its adapter; all texts are UTF-8, all empty by default.
 ///
@@ -23,5 +22,4 @@ struct ORU_API DisplayDeviceKey {
     std::string deviceID;    ///< the adapter's PCI device id in decimal
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

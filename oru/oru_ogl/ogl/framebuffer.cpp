@@ -11,8 +11,7 @@
 #include "oru/oru_ogl/ogl/texture3.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -147,5 +146,4 @@ bool Framebuffer::IsSupported() {
     return internal::Supports(GL_EXT_FRAMEBUFFER_OBJECT);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

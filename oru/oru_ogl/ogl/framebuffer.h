@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/ogl/object.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class Renderbuffer;
 class Texture2;
@@ -102,5 +101,4 @@ private:
     static unsigned int AttachmentFor(Renderbuffer const &renderbuffer, unsigned int colorIndex);
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

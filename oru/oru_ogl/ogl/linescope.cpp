@@ -5,8 +5,7 @@
 #include "oru/oru_ogl/ogl/internal/release.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 using internal::Release;
 
@@ -100,5 +99,4 @@ TemporaryLineWidthScope::~TemporaryLineWidthScope() {
         Release([this] { ORU_GL(LineWidth, saved_.width); });
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include "oru/core/utility/export.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 // The scopes put back at their end what they found, each by the one call that a difference needs: a
 // scope that found the state as wanted changes nothing at either end. They belong to OpenGL's
@@ -91,5 +90,4 @@ private:
     LineWidthState current_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/extensionator/glcall.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 Object::Object(unsigned int target, unsigned int targetBinding)
     : target_(target), targetBinding_(targetBinding) {}
@@ -22,5 +21,4 @@ void Object::changeTarget(unsigned int target, unsigned int targetBinding) {
     targetBinding_ = targetBinding;
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

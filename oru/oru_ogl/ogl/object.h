@@ -3,8 +3,7 @@
 
 #include "oru/core/utility/export.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// An OpenGL object's name, the target it is bound to, and the query for what is bound there.
 ///
@@ -48,5 +47,4 @@ private:
     unsigned int targetBinding_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

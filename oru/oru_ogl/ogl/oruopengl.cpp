@@ -4,8 +4,7 @@
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 void Enable(unsigned int program) {
     ORU_GL(UseProgram, program);
@@ -41,5 +40,4 @@ std::string GetGLString(unsigned int name) {
     return text ? reinterpret_cast<char const *>(text) : "";
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -5,8 +5,7 @@
 
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// @name Programs by their OpenGL name
 /// They check nothing themselves: a misuse is an OpenGL error, which the interceptor chain reports.
@@ -43,5 +42,4 @@ ORU_API void SetUniformSampler2D(unsigned int program, char const *name, unsigne
 /// @note glGetString, past the interceptor chain
 ORU_API std::string GetGLString(unsigned int name);
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

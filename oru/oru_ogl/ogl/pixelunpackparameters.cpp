@@ -5,8 +5,7 @@
 #include "oru/oru_ogl/ogl/internal/supported.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 void PixelUnpackParameters::setAlignment(unsigned int bytes) {
     switch (bytes) {
@@ -45,5 +44,4 @@ void PixelUnpackParameters::apply() const {
     set(GL_UNPACK_ALIGNMENT, std::size_t(1) << alignment_);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

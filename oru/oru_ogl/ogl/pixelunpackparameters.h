@@ -5,8 +5,7 @@
 
 #include <cstddef>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// The client pixel layout of an upload, in terms of glPixelStore. By default rows follow each
 /// other without gaps, which differs from OpenGL's own default of rows aligned to 4 bytes.
@@ -69,5 +68,4 @@ private:
     Alignment alignment_ = ALIGNMENT_1;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

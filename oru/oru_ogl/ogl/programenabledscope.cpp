@@ -5,8 +5,7 @@
 #include "oru/oru_ogl/ogl/internal/release.h"
 #include "oru/oru_ogl/ogl/programogl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 ProgramEnabledScope::ProgramEnabledScope(Program *theProgram) : theProgram_(theProgram) {
     ORU_ASSERT(theProgram);
@@ -25,5 +24,4 @@ void ProgramEnabledScope::enable(Program *program) {
     theProgram_->enable();
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include "oru/core/utility/export.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class Program;
 
@@ -32,5 +31,4 @@ private:
     Program *theProgram_ = nullptr;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

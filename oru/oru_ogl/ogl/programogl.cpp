@@ -4,8 +4,7 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/ogl/internal/programimplcore.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 Program::Program() {
     if (!ProgramImplCore::IsSupported())
@@ -127,5 +126,4 @@ void Program::assertActiveUniformType(int location, unsigned int glType, unsigne
     }
 #include "oru/oru_ogl/ogl/uniformoperations.inc"
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

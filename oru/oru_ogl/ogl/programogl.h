@@ -4,8 +4,7 @@
 #include "oru/core/utility/export.h"
 #include "oru/core/utility/scopedptr.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class ProgramImpl;
 class Shader;
@@ -169,5 +168,4 @@ private:
     ScopedPtr<ProgramImpl> actualProgram_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

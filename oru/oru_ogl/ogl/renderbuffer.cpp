@@ -8,8 +8,7 @@
 #include "oru/oru_ogl/ogl/internal/supported.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -95,5 +94,4 @@ bool Renderbuffer::IsSupported() {
     return internal::Supports(GL_EXT_FRAMEBUFFER_OBJECT);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/ogl/object.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// One renderbuffer of GL_EXT_framebuffer_object; attach it to a Framebuffer.
 class ORU_API Renderbuffer : public Object {
@@ -56,5 +55,4 @@ private:
     int height_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -5,8 +5,7 @@
 #include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 ScopedContextWrapper::ScopedContextWrapper(bool restore)
     : deviceContext_(::wglGetCurrentDC()), renderContext_(::wglGetCurrentContext()),
@@ -29,5 +28,4 @@ void ReleaseOGLContext() {
         ::wglMakeCurrent(nullptr, nullptr);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -4,8 +4,7 @@
 #include "oru/core/utility/export.h"
 #include "oru/core/utility/windowsforward.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Makes the context and device context that it found current again at its end, on the same thread.
 /// While both are still current then, it makes no WGL call.
@@ -29,5 +28,4 @@ private:
 /// Makes no context current on the calling thread.
 ORU_API void ReleaseOGLContext();
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

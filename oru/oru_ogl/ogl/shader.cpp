@@ -4,8 +4,7 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/ogl/internal/shaderimplcore.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 Shader::Shader(ShaderType type) {
     if (!IsSupported(type))
@@ -56,5 +55,4 @@ void Shader::getInfoLog(int maxLength, char *buffer) {
     body().getInfoLog(maxLength, buffer);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

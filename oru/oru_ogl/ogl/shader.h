@@ -6,8 +6,7 @@
 
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class ShaderImpl;
 
@@ -106,5 +105,4 @@ public:
     ComputeShader() : Shader(SHADERTYPE_COMPUTE) {}
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

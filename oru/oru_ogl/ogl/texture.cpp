@@ -12,8 +12,7 @@
 
 #include <ostream>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -396,5 +395,4 @@ std::ostream &operator<<(std::ostream &os, Texture::InternalFormat format) {
     return os << (row ? row->name : "UNKNOWN FORMAT");
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -8,8 +8,7 @@
 #include <cstdint>
 #include <iosfwd>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// A texture object with its storage; made as one of the kinds in texture1.h, texture2.h and
 /// texture3.h.
@@ -296,5 +295,4 @@ private:
 /// Writes the enumerator's name ("INTERNALFORMAT_RGBA8"), or "UNKNOWN FORMAT".
 ORU_API std::ostream &operator<<(std::ostream &os, Texture::InternalFormat format);
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

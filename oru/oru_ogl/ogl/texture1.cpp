@@ -9,8 +9,7 @@
 
 #include <optional>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 Texture1::Texture1(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
                    bool mipmapped)
@@ -99,5 +98,4 @@ std::size_t Texture1::pixelDataSize(int /*level*/, Format format, Type type) con
 Texture1D::Texture1D(InternalFormat format, std::uint64_t width, bool mipmapped)
     : Texture1(TARGET_TEXTURE_1D, TARGETBINDING_TEXTURE_BINDING_1D, format, width, mipmapped) {}
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

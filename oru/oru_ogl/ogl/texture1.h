@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/ogl/texture.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class Buffer;
 
@@ -76,5 +75,4 @@ public:
     Texture1D(InternalFormat format, std::uint64_t width, bool mipmapped);
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

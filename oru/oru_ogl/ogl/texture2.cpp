@@ -7,8 +7,7 @@
 #include "oru/oru_ogl/ogl/internal/texturestorage.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -174,5 +173,4 @@ std::uint64_t Texture1DArray::depth(unsigned int /*level*/) const {
     return Texture::depth(0);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

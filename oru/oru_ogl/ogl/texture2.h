@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/ogl/texture.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class Buffer;
 
@@ -120,5 +119,4 @@ public:
     std::uint64_t depth(unsigned int level) const override;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -7,8 +7,7 @@
 #include "oru/oru_ogl/ogl/internal/texturestorage.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// The part of construction that both ways share: `allocate` runs with the texture bound.
 template<class Allocate>
@@ -167,5 +166,4 @@ std::uint64_t Texture2DArray::depth(unsigned int /*level*/) const {
     return Texture::depth(0);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

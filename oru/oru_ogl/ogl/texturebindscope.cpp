@@ -9,8 +9,7 @@
 #include "oru/oru_ogl/ogl/textureunit.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 Texture2DBindScope::Texture2DBindScope(Texture2D *theTexture, unsigned int unit, bool active)
     : active_(active) {
@@ -48,5 +47,4 @@ void Texture2DBindScope::end() const noexcept {
     });
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

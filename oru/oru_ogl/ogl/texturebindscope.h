@@ -3,8 +3,7 @@
 
 #include "oru/core/utility/export.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class Texture2D;
 
@@ -34,5 +33,4 @@ private:
     bool active_;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

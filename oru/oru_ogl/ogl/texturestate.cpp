@@ -6,8 +6,7 @@
 #include "oru/oru_ogl/ogl/texture.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 namespace TextureState {
 
 unsigned int ActiveTextureUnit() {
@@ -29,5 +28,4 @@ bool SupportsNonPowerOfTwo() {
 }
 
 } // namespace TextureState
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

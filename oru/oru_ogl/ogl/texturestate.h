@@ -3,8 +3,7 @@
 
 #include "oru/core/utility/export.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 namespace TextureState {
 
 /// Index of the active unit, counted from 0. @note glGetIntegerv; needs OpenGL 1.3
@@ -21,5 +20,4 @@ ORU_API bool IsTargetSupported(unsigned int target);
 ORU_API bool SupportsNonPowerOfTwo();
 
 } // namespace TextureState
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

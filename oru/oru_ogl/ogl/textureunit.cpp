@@ -9,8 +9,7 @@
 #include "oru/oru_ogl/ogl/texturestate.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -84,5 +83,4 @@ bool TextureUnit::verifyActiveTexture() const {
     return TextureState::ActiveTextureUnit() == static_cast<unsigned int>(this - sUnits_);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include "oru/core/utility/export.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class Texture1D;
 class Texture2D;
@@ -91,5 +90,4 @@ private:
     static TextureUnit sUnits_[]; ///< a unit's index is its place here
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

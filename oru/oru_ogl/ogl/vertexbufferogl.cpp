@@ -11,8 +11,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -167,5 +166,4 @@ void VertexBuffer::drawPrimitives(std::size_t count) {
     ORU_GL(BindVertexArray, 0);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -7,8 +7,7 @@
 #include <string>
 #include <vector>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class Program;
 
@@ -165,5 +164,4 @@ private:
     std::vector<std::vector<unsigned char>> hostData_; ///< one array per field
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -4,9 +4,7 @@
 #include <tbb/concurrent_hash_map.h>
 #include <tbb/spin_mutex.h>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 namespace {
 
@@ -68,6 +66,4 @@ void ContextRegistry::Clear() {
     TheMap().clear();
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

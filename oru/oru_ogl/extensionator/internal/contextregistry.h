@@ -7,8 +7,7 @@
 #include <cstddef>
 #include <cstdint>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class ExtensionManager;
 struct FunctionTable;
@@ -77,5 +76,4 @@ private:
 };
 
 } // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

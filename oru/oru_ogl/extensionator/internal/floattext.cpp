@@ -6,9 +6,7 @@
 #include <cstdint>
 #include <cstring>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 namespace {
 
@@ -139,6 +137,4 @@ char *WriteNumber(char *out, double value) {
     return WriteDecimal(out, ToDecimal(static_cast<float>(magnitude)));
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

@@ -3,9 +3,7 @@
 
 #include <cstddef>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// Room that WriteNumber needs.
 std::size_t const kNumberRoom = 16;
@@ -16,6 +14,4 @@ std::size_t const kNumberRoom = 16;
 /// @return the end of the text
 char *WriteNumber(char *out, double value);
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

@@ -5,9 +5,7 @@
 
 #include <cstring>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// The address as a pointer to a function of another type. A plain cast between function types
 /// draws warnings that are right everywhere but here.
@@ -19,6 +17,4 @@ Function FunctionCast(PROC address) {
     return function;
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

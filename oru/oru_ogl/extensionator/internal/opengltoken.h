@@ -5,9 +5,7 @@
 
 #include <cstdint>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// A named OpenGL value.
 struct OpenGLToken {
@@ -19,6 +17,4 @@ struct OpenGLToken {
 /// The row of a value, or one with the name "Unknown Token".
 OpenGLToken const &FindOpenGLToken(GLenum value);
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

@@ -15,9 +15,7 @@
 #include <streambuf>
 #include <type_traits>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 namespace {
 
@@ -242,6 +240,4 @@ TraceLine &TraceLine::text(char const *value) {
     return *this;
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

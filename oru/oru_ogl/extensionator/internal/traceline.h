@@ -6,9 +6,7 @@
 #include <cstddef>
 #include <iosfwd>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// Composes the line of one traced call: the constructor its beginning, each further operation an
 /// argument, `write` its end.
@@ -81,6 +79,4 @@ private:
     char buffer_[kCapacity];
 };
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

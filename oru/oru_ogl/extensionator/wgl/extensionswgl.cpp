@@ -7,8 +7,7 @@
 
 #include <type_traits>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 #define ORU_WGL_POINTER(Result, Pointer, Parameters)                                               \
     Result(ORU_APIENTRY *Pointer) Parameters = nullptr;
@@ -41,5 +40,4 @@ bool InitializeWGLExtension(OpenGLExtension extension) {
 #define ORU_WGL_TYPE(Pointer, Type) static_assert(std::is_same_v<decltype(Pointer), Type>, #Type);
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl_types.inc"
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

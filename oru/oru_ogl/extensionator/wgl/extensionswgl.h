@@ -6,8 +6,7 @@
 #include "oru/oru_ogl/extensionator/openglextension.h"
 #include "oru/oru_ogl/gltypes.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 // Each pointer is null until a capability record that has its extension was built, and holds the
 // address that the latest such record found. They are written without a lock, always with what the
@@ -22,5 +21,4 @@ namespace OGL {
 /// @note wglGetProcAddress through the WGL chain
 ORU_API bool InitializeWGLExtension(OpenGLExtension extension);
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -3,8 +3,7 @@
 
 #include "oru/oru_ogl/extensionator/wgl/wglinterceptor.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// Forwards every operation to the next link. Override the operations of interest and call
 /// `WGLForwarder::wcgm<Name>` from them to go on along the chain.
@@ -71,5 +70,4 @@ public:
     }
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

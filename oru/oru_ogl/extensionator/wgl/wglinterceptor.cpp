@@ -5,8 +5,7 @@
 #include "oru/core/utility/sharedptr.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 WGLInterceptor *WGLInterceptor::sInterceptor_ = nullptr;
 
@@ -136,5 +135,4 @@ DWORD WGLErrorChecker::wcgmSwapMultipleBuffers(char const *, unsigned int, UINT 
     return ::wglSwapMultipleBuffers(count, swaps);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -4,8 +4,7 @@
 #include "oru/core/utility/export.h"
 #include "oru/core/utility/windowsforward.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class WGLInterceptorDecorator;
 
@@ -124,5 +123,4 @@ public:
                                           _WGLSWAP const *swaps);
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -5,9 +5,7 @@
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 ContextBootstrap::ContextBootstrap(DisplayDeviceKey const &key) : Context(key) {
     auto const origin = DisplayOrigin(key.adapterName, true);
@@ -39,6 +37,4 @@ ContextBootstrap::~ContextBootstrap() {
     }
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

@@ -5,9 +5,7 @@
 #include "oru/oru_ogl/internalwindow.h"
 #include "oru/oru_ogl/ogl/context.h"
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// A context on a hidden window of a display device. It is neither made current nor registered nor
 /// in a share group.
@@ -20,6 +18,4 @@ private:
     ScopedPtr<InternalWindow> window_;
 };
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

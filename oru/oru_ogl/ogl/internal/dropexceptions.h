@@ -1,9 +1,7 @@
 // One step of a destructor that must not fail.
 #pragma once
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// Runs a step of a clean-up and drops what it throws, so that the next step runs too.
 template<class Step>
@@ -15,6 +13,4 @@ void DropExceptions(Step step) noexcept {
     }
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

@@ -3,9 +3,7 @@
 
 #include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// Runs an action once: with `now()`, which lets its failure out, or else, when an exception ends
 /// the scope first, in the destructor, which drops it.
@@ -36,6 +34,4 @@ private:
     bool pending_ = true;
 };
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

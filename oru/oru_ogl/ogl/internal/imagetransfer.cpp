@@ -3,9 +3,7 @@
 
 #include "oru/core/utility/composetext.h"
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 void ThrowPart(char const *operation, int level, std::initializer_list<Side> sides) {
     for (Side const &side : sides) {
@@ -42,6 +40,4 @@ void CheckByteAlignment(unsigned int bytes) {
         ORU_THROW_INTERNAL("Invalid row byte alignment (must be of 1, 2, 4, or 8).");
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

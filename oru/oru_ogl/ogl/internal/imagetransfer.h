@@ -12,9 +12,7 @@
 #include <cstdint>
 #include <initializer_list>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// One side of the part of an image that a transfer writes.
 struct Side {
@@ -80,6 +78,4 @@ void WithUnpackState(PixelUnpackParameters const &parameters, Upload upload) {
     ORU_GL0(PopClientAttrib);
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

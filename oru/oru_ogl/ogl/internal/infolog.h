@@ -3,9 +3,7 @@
 
 #include <string>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// The log of `length` bytes, its final zero among them, up to the first zero.
 template<class Body>
@@ -16,6 +14,4 @@ std::string ReadInfoLog(Body &body, int length) {
     return log;
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

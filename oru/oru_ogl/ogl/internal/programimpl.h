@@ -3,8 +3,7 @@
 
 #include "oru/core/utility/export.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 class Shader;
 
@@ -53,5 +52,4 @@ public:
     virtual void getInfoLog(int maxLength, char *buffer) = 0;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -9,8 +9,7 @@
 #include "oru/oru_ogl/ogl/internal/supported.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -223,5 +222,4 @@ void ProgramImplCore::getInfoLog(int maxLength, char *buffer) {
     ORU_GL(GetProgramInfoLog, programID_, maxLength, &written, buffer);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -4,8 +4,7 @@
 #include "oru/oru_ogl/ogl/internal/programimpl.h"
 #include "oru/oru_ogl/ogl/shader.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// A body that owns one OpenGL program object.
 class ORU_API ProgramImplCore : public ProgramImpl {
@@ -60,5 +59,4 @@ private:
     unsigned int programID_ = 0;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

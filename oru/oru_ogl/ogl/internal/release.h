@@ -4,9 +4,7 @@
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// Runs the step of a destructor that deletes GL objects, and drops what it throws. Without a
 /// current context, in which no entry point beyond OpenGL 1.1 has an address, it does nothing: the
@@ -19,6 +17,4 @@ void Release(Step step) noexcept {
     });
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

@@ -5,8 +5,7 @@
 
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// The body of a Shader; each operation is documented at the handle's of the same name.
 class ORU_API ShaderImpl {
@@ -25,5 +24,4 @@ public:
     virtual void load(unsigned int count, char const *const *strings, int const *lengths) = 0;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

@@ -9,8 +9,7 @@
 #include "oru/oru_ogl/ogl/internal/translation.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 namespace {
 
@@ -102,5 +101,4 @@ void ShaderImplCore::getInfoLog(int maxLength, char *buffer) {
     ORU_GL(GetShaderInfoLog, shaderID_, maxLength, &written, buffer);
 }
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

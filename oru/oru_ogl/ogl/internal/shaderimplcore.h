@@ -4,8 +4,7 @@
 #include "oru/oru_ogl/ogl/internal/shaderimpl.h"
 #include "oru/oru_ogl/ogl/shader.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 
 /// A body that owns one OpenGL shader object.
 class ORU_API ShaderImplCore : public ShaderImpl {
@@ -31,5 +30,4 @@ private:
     unsigned int shaderID_ = 0;
 };
 
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL

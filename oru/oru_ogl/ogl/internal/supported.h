@@ -4,9 +4,7 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// Whether there is a current context and a test of its record holds:
 /// `CurrentRecord(&ExtensionManager::supportsTexture3D)`.
@@ -21,9 +19,7 @@ inline bool Supports(OpenGLExtension e) {
     return CurrentRecord(&ExtensionManager::isSupported, e);
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal
 
 /// Throws InternalException unless the current context has a capability.
 #define ORU_ASSERT_SUPPORTED(e)                                                                    \

@@ -6,9 +6,7 @@
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 TemporaryContext::~TemporaryContext() {
     try {
@@ -41,6 +39,4 @@ bool TemporaryContext::release() {
     return isDeleted;
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

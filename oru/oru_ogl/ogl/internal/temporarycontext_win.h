@@ -5,9 +5,7 @@
 #include "oru/core/utility/windowsforward.h"
 #include "oru/oru_ogl/internalwindow.h"
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// Owns a hidden window and a rendering context on it; both may be absent.
 class TemporaryContext {
@@ -34,6 +32,4 @@ private:
     HGLRC renderContext_ = nullptr;
 };
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

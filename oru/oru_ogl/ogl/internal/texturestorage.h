@@ -9,9 +9,7 @@
 #include <cstdint>
 #include <limits>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 /// A size as OpenGL takes it; one that does not fit becomes negative, which OpenGL refuses.
 inline GLsizei ToGLsizei(std::uint64_t size) {
@@ -48,6 +46,4 @@ void ForEachLevel(std::array<GLsizei, Sides> sides, std::size_t halved, bool mip
     }
 }
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal

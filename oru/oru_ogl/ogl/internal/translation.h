@@ -5,9 +5,7 @@
 
 #include <cstddef>
 
-namespace ORU {
-namespace OGL {
-namespace internal {
+namespace ORU::OGL::internal {
 
 template<class Enumeration>
 struct TranslationRow {
@@ -55,9 +53,7 @@ struct Translation {
     }
 };
 
-} // namespace internal
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL::internal
 
 /// The first three fields of a table, with the text that the check of a negated literal has.
 #define ORU_TRANSLATION_FAILURE(text) __FILE__, __LINE__, "!\"" text "\""
