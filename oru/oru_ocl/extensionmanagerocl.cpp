@@ -8,8 +8,10 @@
 
 #include "oru/core/exceptions/checks.h"
 
+#include <algorithm>
 #include <cstddef>
 #include <cstring>
+#include <iterator>
 #include <string_view>
 #include <type_traits>
 
@@ -50,6 +52,13 @@ bool IsExtension(Enum::Extension extension) {
     return static_cast<std::size_t>(extension) < std::size(extensionNames);
 }
 
+Enum::Extension ExtensionOf(std::string_view name) {
+    auto const *const found = std::find(std::begin(extensionNames), std::end(extensionNames), name);
+    return found == std::end(extensionNames)
+               ? Enum::EXTENSION_UNKNOWN
+               : static_cast<Enum::Extension>(found - std::begin(extensionNames));
+}
+
 struct Version {
     unsigned int major = 0;
     unsigned int minor = 0;
@@ -87,6 +96,7 @@ std::vector<Version> PlatformVersions(FunctionTable const &table) {
     error = table.clGetPlatformIDs(count, platforms.data(), nullptr);
     ORU_ASSERT(CL_SUCCESS == error);
     std::vector<Version> versions;
+    versions.reserve(platforms.size());
     for (cl_platform_id platform : platforms)
         versions.push_back(PlatformVersion(table, platform));
     return versions;
@@ -112,7 +122,7 @@ ExtensionManager *ExtensionManager::create(HINSTANCE library) {
     ORU_ASSERT(extMgrInstance_);
     sTable_ = extMgrInstance_->table_.get();
     std::vector<Version> const platformVersions = PlatformVersions(extMgrInstance_->table());
-    ORU_ASSERT(platformVersions.size() > 0);
+    ORU_ASSERT(platformVersions.size() > 0); // NOLINT(readability-container-size-empty): the text
     // The loader exports one set of entry points for all platforms; the first platform decides, so
     // that a caller finds the same slots however many runtimes are installed beside it.
     Version const version = platformVersions.front();
@@ -160,14 +170,11 @@ bool ExtensionManager::zeroSymbolsForExtensionCL(Enum::Extension extension) {
 void ExtensionManager::zeroAllSymbolsCL() {}
 
 Enum::Extension ExtensionManager::nameToExtensionEnum(char const *name) {
-    for (std::size_t i = 0; i < std::size(extensionNames); ++i)
-        if (std::strcmp(name, extensionNames[i]) == 0)
-            return static_cast<Enum::Extension>(i);
-    return Enum::EXTENSION_UNKNOWN;
+    return ExtensionOf(name);
 }
 
 Enum::Extension ExtensionManager::nameToExtensionEnum(std::string const &name) {
-    return nameToExtensionEnum(name.c_str());
+    return ExtensionOf(name);
 }
 
 std::string ExtensionManager::ExtensionEnumToString(Enum::Extension extension) {

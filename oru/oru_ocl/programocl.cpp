@@ -108,6 +108,7 @@ Program::BinaryArray::BinaryArray(std::vector<Device> const &devs,
                                   std::vector<std::size_t> const &sizes,
                                   std::vector<std::vector<unsigned char>> const &binaries)
     : sizes_(sizes), binaries_(binaries) {
+    devices_.reserve(devs.size());
     for (Device const &device : devs)
         devices_.push_back(device.id());
     ORU_ASSERT(devs.size() == sizes.size());
@@ -123,6 +124,7 @@ Program::BinaryArray::BinaryArray(std::vector<cl_device_id> const &devs, std::si
 
 std::vector<unsigned char const *> Program::BinaryArray::binaries() const {
     std::vector<unsigned char const *> pointers;
+    pointers.reserve(binaries_.size());
     for (std::vector<unsigned char> const &binary : binaries_)
         pointers.push_back(binary.data());
     return pointers;

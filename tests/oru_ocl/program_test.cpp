@@ -146,7 +146,8 @@ TEST_F(ProgramTest, AnAsynchronousBuildCallsBack) {
 TEST_F(ProgramTest, MovedAndAssignedProgramsKeepTheirHandles) {
     Program first = build(threeKernels);
     Program second = std::move(first);
-    EXPECT_EQ(first.id(), second.id()) << "the source of a move keeps its handle";
+    // The source of a move keeps its handle. NOLINTNEXTLINE(bugprone-use-after-move)
+    EXPECT_EQ(first.id(), second.id());
     EXPECT_EQ(2, runtime()->references(second.id()));
     second = Program(context, "kernel void other() {}");
     EXPECT_EQ(1, runtime()->references(first.id()));

@@ -31,7 +31,8 @@ cl_int AnswerExtensions(Query query, std::size_t room, void *result, std::size_t
     std::string text(size, '\0');
     if (cl_int const error = query(size, text.data(), nullptr))
         return error;
-    return AnswerText(std::string(text.c_str()) + " cl_khr_gl_sharing", room, result, sizeReturned);
+    text.resize(std::strlen(text.c_str()));
+    return AnswerText(text + " cl_khr_gl_sharing", room, result, sizeReturned);
 }
 
 cl_int CL_API_CALL GetPlatformIDs(cl_uint count, cl_platform_id *platforms, cl_uint *found) {
