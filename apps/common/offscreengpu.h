@@ -10,11 +10,9 @@
 #include <memory>
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 class OpenGLTracer;
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL
 
 namespace App {
 

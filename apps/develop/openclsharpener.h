@@ -7,11 +7,9 @@
 #include "oru/oru_ocl/commandqueue.h"
 #include "oru/oru_ocl/programocl.h"
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 class Context;
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL
 
 namespace Develop {
 

@@ -7,11 +7,9 @@
 
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 class Texture2D;
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL
 
 namespace Develop {
 

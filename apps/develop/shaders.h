@@ -5,11 +5,9 @@
 #include <cstddef>
 #include <string>
 
-namespace ORU {
-namespace OGL {
+namespace ORU::OGL {
 class Program;
-} // namespace OGL
-} // namespace ORU
+} // namespace ORU::OGL
 
 namespace Develop {
 

@@ -107,7 +107,7 @@ Bytes Jpeg(JpegKind kind) {
                                                      : JCS_CMYK;
     jpeg_set_defaults(&codec);
     jpeg_start_compress(&codec, TRUE);
-    Bytes row(33 * 4);
+    Bytes row(132);
     for (unsigned int y = 0; y < 17; ++y) {
         for (unsigned int i = 0; i < row.size(); ++i)
             row[i] = static_cast<unsigned char>(i + 8 * y);

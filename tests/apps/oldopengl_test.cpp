@@ -11,7 +11,9 @@ namespace {
 using DevelopOnOldOpenGL = DevelopFixture;
 
 TEST_F(DevelopOnOldOpenGL, WorksFromVersion3On) {
-    std::string const version = std::getenv("ORU_TEST_VERSION");
+    char const *const setting = std::getenv("ORU_TEST_VERSION");
+    ASSERT_NE(setting, nullptr);
+    std::string const version = setting;
     App::Image const colour = EveryValue(4, 16);
     App::Image const grey = EveryValue(1, 8);
     write("colour.png", colour);

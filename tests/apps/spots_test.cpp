@@ -34,7 +34,8 @@ double WorstSpotError(Image const &original, Image const &developed, SpotList co
     for (std::size_t i = 0; i < ValueCount(original); ++i) {
         std::size_t const pixel = i / original.channels;
         double const x = static_cast<double>(pixel % original.width) + 0.5;
-        double const y = static_cast<double>(pixel / original.width) + 0.5;
+        std::size_t const row = pixel / original.width;
+        double const y = static_cast<double>(row) + 0.5;
         double const exact =
             IsAlpha(original, i)
                 ? Value(original, i)
