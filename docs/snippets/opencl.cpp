@@ -106,7 +106,7 @@ TEST_F(OpenCLGuide, ChoosesGroupSizes) {
         kernel void mark(global int *marks) {
             marks[get_global_id(1) * get_global_size(0) + get_global_id(0)] = get_local_size(0);
         })");
-    std::vector<int> marks(64 * 32);
+    std::vector<int> marks(2048);
     Buffer const buffer(context, Memory::MEMORY_WRITE_ONLY, false, marks.size() * sizeof(int));
     Kernel kernel = program.kernel("mark");
     kernel.setArg(0, buffer);
@@ -115,7 +115,7 @@ TEST_F(OpenCLGuide, ChoosesGroupSizes) {
     queue.enqueueKernel(kernel, Range<2>(64, 32), Range<2>(16, 8), 0);
     // [ranges]
     queue.enqueueBlockingRead(buffer, 0, marks.size() * sizeof(int), marks.data());
-    EXPECT_EQ(std::vector<int>(64 * 32, 16), marks);
+    EXPECT_EQ(std::vector<int>(2048, 16), marks);
 }
 
 TEST_F(OpenCLGuide, ShowsTheBuildLog) {
@@ -132,7 +132,7 @@ TEST_F(OpenCLGuide, ShowsTheBuildLog) {
 }
 
 TEST_F(OpenCLGuide, ReadsImages) {
-    std::vector<unsigned char> pixels(8 * 8 * 4, 100);
+    std::vector<unsigned char> pixels(256, 100);
     // [image]
     cl_image_format const rgba8 = {CL_RGBA, CL_UNORM_INT8};
     Image2D const source(context, Memory::MEMORY_READ_ONLY, false, rgba8, 8, 8, 0, pixels.data());
@@ -152,11 +152,11 @@ TEST_F(OpenCLGuide, ReadsImages) {
     shrink.setArg(2, target);
     queue.enqueueKernel(shrink, Range<2>(4, 4), 0, 0);
 
-    std::vector<unsigned char> small(4 * 4 * 4);
+    std::vector<unsigned char> small(64);
     ORU::IntegerRect const all({0, 0}, ORU::size2(4, 4));
     queue.enqueueBlockingRead(target, all, small.data(), 0);
     // [image]
-    EXPECT_EQ(std::vector<unsigned char>(4 * 4 * 4, 100), small);
+    EXPECT_EQ(std::vector<unsigned char>(64, 100), small);
 }
 
 TEST_F(OpenCLGuide, WaitsForEvents) {
@@ -220,7 +220,7 @@ TEST_F(OpenCLSharingGuide, WorksOnATexture) {
     using ORU::OGL::Texture;
     ORU::OGL::Texture2D picture(Texture::INTERNALFORMAT_RGBA8, 16, 16, false);
     ORU::OGL::Texture2D negative(Texture::INTERNALFORMAT_RGBA8, 16, 16, false);
-    std::vector<unsigned char> pixels(16 * 16 * 4);
+    std::vector<unsigned char> pixels(1024);
     std::iota(pixels.begin(), pixels.end(), static_cast<unsigned char>(0));
     ORU_GL(BindTexture, picture.target(), picture.objectID());
     ORU_GL(TexSubImage2D, picture.target(), 0, 0, 0, 16, 16, GL_RGBA, GL_UNSIGNED_BYTE,

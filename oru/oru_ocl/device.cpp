@@ -21,9 +21,10 @@ std::string Device::getStringInfo(Enum::DeviceProperty property) const {
     // clang-format off
     ORU_ASSERT(GetPropertyTypeName(property) == Enum::GetTypeName<char*>());
     // clang-format on
-    std::string text = QueryText([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-        getInfoImpl(property, bytes, value, bytesReturned);
-    });
+    std::string text =
+        QueryCharacters([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
+            getInfoImpl(property, bytes, value, bytesReturned);
+        });
     if (!text.empty())
         text.pop_back();
     return text;

@@ -9,11 +9,9 @@ namespace ORU::OCL {
 
 std::string Platform::info(cl_platform_info query) const {
     ORU_ASSERT(id() != 0);
-    std::string const text =
-        QueryText([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-            ORU_CL(GetPlatformInfo, id(), query, bytes, value, bytesReturned);
-        });
-    return text.c_str();
+    return QueryText([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
+        ORU_CL(GetPlatformInfo, id(), query, bytes, value, bytesReturned);
+    });
 }
 
 std::string Platform::name() const {

@@ -60,12 +60,10 @@ void Program::build(std::vector<Device> const &devices, std::string const &optio
 }
 
 std::string Program::buildLog(Device const &device) {
-    std::string const log =
-        QueryText([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
-            ORU_CL(GetProgramBuildInfo, id(), device.id(), CL_PROGRAM_BUILD_LOG, bytes, value,
-                   bytesReturned);
-        });
-    return log.c_str();
+    return QueryText([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
+        ORU_CL(GetProgramBuildInfo, id(), device.id(), CL_PROGRAM_BUILD_LOG, bytes, value,
+               bytesReturned);
+    });
 }
 
 Program::BuildStatus Program::buildStatus(Device const &device) {

@@ -116,7 +116,7 @@ TEST_F(MemoryTest, ImagesKeepTheirPixels) {
     }
 
     // A rectangle into rows that are further apart: nothing else is touched.
-    std::vector<unsigned char> target(10 * 3, 0xEE), expected = target;
+    std::vector<unsigned char> target(30, 0xEE), expected = target;
     for (std::size_t y = 0; y < 3; ++y)
         std::copy_n(dense.begin() + std::ptrdiff_t(((y + 1) * width + 2) * 4), 8,
                     expected.begin() + std::ptrdiff_t(y * 10));

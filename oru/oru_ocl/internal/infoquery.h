@@ -4,6 +4,7 @@
 #include "oru/oru_ocl/openclheaders.h"
 
 #include <cstddef>
+#include <cstring>
 #include <string>
 #include <vector>
 
@@ -19,14 +20,21 @@ std::vector<T> QueryList(Query const &query) {
     return list;
 }
 
-/// Reads the text that `query(bytes, value, bytesReturned)` answers, with its terminator as the
-/// last character.
+/// Reads the characters that `query(bytes, value, bytesReturned)` answers, terminator included.
 template<class Query>
-std::string QueryText(Query const &query) {
+std::string QueryCharacters(Query const &query) {
     std::size_t bytes = 0;
     query(std::size_t(0), nullptr, &bytes);
     std::string text(bytes, '\0');
     query(bytes, text.data(), nullptr);
+    return text;
+}
+
+/// The same up to the first terminator.
+template<class Query>
+std::string QueryText(Query const &query) {
+    std::string text = QueryCharacters(query);
+    text.resize(std::strlen(text.c_str()));
     return text;
 }
 

@@ -39,8 +39,8 @@ struct Functions {
 // One row for each of the channel orders that the extension lists for a component type.
 #define ORU_SHARED_FORMATS(Suffix, Type, ClType, R, RG, RGBA, Bytes)                               \
     {GL_R##Suffix, R, Type, {CL_R, ClType}, Bytes},                                                \
-        {GL_RG##Suffix, RG, Type, {CL_RG, ClType}, 2 * Bytes},                                     \
-        {GL_RGBA##Suffix, RGBA, Type, {CL_RGBA, ClType}, 4 * Bytes},
+        {GL_RG##Suffix, RG, Type, {CL_RG, ClType}, 2 * std::size_t(Bytes)},                        \
+        {GL_RGBA##Suffix, RGBA, Type, {CL_RGBA, ClType}, 4 * std::size_t(Bytes)},
 
 #define ORU_SHARED_FIXED(Suffix, Type, ClType, Bytes)                                              \
     ORU_SHARED_FORMATS(Suffix, Type, ClType, GL_RED, GL_RG, GL_RGBA, Bytes)
