@@ -3,6 +3,7 @@
 
 #include "apps/common/failure.h"
 #include "apps/common/jumpguard.h"
+#include "apps/common/orientation.h"
 
 #include <cstdio> // jpeglib.h needs it
 
@@ -54,10 +55,12 @@ public:
     Image decode(std::vector<unsigned char> const &bytes, SizeLimit limit) {
         run([&] {
             jpeg_create_decompress(&codec_);
+            jpeg_save_markers(&codec_, JPEG_APP0 + 1, 0xFFFF);
             jpeg_mem_src(&codec_, bytes.data(), static_cast<unsigned long>(bytes.size()));
             jpeg_read_header(&codec_, TRUE);
         });
         limit.require(codec_.image_width, codec_.image_height);
+        Orientation const held = orientation();
         codec_.out_color_space = outputColours();
         run([&] { jpeg_start_decompress(&codec_); });
         Image image({codec_.output_width, codec_.output_height,
@@ -69,7 +72,7 @@ public:
             }
             jpeg_finish_decompress(&codec_);
         });
-        return image;
+        return Upright(image, held);
     }
 
 private:
@@ -77,6 +80,14 @@ private:
     void run(Step const &step) {
         if (!Guarded(errors_.guard, step))
             throw Failure("damaged JPEG: " + errors_.guard.message);
+    }
+
+    Orientation orientation() const {
+        Orientation found = cUpright;
+        for (auto const *marker = codec_.marker_list; marker && found == cUpright;
+             marker = marker->next)
+            found = ReadOrientation(marker->data, marker->data_length);
+        return found;
     }
 
     J_COLOR_SPACE outputColours() const {

@@ -121,4 +121,18 @@ Bytes Jpeg(JpegKind kind) {
     return bytes;
 }
 
+Bytes JpegHeld(unsigned int orientation, bool bigEndian) {
+    auto const value = static_cast<unsigned char>(orientation);
+    Bytes const little = {'E',  'x', 'i', 'f', 0, 0, 'I', 'I', 42,    0, 8, 0, 0, 0, 1, 0,
+                          0x12, 1,   3,   0,   1, 0, 0,   0,   value, 0, 0, 0, 0, 0, 0, 0};
+    Bytes const big = {'E', 'x',  'i', 'f', 0, 0, 'M', 'M', 0, 42,    0, 0, 0, 8, 0, 1,
+                       1,   0x12, 0,   3,   0, 0, 0,   1,   0, value, 0, 0, 0, 0, 0, 0};
+    Bytes const &exif = bigEndian ? big : little;
+    Bytes jpeg = Jpeg(JpegKind::YCbCr);
+    Bytes segment = {0xFF, 0xE1, 0, static_cast<unsigned char>(exif.size() + 2)};
+    segment.insert(segment.end(), exif.begin(), exif.end());
+    jpeg.insert(jpeg.begin() + 2, segment.begin(), segment.end());
+    return jpeg;
+}
+
 } // namespace apps_test

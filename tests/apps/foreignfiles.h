@@ -26,4 +26,7 @@ enum class JpegKind { Grey, YCbCr, Cmyk };
 /// A smooth JPEG of 33 x 17 pixels.
 Bytes Jpeg(JpegKind kind);
 
+/// The same with Exif data in either byte order that tell the orientation.
+Bytes JpegHeld(unsigned int orientation, bool bigEndian);
+
 } // namespace apps_test

@@ -92,6 +92,26 @@ TEST(ImageFile, Jpegs) {
               std::string::npos);
 }
 
+// Where a pixel of the picture as it is stored comes to lie, for each way to hold a camera.
+TEST(ImageFile, TurnedJpegs) {
+    Image const stored = App::DecodeJpeg(Jpeg(JpegKind::YCbCr), cLimit);
+    std::size_t const right = stored.width - 1, bottom = stored.height - 1;
+    constexpr std::size_t x = 5, y = 3;
+    std::pair<std::size_t, std::size_t> const places[] = {
+        {x, y}, {right - x, y},  {right - x, bottom - y}, {x, bottom - y},
+        {y, x}, {bottom - y, x}, {bottom - y, right - x}, {y, right - x}};
+    for (unsigned int orientation = 1; orientation <= 8; ++orientation)
+        for (bool const bigEndian : {false, true}) {
+            Image const image = App::DecodeJpeg(JpegHeld(orientation, bigEndian), cLimit);
+            ASSERT_EQ(image.width, orientation < 5 ? stored.width : stored.height);
+            auto const [column, row] = places[orientation - 1];
+            for (std::size_t c = 0; c < 3; ++c)
+                EXPECT_EQ(image.row(row)[3 * column + c], stored.row(y)[3 * x + c])
+                    << "orientation " << orientation;
+        }
+    EXPECT_EQ(App::DecodeJpeg(JpegHeld(9, false), cLimit).pixels, stored.pixels);
+}
+
 // A file cut off anywhere is refused, never read half or beyond its end.
 TEST(ImageFile, CutOffAnywhere) {
     Bytes const png = App::EncodePng(RandomPicture({9, 4, 3, 16}, 1));
@@ -110,7 +130,7 @@ TEST(ImageFile, CutOffAnywhere) {
 // Flipped bytes are refused or read as something else, but do no harm.
 TEST(ImageFile, DamagedAnywhere) {
     Bytes const files[] = {App::EncodePng(RandomPicture({9, 4, 3, 8}, 1)), PalettePng(true),
-                           Jpeg(JpegKind::YCbCr)};
+                           JpegHeld(6, false)};
     for (Bytes const &file : files)
         for (std::size_t i = 3; i < file.size(); ++i) {
             Bytes damaged = file;
