@@ -49,7 +49,7 @@ private:
     ORU::OCL::Context context_;
     ORU::OCL::CommandQueue queue_;
     Kernels kernels_;
-    std::vector<float> host_; ///< the copy; kept, for new memory costs as much as copying
+    std::vector<float> host_; ///< the copy; kept, since new memory of its size is slow to get
 };
 
 } // namespace Develop
