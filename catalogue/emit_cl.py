@@ -109,7 +109,7 @@ def extension_enum(extensions):
 #pragma once
 
 """ + namespace("ORU::OCL::Enum", f"""/// An OpenCL version or extension; `ExtensionManager::ExtensionEnumToString` gives its name.
-enum Extension {{
+enum Extension : int {{
 {lines}
     EXTENSION_UNKNOWN = 16 ///< a name that is none of these
 }};""")
@@ -137,7 +137,7 @@ def property_enum(properties):
 #pragma once
 
 """ + namespace("ORU::OCL::Enum", f"""/// What can be asked of a device: the CL_DEVICE_* constants, given to the runtime unchanged.
-enum DeviceProperty {{
+enum DeviceProperty : unsigned int {{
 {lines}
 }};""")
 
