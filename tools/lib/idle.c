@@ -1,6 +1,7 @@
-/* Brings the desktop up, whose process Wine starts for the first program that needs it, and then sleeps
-   for ever, so that Wine's services stay up between programs: a program then starts in a tenth of a second
-   instead of three. With an argument it does not sleep: when it ends, everything is up. */
+/* Brings the desktop up, whose process Wine starts for the first program that needs it, and then
+   sleeps for ever, so that Wine's services stay up between programs: a program then starts in a
+   tenth of a second instead of three. With an argument it does not sleep: when it ends, everything
+   is up. */
 #include <windows.h>
 
 int WINAPI wWinMain(HINSTANCE instance, HINSTANCE previous, wchar_t *line, int show) {

@@ -36,8 +36,9 @@ TEST(Checks, ThrowTheirTextAndPosition) {
             action();
             ADD_FAILURE() << "nothing was thrown";
         } catch (InternalException const &e) {
-            EXPECT_EQ(Written(e), "ORU Internal exception tests/core/exceptions/exceptions_test.cpp:" +
-                                      std::to_string(line) + " (" + text + ")");
+            EXPECT_EQ(Written(e),
+                      "ORU Internal exception tests/core/exceptions/exceptions_test.cpp:" +
+                          std::to_string(line) + " (" + text + ")");
         }
     };
     // clang-format off
@@ -68,8 +69,8 @@ TEST(Exceptions, AreCaughtOutsideTheLibrary) {
         auto const &full = dynamic_cast<InternalException const &>(e);
         std::string const position =
             "oru/core/math/region_2d/boundingregionbase.cpp:" + std::to_string(full.line());
-        EXPECT_EQ(Written(e), "ORU Internal exception " + position +
-                                  " (vOutset.x >= 0.f && vOutset.y >= 0.f)");
+        EXPECT_EQ(Written(e),
+                  "ORU Internal exception " + position + " (vOutset.x >= 0.f && vOutset.y >= 0.f)");
     }
 }
 

@@ -96,8 +96,7 @@ TEST(BoundingRegionBase, GrowsAndShrinksByChecksAndVirtualOperations) {
     EXPECT_EQ(triangle.dilatedBy_, Rect(-1, -2, 1, 2));
     EXPECT_EQ(triangle.erodedBy_, Rect(-3, 0, 3, 0));
     for (Vec const &bad : {Vec(-1, 0), Vec(0, -1), Vec(nan, 0), Vec(0, nan)}) {
-        EXPECT_EQ(MessageOf([&] { square.outset(bad); }),
-                  "vOutset.x >= 0.f && vOutset.y >= 0.f");
+        EXPECT_EQ(MessageOf([&] { square.outset(bad); }), "vOutset.x >= 0.f && vOutset.y >= 0.f");
         EXPECT_EQ(MessageOf([&] { square.inset(bad); }), "vInset.x >= 0.f && vInset.y >= 0.f");
     }
     EXPECT_EQ(square, Rect(0, 0, 2, 2));
