@@ -39,6 +39,14 @@ UnitTarget const kUnitTargets[] = {
      nullptr, nullptr},
 };
 
+/// The unit's private question, reached by an explicit instantiation, which may name it.
+template<bool (TextureUnit::*Member)() const>
+struct Opened {
+    friend bool IsActive(TextureUnit const &unit) { return (unit.*Member)(); }
+};
+template struct Opened<&TextureUnit::verifyActiveTexture>;
+bool IsActive(TextureUnit const &unit);
+
 } // namespace
 
 class TextureUnitTest : public ObjectTest {};
@@ -52,6 +60,8 @@ TEST_F(TextureUnitTest, ActsOnTheActiveUnit) {
     for (unsigned int const index : {3u, 0u}) {
         TextureState::SetActiveTextureUnit(index);
         EXPECT_EQ(index, TextureState::ActiveTextureUnit());
+        EXPECT_TRUE(IsActive(*TextureUnit::Unit(index)));
+        EXPECT_FALSE(IsActive(*TextureUnit::Unit(3 - index)));
         TextureUnit const &unit = *TextureUnit::Unit(index);
         unit.bind(&one);
         unit.bind(&two);

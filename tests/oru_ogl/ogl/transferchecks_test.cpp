@@ -193,3 +193,35 @@ TEST_F(TransferChecksTest, UnpackParametersReachTheContext) {
     EXPECT_EQ("Enum value not recognized", MessageOf([&] { params.apply(); }));
     PixelUnpackParameters().apply();
 }
+
+TEST_F(TransferChecksTest, ByteAlignmentsAreSavedAndSet) {
+    struct Helpers : Texture2D {
+        using Texture::PopPixelTransferModes;
+        using Texture::PushAndSetReadbackByteAlignment;
+        using Texture::PushAndSetTransferByteAlignment;
+    };
+    struct {
+        void (*push)(unsigned int);
+        GLenum parameter;
+    } const rows[] = {{&Helpers::PushAndSetReadbackByteAlignment, GL_PACK_ALIGNMENT},
+                      {&Helpers::PushAndSetTransferByteAlignment, GL_UNPACK_ALIGNMENT}};
+    auto const get = [](GLenum parameter) {
+        GLint value = -1;
+        ORU_GL(GetIntegerv, parameter, &value);
+        return value;
+    };
+    for (auto const &row : rows) {
+        for (unsigned int bytes = 0; bytes < 10; ++bytes) {
+            std::string const message = MessageOf([&] { row.push(bytes); });
+            if (bytes == 1 || bytes == 2 || bytes == 4 || bytes == 8) {
+                EXPECT_EQ("", message);
+                EXPECT_EQ(static_cast<GLint>(bytes), get(row.parameter));
+                Helpers::PopPixelTransferModes();
+            } else {
+                EXPECT_EQ("Invalid row byte alignment (must be of 1, 2, 4, or 8).", message);
+            }
+            EXPECT_EQ(4, get(row.parameter));
+        }
+    }
+    EXPECT_EQ(0, get(GL_CLIENT_ATTRIB_STACK_DEPTH));
+}

@@ -1,6 +1,7 @@
 // What the texture constructors share: the arithmetic of sizes and mip levels.
 #pragma once
 
+#include "oru/core/utility/boundary.h"
 #include "oru/oru_ogl/gltypes.h"
 
 #include <algorithm>
@@ -17,10 +18,9 @@ inline GLsizei ToGLsizei(std::uint64_t size) {
     return size <= largest ? static_cast<GLsizei>(size) : -1;
 }
 
-/// Whether a size is a power of two or 0.
+/// Whether a size, in its low 32 bits, is a power of two or 0.
 inline bool IsPowerOfTwoSize(std::uint64_t size) {
-    auto const low = static_cast<std::uint32_t>(size);
-    return (low & (low - 1)) == 0;
+    return IsPowerOfTwo(static_cast<unsigned>(size));
 }
 
 /// Calls `allocate(level, sides)` for level 0 and, with mipmaps, for all levels below it.
