@@ -132,15 +132,13 @@ TEST_F(TextureUnitTest, ScopeLeavesTheUnitEmptyAndTheOtherActive) {
     EXPECT_EQ(0, Get(GL_TEXTURE_BINDING_2D));
     EXPECT_FALSE(TextureUnit::Unit(0)->isEnabled2D());
     Bind(texture);
-    for (int const parameter : {GL_TEXTURE_MIN_FILTER, GL_TEXTURE_MAG_FILTER}) {
+    for (auto const &[parameter, expected] : {std::pair(GL_TEXTURE_MIN_FILTER, GL_NEAREST),
+                                              std::pair(GL_TEXTURE_MAG_FILTER, GL_NEAREST),
+                                              std::pair(GL_TEXTURE_WRAP_S, GL_CLAMP_TO_EDGE),
+                                              std::pair(GL_TEXTURE_WRAP_T, GL_CLAMP_TO_EDGE)}) {
         GLint value = 0;
         ORU_GL(GetTexParameteriv, GL_TEXTURE_2D, static_cast<GLenum>(parameter), &value);
-        EXPECT_EQ(GL_NEAREST, value);
-    }
-    for (int const parameter : {GL_TEXTURE_WRAP_S, GL_TEXTURE_WRAP_T}) {
-        GLint value = 0;
-        ORU_GL(GetTexParameteriv, GL_TEXTURE_2D, static_cast<GLenum>(parameter), &value);
-        EXPECT_EQ(GL_CLAMP_TO_EDGE, value);
+        EXPECT_EQ(expected, value);
     }
     Unbind(texture);
 }
@@ -153,7 +151,7 @@ TEST_F(TextureUnitTest, ScopeMayBeInactiveOrFail) {
     }
     EXPECT_EQ("theTexture", MessageOf([] { Texture2DBindScope const scope(nullptr, 3, true); }));
 
-    // The name is gone: binding it again and all after it may fail, the active unit comes back.
+    // There is no such unit; the active one stays.
     TextureState::SetActiveTextureUnit(1);
     Texture2D texture(Texture::INTERNALFORMAT_RGBA8, 4, 4, false);
     EXPECT_EQ("GL_INVALID_ENUM",
