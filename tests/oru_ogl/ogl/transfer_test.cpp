@@ -2,6 +2,8 @@
 // format, client layout and kind of texture.
 #include "texturekinds.h"
 
+#include "oru/core/utility/boundary.h"
+
 #include <algorithm>
 #include <cmath>
 #include <cstring>
@@ -250,7 +252,8 @@ TEST_F(TransferTest, EveryMemoryLayoutReachesEveryKind) {
                     std::copy_n(Sides{2, 1, 1}.begin(), kind.sides, skip.begin());
 
                 // Pixels of two 16-bit components: a row of 7 takes 28 bytes, or 32.
-                std::size_t const row = (28 + alignment - 1) / alignment * alignment;
+                std::size_t const row =
+                    ORU::IncrementToBoundaryPtr(28, static_cast<int>(alignment));
                 std::vector<std::uint16_t> source(row * 6 * 5 / 2);
                 std::iota(source.begin(), source.end(), std::uint16_t(1000));
                 PixelUnpackParameters params;
@@ -322,7 +325,7 @@ TEST_F(TransferTest, EveryKindIsReadWithAlignmentAndIntoABuffer) {
                kTight, static_cast<void const *>(image.texels.data()));
         std::size_t const rows = Size(size[1]) * Size(size[2]);
         for (unsigned int const alignment : {1u, 2u, 4u, 8u}) {
-            std::size_t const row = (5 + alignment - 1) / alignment * alignment;
+            std::size_t const row = ORU::IncrementToBoundaryPtr(5, static_cast<int>(alignment));
             std::vector<unsigned char> expected(rows * row, 0xEE), read(expected);
             for (std::size_t i = 0; i < rows; ++i)
                 std::copy_n(&image.texels[i * 5], 5, &expected[i * row]);
