@@ -21,7 +21,7 @@ class TestSummary(unittest.TestCase):
             expected.write_text(skips)
             self.out = io.StringIO()
             with contextlib.redirect_stdout(self.out):
-                return test_summary.main(results, expected)
+                return test_summary.main(expected, results)
 
     def test_listed_skips_pass_and_others_fail(self):
         cases = {"A.a": "run", "A.b": "notrun", "A.c": "disabled"}
@@ -40,6 +40,19 @@ class TestSummary(unittest.TestCase):
             self.verdict({})
         with self.assertRaises(SystemExit):
             self.verdict({"A.b": "notrun"}, "A.b  # everything was skipped\n")
+
+    def test_only_a_program_that_never_began_runs_again(self):
+        with tempfile.TemporaryDirectory() as folder:
+            first, second = pathlib.Path(folder, "1.xml"), pathlib.Path(folder, "2.xml")
+            expected = pathlib.Path(folder, "skips.txt")
+            expected.write_text("")
+            first.write_text('<testsuite><testcase name="A.a" status="fail"><system-out/></testcase>'
+                             '<testcase name="A.b" status="fail"><system-out>crash</system-out>'
+                             '</testcase><testcase name="A.c" status="run"/></testsuite>')
+            self.assertEqual(test_summary.unbegun(first), ["A.a"])
+            for again, failed in ("run", ["A.b"]), ("fail", ["A.a", "A.b"]):
+                second.write_text(f'<testsuite><testcase name="A.a" status="{again}"/></testsuite>')
+                self.assertEqual(test_summary.read_results([first, second])[1], failed)
 
     def test_a_reason_is_demanded(self):
         with self.assertRaises(SystemExit):

@@ -1,5 +1,9 @@
 # Sums up CTest's JUnit results and holds the skipped tests against the list of expected ones.
+#
+#     test_summary.py EXPECTED RESULTS...   sums up; a test in several results counts as in the last
+#     test_summary.py --unbegun RESULTS     prints a pattern of the failed tests whose program never began
 import collections
+import re
 import sys
 import xml.etree.ElementTree as ElementTree
 
@@ -17,18 +21,31 @@ def read_expected(path):
     return expected
 
 
-def read_results(path):
+def read_results(paths):
     """The names of the tests that passed, failed and were skipped, as CTest tells."""
+    last = {}
+    for path in paths:
+        statuses = collections.defaultdict(list)
+        for case in ElementTree.parse(path).iter("testcase"):
+            statuses[case.get("name")].append(case.get("status"))
+        last.update(statuses)
     results = {"run": [], "fail": [], "skipped": []}
-    for case in ElementTree.parse(path).iter("testcase"):
-        results.get(case.get("status"), results["skipped"]).append(case.get("name"))
+    for name, statuses in last.items():
+        for status in statuses:
+            results.get(status, results["skipped"]).append(name)
     return results["run"], results["fail"], results["skipped"]
 
 
-def main(results_path, expected_path):
+def unbegun(path):
+    """The failed tests that printed nothing: GoogleTest's first line comes before any test."""
+    return [case.get("name") for case in ElementTree.parse(path).iter("testcase")
+            if case.get("status") == "fail" and not (case.findtext("system-out") or "").strip()]
+
+
+def main(expected_path, *results_paths):
     expected = read_expected(expected_path)
     try:
-        passed, failed, skipped = read_results(results_path)
+        passed, failed, skipped = read_results(results_paths)
     except FileNotFoundError:
         raise SystemExit("No test ran.")
     names = collections.Counter(passed + failed + skipped)
@@ -51,4 +68,7 @@ def main(results_path, expected_path):
 
 
 if __name__ == "__main__":
-    sys.exit(main(*sys.argv[1:]))
+    if sys.argv[1] == "--unbegun":
+        print("|".join(re.escape(name) for name in unbegun(sys.argv[2])))
+    else:
+        sys.exit(main(*sys.argv[1:]))
