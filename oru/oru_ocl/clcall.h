@@ -44,15 +44,16 @@ struct CheckedCall<Result(CL_API_CALL *)(Parameters...), std::index_sequence<Ind
         if constexpr (sizeof...(Indices) < sizeof...(Parameters)) {
             cl_int error = CL_SUCCESS;
             Result const result = function(arguments..., &error);
-            check(error);
+            Check(file, line, error);
             return result;
         } else {
-            check(function(arguments...));
+            Check(file, line, function(arguments...));
         }
     }
 
 private:
-    void check(cl_int error) const {
+    /// Static, so that nothing needs the object in memory: the place stays in the throwing branch.
+    static void Check(char const *file, unsigned int line, cl_int error) {
         if (error != CL_SUCCESS)
             ThrowOCL(file, line, error);
     }
