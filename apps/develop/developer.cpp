@@ -84,7 +84,7 @@ void Developer::sharpen(Recipe const &recipe) {
 }
 
 void Developer::develop(Recipe const &recipe) {
-    bool const hasSpots = RegionOf(recipe.spots).isEmpty() == false;
+    bool const hasSpots = !RegionOf(recipe.spots).isEmpty();
     std::unique_ptr<Texture2D> const spots =
         hasSpots ? spotPainter_.paint(recipe.spots, area_) : nullptr;
     Texture2D const &source = light_ ? *light_ : *photo_;

@@ -18,9 +18,9 @@ namespace Develop {
 class OpenCLSharpener : public Sharpener {
 public:
     /// @param shared the OpenGL context to share with, current on this thread; null to copy
-    /// @throws ORU::LogicalException when the device does not want to, with a context to share at
-    /// any
-    ///         rate when it does not share with it
+    /// @throws ORU::LogicalException when the device refuses, as one does that cannot share with
+    ///         the context
+    /// @throws Failure when the device's compiler refuses the kernels
     OpenCLSharpener(OpenCLDevice const &device, ORU::OGL::Context const *shared);
 
     void sharpen(std::unique_ptr<ORU::OGL::Texture2D> &light, std::size_t channels,

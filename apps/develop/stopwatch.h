@@ -26,9 +26,8 @@ std::string Milliseconds(double milliseconds);
 /// The times of named stages, in their order.
 class StageTimes {
 public:
-    /// @param waitForGpu whether a stage ends when the GPU has done its work, so that its time is
-    /// its
-    ///        own; costs some time
+    /// @param waitForGpu whether a stage ends only when the GPU has done its work, so that its
+    ///        time is its own; costs some time
     explicit StageTimes(bool waitForGpu) : waitForGpu_(waitForGpu) {}
 
     /// Runs a stage and keeps its time.

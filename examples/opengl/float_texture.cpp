@@ -60,7 +60,7 @@ std::vector<float> ComputeLight() {
         everything.drawPrimitives();
     }
 
-    std::vector<float> values(kWidth * kHeight);
+    std::vector<float> values(std::size_t{kWidth} * kHeight);
     ORU_GL(BindTexture, light.target(), light.objectID());
     light.getPixelData(values.data(), 0, Texture::FORMAT_RED, Texture::TYPE_FLOAT, 4);
     return values;

@@ -19,9 +19,8 @@ namespace ORU::OGL {
 /// writes lines such as `app.cpp:86: glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MIN_FILTER, 9729)`.
 /// The form of an argument follows its type in the OpenGL prototype:
 /// - GLenum: the constant's name (see ORUOGLTokenName); GLboolean: GL_TRUE or GL_FALSE;
-/// - integers and bit masks in the stream's integer format; a GLhandleARB with "(GLhandleARB)"
-/// before
-///   it; GLbyte and GLubyte as one character;
+/// - integers and bit masks in the stream's integer format, a GLhandleARB after "(GLhandleARB)";
+///   GLbyte and GLubyte as one character;
 /// - GLdouble as the stream writes it; GLfloat as its bit pattern with the value in a comment:
 ///   `makeFloat(1065353216) /* 1 */`;
 /// - a text that names something (`char const *`) as it is; other pointers and GLsync as addresses.
