@@ -16,26 +16,35 @@
 
 namespace oru_test {
 
-/// The message of the InternalException that `call` throws.
+/// What a call throws: an internal exception's message or the name of an OpenCL error; empty when
+/// it throws nothing.
 template<class Call>
-std::string InternalMessage(Call call) {
-    try {
-        call();
-    } catch (ORU::InternalException const &e) {
-        return e.message();
-    }
-    return "nothing was thrown";
-}
-
-/// The code of the ExceptionOCL that `call` throws; CL_SUCCESS when it throws none.
-template<class Call>
-int ErrorCode(Call call) {
+std::string Thrown(Call call) {
     try {
         call();
     } catch (ORU::OCL::ExceptionOCL const &e) {
-        return static_cast<int>(e.errorNumber());
+        return ORU::OCL::ExceptionOCL::ErrorToCString(static_cast<int>(e.errorNumber()));
+    } catch (ORU::InternalException const &e) {
+        return e.message();
     }
-    return CL_SUCCESS;
+    return "";
+}
+#define EXPECT_THROWN(expected, ...)                                                               \
+    EXPECT_EQ(expected, ::oru_test::Thrown([&] { static_cast<void>(__VA_ARGS__); }))
+
+constexpr auto reads = ORU::OCL::Memory::MEMORY_READ_ONLY;
+constexpr auto writes = ORU::OCL::Memory::MEMORY_WRITE_ONLY;
+constexpr auto both = ORU::OCL::Memory::MEMORY_READ_WRITE;
+constexpr cl_image_format rgba8 = {CL_RGBA, CL_UNORM_INT8};
+
+/// What `getInfo` of a memory object answers.
+template<class T, class Object, class Query>
+T Get(Object const &object, Query query) {
+    T value{};
+    std::size_t size = 0;
+    object.getInfo(query, sizeof value, &value, &size);
+    EXPECT_EQ(sizeof value, size);
+    return value;
 }
 
 /// Every test must leave no handle behind. The layer stays open until the process ends, since only
@@ -44,7 +53,8 @@ class ComputeTest : public ::testing::Test {
 protected:
     ComputeTest() { runtime()->reset(); }
 
-    void TearDown() override { EXPECT_EQ(0u, runtime()->liveHandles()); }
+    /// The members of the test are gone here.
+    ~ComputeTest() override { EXPECT_EQ(0u, runtime()->liveHandles()); }
 
     static TestRuntime &runtime() {
         static TestRuntime instance = [] {
@@ -56,7 +66,10 @@ protected:
         return instance;
     }
 
-    static ORU::OCL::Platform platform() { return ORU::OCL::platforms().front(); }
+    static ORU::OCL::Platform platform() {
+        runtime(); // opens the layer, also for what is made before the fixture
+        return ORU::OCL::platforms().front();
+    }
     static ORU::OCL::Device device() {
         return platform().devices(ORU::OCL::Device::TYPE_ALL).front();
     }
@@ -68,17 +81,22 @@ protected:
 /// A test with a context and an in-order queue.
 class QueueTest : public ComputeTest {
 protected:
-    QueueTest() : context(makeContext()), queue(context, device(), false, false) {}
-
-    void TearDown() override {
-        // The members go after TearDown: what is left then are their two handles.
-        EXPECT_EQ(2u, runtime()->liveHandles());
-    }
+    explicit QueueTest(ORU::OCL::Context const &made = makeContext())
+        : context(made), queue(context, device(), false, false) {}
 
     ORU::OCL::Program build(std::string const &source, std::string const &options = "") const {
         ORU::OCL::Program program(context, source);
         program.build(options);
         return program;
+    }
+
+    /// The kernel `name` of a program, with its first argument.
+    template<class T>
+    static ORU::OCL::Kernel KernelOf(ORU::OCL::Program const &program, char const *name,
+                                     T const &argument) {
+        ORU::OCL::Kernel kernel = program.kernel(name);
+        kernel.setArg(0, argument);
+        return kernel;
     }
 
     template<class T>

@@ -11,132 +11,31 @@ using namespace oru_test;
 
 namespace {
 
+constexpr auto RGBA8 = OGL::Texture::INTERNALFORMAT_RGBA8;
+
 /// One object of each kind, for the failing calls to work on.
 class FailuresTest : public SharingTest {
 protected:
-    void TearDown() override {
-        // Context, queue and what the members below hold.
-        EXPECT_EQ(9u, runtime()->liveHandles());
-    }
-
-    std::vector<int> values = std::vector<int>(16);
-    cl_image_format format = {CL_RGBA, CL_UNORM_INT8};
+    std::vector<int> values = std::vector<int>(64);
     OGL::Buffer glBuffer{64, OGL::Buffer::TYPE_ARRAY_BUFFER, OGL::Buffer::USAGE_STATIC_DRAW,
                          nullptr};
-    OGL::Texture2D glTexture{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4, false};
-    OGL::Texture3D glVolume{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4, 4, false};
+    OGL::Texture2D glTexture{RGBA8, 4, 4, false};
+    OGL::Texture3D glVolume{RGBA8, 4, 4, 4, false};
     OGL::Renderbuffer glRenderbuffer{GL_RGBA8, 4, 4};
-    Buffer buffer{context, Memory::MEMORY_READ_WRITE, false, 64};
-    Buffer shared{context, Memory::MEMORY_READ_WRITE, glBuffer};
-    Image2D image{context, Memory::MEMORY_READ_WRITE, false, {CL_RGBA, CL_UNORM_INT8}, 4, 4, 0};
+    Buffer buffer{context, both, false, 64};
+    Buffer shared{context, both, glBuffer};
+    Image2D image{context, both, false, rgba8, 4, 4, 0};
     Sampler sampler{context, false, Sampler::ADDRESS_CLAMP, Sampler::FILTER_NEAREST};
-    Program program{context, "kernel void f(global int *v) { v[0] = 0; }"};
-    Kernel kernel = built();
+    Program program = build("kernel void f(global int *v) { v[0] = 0; }");
+    Kernel kernel = program.kernel("f");
     Event event = queue.enqueueMarker();
-
-    struct Case {
-        char const *entryPoint; ///< without its "cl"
-        unsigned int call;      ///< which of the operation's calls of it
-        char const *file;       ///< in oru/oru_ocl
-        std::function<void()> operation;
-    };
-
-    std::vector<Case> cases();
-
-private:
-    Kernel built() {
-        program.build("");
-        return program.kernel("f");
-    }
 };
 
-std::vector<FailuresTest::Case> FailuresTest::cases() {
-    auto const access = Memory::MEMORY_READ_WRITE;
-    ContextProperties const properties(platform());
-    Device const dev = device();
-    std::size_t const length = 2;
-    unsigned char const bytes[2] = {};
-    unsigned char const *pointer = bytes;
-    Program::BinaryArray const binaries({dev.id()}, &length, &pointer);
-    return {
-        {"GetPlatformIDs", 1, "platform.cpp", [] { platforms(); }},
-        {"GetPlatformIDs", 2, "platform.cpp", [] { platforms(); }},
-        {"GetPlatformInfo", 1, "platform.cpp", [=] { properties.platform().name(); }},
-        {"GetPlatformInfo", 2, "platform.cpp", [=] { properties.platform().profile(); }},
-        {"GetDeviceIDs", 1, "platform.cpp",
-         [=] { properties.platform().devices(Device::TYPE_ALL); }},
-        {"GetDeviceIDs", 2, "platform.cpp",
-         [=] { properties.platform().devices(Device::TYPE_ALL); }},
-        {"GetDeviceInfo", 1, "device.cpp", [=] { dev.type(); }},
-        {"GetDeviceInfo", 2, "device.cpp", [=] { dev.name(); }},
-        {"CreateContext", 1, "contextocl.cpp", [=] { Context(properties, dev); }},
-        {"CreateContextFromType", 1, "contextocl.cpp",
-         [=] { Context(properties, Device::TYPE_ALL); }},
-        {"GetContextInfo", 1, "contextocl.cpp", [=] { context.devices(); }},
-        {"GetContextInfo", 2, "contextocl.cpp", [=] { context.platform(); }},
-        {"CreateCommandQueue", 1, "commandqueue.cpp",
-         [=] { CommandQueue(context, dev, false, false); }},
-        {"CreateBuffer", 1, "bufferocl.cpp", [=] { Buffer(context, access, false, 4); }},
-        {"CreateBuffer", 1, "bufferocl.cpp",
-         [=] { Buffer(context, access, std::size_t(4), values.data()); }},
-        {"CreateBuffer", 1, "bufferocl.cpp",
-         [=] { Buffer(context, access, false, 4, values.data()); }},
-        {"CreateImage2D", 1, "image.cpp",
-         [=] { Image2D(context, access, false, format, 2, 2, 0); }},
-        {"CreateImage2D", 1, "image.cpp",
-         [=] { Image2D(context, access, format, 2, 2, 0, values.data()); }},
-        {"CreateImage3D", 1, "image.cpp",
-         [=] { Image3D(context, access, false, format, 2, 2, 2, 0, 0); }},
-        {"CreateImage3D", 1, "image.cpp",
-         [=] { Image3D(context, access, false, format, 2, 2, 2, 0, 0, values.data()); }},
-        {"GetMemObjectInfo", 1, "memory.cpp", [=] { buffer.memType(); }},
-        {"GetImageInfo", 1, "image.cpp",
-         [=] { image.getInfo(Image::IMAGEINFO_WIDTH, 0, nullptr, nullptr); }},
-        {"CreateSampler", 1, "sampler.cpp",
-         [=] { Sampler(context, false, Sampler::ADDRESS_CLAMP, Sampler::FILTER_LINEAR); }},
-        {"GetSamplerInfo", 1, "sampler.cpp", [=] { sampler.filterMode(); }},
-        {"CreateProgramWithSource", 1, "programocl.cpp", [=] { Program(context, "source"); }},
-        {"CreateProgramWithBinary", 1, "programocl.cpp", [=] { Program(context, binaries); }},
-        {"BuildProgram", 1, "programocl.cpp", [this] { program.build(""); }},
-        {"GetProgramBuildInfo", 1, "programocl.cpp", [=] { program.buildLog(dev); }},
-        {"GetProgramBuildInfo", 2, "programocl.cpp", [=] { program.buildStatus(dev); }},
-        {"CreateKernel", 1, "programocl.cpp", [this] { program.kernel("f"); }},
-        {"CreateKernelsInProgram", 1, "programocl.cpp", [this] { program.kernels(); }},
-        {"CreateKernelsInProgram", 2, "programocl.cpp", [this] { program.kernels(); }},
-        {"SetKernelArg", 1, "kernel.h", [this] { kernel.setArg(0, buffer); }},
-        {"WaitForEvents", 1, "event.cpp", [this] { event.wait(); }},
-        {"WaitForEvents", 1, "event.cpp", [this] { Event::WaitForEvents({event}); }},
-        {"GetEventInfo", 1, "event.cpp", [this] { event.commandType(); }},
-        {"GetEventInfo", 1, "event.cpp", [this] { event.commandQueue(); }},
-        {"Flush", 1, "commandqueue.cpp", [this] { queue.flush(); }},
-        {"Finish", 1, "commandqueue.cpp", [this] { queue.finish(); }},
-        {"EnqueueReadBuffer", 1, "commandqueue.cpp",
-         [this] { queue.enqueueRead(buffer, 0, 4, values.data()); }},
-        {"EnqueueWriteBuffer", 1, "commandqueue.cpp",
-         [this] { queue.enqueueBlockingWrite(buffer, 0, 4, values.data()); }},
-        {"GetMemObjectInfo", 1, "memory.cpp",
-         [this] {
-             queue.enqueueRead(image, ORU::IntegerRect({0, 0}, {2, 2}), values.data(), 0);
-         }},
-        {"EnqueueReadImage", 1, "commandqueue.cpp",
-         [this] {
-             queue.enqueueRead(image, ORU::IntegerRect({0, 0}, {2, 2}), values.data(), 0);
-         }},
-        {"EnqueueNDRangeKernel", 1, "commandqueue.cpp",
-         [this] { queue.enqueueKernel(kernel, Range<1>(1), 0, 0, {event}); }},
-        {"EnqueueMarker", 1, "commandqueue.cpp", [this] { queue.enqueueMarker(); }},
-        {"EnqueueBarrier", 1, "commandqueue.cpp", [this] { queue.enqueueBarrier(); }},
-        {"CreateFromGLBuffer", 1, "bufferocl.cpp", [=] { Buffer(context, access, glBuffer); }},
-        {"CreateFromGLTexture2D", 1, "image.cpp", [=] { Image2D(context, access, glTexture, 0); }},
-        {"CreateFromGLTexture3D", 1, "image.cpp", [=] { Image3D(context, access, glVolume, 0); }},
-        {"CreateFromGLRenderbuffer", 1, "image.cpp",
-         [=] { Image2D(context, access, glRenderbuffer); }},
-        {"EnqueueAcquireGLObjects", 1, "commandqueue.cpp",
-         [this] { queue.enqueueAcquireGLObjects({shared}); }},
-        {"EnqueueReleaseGLObjects", 1, "commandqueue.cpp",
-         [this] { queue.enqueueReleaseGLObjects({shared}); }},
-    };
-}
+struct Case {
+    char const *entryPoint; ///< without its "cl"
+    std::function<void()> operation;
+    unsigned int call = 1; ///< which of the operation's calls of the entry point
+};
 
 std::string SourceLine(std::string const &file, int line) {
     std::ifstream source(std::string(ORU_SOURCE_DIR "/") + file);
@@ -149,9 +48,72 @@ std::string SourceLine(std::string const &file, int line) {
 } // namespace
 
 TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
+    ContextProperties const properties(platform());
+    Platform const plat = properties.platform();
+    Device const dev = device();
+    std::size_t const length = 2;
+    unsigned char const bytes[2] = {};
+    unsigned char const *pointer = bytes;
+    Program::BinaryArray const binaries({dev.id()}, &length, &pointer);
+    ORU::IntegerRect const rect({0, 0}, {2, 2});
+    void *const data = values.data();
+    Case const cases[] = {
+        {"GetPlatformIDs", [] { platforms(); }, 2},
+        {"GetPlatformInfo", [&] { plat.profile(); }, 2},
+        {"GetDeviceIDs", [&] { plat.devices(Device::TYPE_ALL); }, 2},
+        {"GetDeviceInfo", [&] { dev.type(); }},
+        {"GetDeviceInfo", [&] { dev.name(); }, 2},
+        {"CreateContext", [&] { Context(properties, dev); }},
+        {"CreateContextFromType", [&] { Context(properties, Device::TYPE_ALL); }},
+        {"GetContextInfo", [&] { context.devices(); }},
+        {"GetContextInfo", [&] { context.platform(); }, 2},
+        {"CreateCommandQueue", [&] { CommandQueue(context, dev, false, false); }},
+        {"CreateBuffer", [&] { Buffer(context, both, false, 4); }},
+        {"CreateBuffer", [&] { Buffer(context, both, std::size_t(4), data); }},
+        {"CreateBuffer", [&] { Buffer(context, both, false, 4, data); }},
+        {"CreateImage2D", [&] { Image2D(context, both, false, rgba8, 2, 2, 0); }},
+        {"CreateImage2D", [&] { Image2D(context, both, rgba8, 2, 2, 0, data); }},
+        {"CreateImage2D", [&] { Image2D(context, both, false, rgba8, 2, 2, 0, data); }},
+        {"CreateImage3D", [&] { Image3D(context, both, false, rgba8, 2, 2, 2, 0, 0); }},
+        {"CreateImage3D", [&] { Image3D(context, both, rgba8, 2, 2, 2, 0, 0, data); }},
+        {"CreateImage3D", [&] { Image3D(context, both, false, rgba8, 2, 2, 2, 0, 0, data); }},
+        {"GetImageInfo", [&] { image.getInfo(Image::IMAGEINFO_WIDTH, 0, nullptr, nullptr); }},
+        {"CreateSampler",
+         [&] { Sampler(context, false, Sampler::ADDRESS_CLAMP, Sampler::FILTER_LINEAR); }},
+        {"GetSamplerInfo", [&] { sampler.filterMode(); }},
+        {"CreateProgramWithSource", [&] { Program(context, "source"); }},
+        {"CreateProgramWithBinary", [&] { Program(context, binaries); }},
+        {"BuildProgram", [&] { program.build(""); }},
+        {"GetProgramBuildInfo", [&] { program.buildLog(dev); }},
+        {"GetProgramBuildInfo", [&] { program.buildStatus(dev); }, 2},
+        {"CreateKernel", [&] { program.kernel("f"); }},
+        {"CreateKernelsInProgram", [&] { program.kernels(); }, 2},
+        {"SetKernelArg", [&] { kernel.setArg(0, buffer); }},
+        {"WaitForEvents", [&] { event.wait(); }},
+        {"WaitForEvents", [&] { Event::WaitForEvents({event}); }},
+        {"GetEventInfo", [&] { event.commandType(); }},
+        {"GetEventInfo", [&] { event.commandExecutionStatus(); }},
+        {"GetEventInfo", [&] { event.commandQueue(); }},
+        {"Flush", [&] { queue.flush(); }},
+        {"Finish", [&] { queue.finish(); }},
+        {"EnqueueReadBuffer", [&] { queue.enqueueRead(buffer, 0, 4, data); }},
+        {"EnqueueWriteBuffer", [&] { queue.enqueueBlockingWrite(buffer, 0, 4, data); }},
+        {"GetMemObjectInfo", [&] { queue.enqueueRead(image, rect, data, 0); }},
+        {"EnqueueReadImage", [&] { queue.enqueueRead(image, rect, data, 0); }},
+        {"EnqueueNDRangeKernel", [&] { queue.enqueueKernel(kernel, Range<1>(1), 0, 0, {event}); }},
+        {"EnqueueMarker", [&] { queue.enqueueMarker(); }},
+        {"EnqueueBarrier", [&] { queue.enqueueBarrier(); }},
+        {"CreateFromGLBuffer", [&] { Buffer(context, both, glBuffer); }},
+        {"CreateFromGLTexture2D", [&] { Image2D(context, both, glTexture, 0); }},
+        {"CreateFromGLTexture3D", [&] { Image3D(context, both, glVolume, 0); }},
+        {"CreateFromGLRenderbuffer", [&] { Image2D(context, both, glRenderbuffer); }},
+        {"EnqueueAcquireGLObjects", [&] { queue.enqueueAcquireGLObjects({shared}); }},
+        {"EnqueueReleaseGLObjects", [&] { queue.enqueueReleaseGLObjects({shared}); }},
+    };
     // A code of its own for each case, the vendors' range and unnamed ones included.
-    int code = -1;
-    for (Case const &failing : cases()) {
+    int code = 0;
+    for (Case const &failing : cases) {
+        --code;
         std::string const entryPoint = std::string("cl") + failing.entryPoint;
         SCOPED_TRACE(entryPoint + " call " + std::to_string(failing.call));
         runtime()->reset();
@@ -162,10 +124,8 @@ TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
             ADD_FAILURE() << "nothing was thrown";
         } catch (ExceptionOCL const &e) {
             EXPECT_EQ(code, static_cast<int>(e.errorNumber()));
-            EXPECT_EQ(std::string("OCL Exception: ") + ExceptionOCL::ErrorToCString(code),
-                      e.what());
             EXPECT_STREQ("", e.message());
-            EXPECT_EQ(std::string("oru/oru_ocl/") + failing.file, e.file());
+            EXPECT_EQ(0u, std::string(e.file()).find("oru/oru_ocl/"));
             EXPECT_NE(std::string::npos,
                       SourceLine(e.file(), e.line())
                           .find("ORU_CL(" + std::string(failing.entryPoint) + ","))
@@ -174,7 +134,6 @@ TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
         EXPECT_EQ(failing.call, runtime()->calls(entryPoint.c_str()))
             << "nothing after the failure";
         EXPECT_EQ(live, runtime()->liveHandles());
-        --code;
     }
 }
 
@@ -198,13 +157,4 @@ TEST_F(FailuresTest, RetainingAndReleasingGoUnchecked) {
         EXPECT_GE(runtime()->calls(retain.c_str()), 1u);
         EXPECT_EQ(runtime()->calls(retain.c_str()), runtime()->calls(release.c_str())) << kind;
     }
-}
-
-TEST_F(FailuresTest, AWrapperKeepsItsHandleThroughAFailure) {
-    Program fresh(context, "kernel void f() {}");
-    cl_program const before = fresh.id();
-    runtime()->fail("clBuildProgram", 1, CL_OUT_OF_HOST_MEMORY);
-    EXPECT_EQ(CL_OUT_OF_HOST_MEMORY, ErrorCode([&] { fresh.build(""); }));
-    EXPECT_EQ(before, fresh.id());
-    EXPECT_EQ(CL_SUCCESS, ErrorCode([&] { fresh.build(""); }));
 }

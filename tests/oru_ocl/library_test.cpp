@@ -1,143 +1,225 @@
-// Loading of the OpenCL runtime. Each case runs in a process of its own under CTest, as the answer
-// of IsOpenCLAvailable is one for the process.
-#include "tests/messageof.h"
-
-#include "oru/core/exceptions/internalexception.h"
+// Loading of the OpenCL runtime: the installed one and others, old, empty and broken. Each case
+// needs a process of its own, as under CTest, since the first question in a process settles the
+// runtime's folder.
+#include "oru/oru_ocl/contextocl.h"
 #include "oru/oru_ocl/extensionmanagerocl.h"
-#include "oru/oru_ocl/ocllibrary.h"
+#include "tests/countinghooks.h"
+#include "tests/messageof.h"
+#include "tests/oru_ocl/testruntime.h"
 
 #include <gtest/gtest.h>
-#include <windows.h>
 
 #include <algorithm>
+#include <atomic>
 #include <cstring>
+#include <stdexcept>
+#include <thread>
 #include <vector>
 
 using namespace ORU::OCL;
-using oru_test::MessageOf;
+using namespace oru_test;
 
 namespace {
 
-/// The runtime as the system loads it, to ask for its exports directly.
-HMODULE SystemRuntime() {
-    wchar_t path[MAX_PATH];
-    UINT const length = ::GetSystemDirectoryW(path, MAX_PATH);
-    return ::LoadLibraryW((std::wstring(path, length) + L"\\OpenCL.dll").c_str());
+class LibraryTest : public ::testing::TestWithParam<int> {
+protected:
+    void SetUp() override {
+        static bool used = false;
+        if (used)
+            GTEST_SKIP() << "needs a process of its own";
+        used = true;
+    }
+
+    /// What `Library::Initialize` says when it fails.
+    static std::string Failure() {
+        return MessageOf([] { Library::Initialize(); });
+    }
+
+    /// Whether nobody but the test uses the runtime; the test gives it up here.
+    static bool IsUnused(TestRuntime const &runtime) {
+        std::string const file = runtime.folder() + "OpenCL.dll";
+        ::FreeLibrary(::GetModuleHandleA(file.c_str()));
+        return !::GetModuleHandleA(file.c_str());
+    }
+};
+
+std::string SystemDirectory() {
+    char path[MAX_PATH];
+    return {path, ::GetSystemDirectoryA(path, MAX_PATH)};
 }
 
-char const *const kSlots[] = {
-#define ORU_CL_SLOT(Extension, Name) #Name,
+struct Slot {
+    char const *name;
+    Enum::Extension group;
+};
+constexpr Slot slots[] = {
+#define ORU_CL_SLOT(Extension, Name) {#Name, Enum::Extension},
 #include "oru/oru_ocl/functiontable_slots.inc"
 };
 
-FARPROC SlotValue(std::size_t index) {
-    FARPROC value;
-    std::memcpy(&value,
-                reinterpret_cast<char const *>(&ExtensionManager::instance()->table()) +
-                    index * sizeof value,
-                sizeof value);
-    return value;
+FARPROC ValueOf(Slot const &slot) {
+    FARPROC values[std::size(slots)];
+    std::memcpy(values, &ExtensionManager::instance()->table(), sizeof values);
+    return values[&slot - slots];
 }
 
 } // namespace
 
-TEST(OpenCLRuntime, ResolvesEveryEntryPointThatTheLoaderHas) {
-    AutoInitializer layer;
+TEST_F(LibraryTest, ResolvesEveryEntryPointThatTheLoaderHas) {
+    AutoInitializer const layer;
     ExtensionManager &manager = *ExtensionManager::instance();
-    HMODULE const runtime = SystemRuntime();
-    ASSERT_EQ(89u, std::size(kSlots));
-    EXPECT_STREQ("clGetPlatformIDs", kSlots[0]);
-    EXPECT_STREQ("clGetExtensionFunctionAddress", kSlots[73]);
-    EXPECT_STREQ("clEnqueueCopyBufferRect", kSlots[81]);
-    EXPECT_STREQ("clIcdGetPlatformIDsKHR", kSlots[88]);
+    HMODULE const runtime = ::LoadLibraryA((SystemDirectory() + "\\OpenCL.dll").c_str());
+    ASSERT_EQ(89u, std::size(slots));
+    EXPECT_STREQ("clGetExtensionFunctionAddress", slots[73].name);
+    EXPECT_STREQ("clEnqueueCopyBufferRect", slots[81].name);
+    EXPECT_STREQ("clIcdGetPlatformIDsKHR", slots[88].name);
 
-    // Versions 1.0 and 1.1 are there from the start; the first platform here is newer.
-    for (std::size_t i = 0; i < 82; ++i)
-        EXPECT_EQ(::GetProcAddress(runtime, kSlots[i]), SlotValue(i)) << kSlots[i];
-    for (std::size_t i = 82; i < 89; ++i)
-        EXPECT_EQ(nullptr, SlotValue(i)) << kSlots[i] << " before its extension is asked for";
-
-    // Each group is complete exactly when the loader exports all of it.
+    // Versions 1.0 and 1.1 are there from the start, as the first platform here is newer. Each
+    // other group is complete when the loader exports all of it.
     bool complete[13];
     std::fill_n(complete, 13, true);
-    std::size_t const groups[89] = {
-#define ORU_CL_SLOT(Extension, Name) Enum::Extension,
-#include "oru/oru_ocl/functiontable_slots.inc"
-    };
-    for (std::size_t i = 0; i < 89; ++i)
-        complete[groups[i]] = complete[groups[i]] && ::GetProcAddress(runtime, kSlots[i]);
-    for (int e = 0; e <= 12; ++e)
-        EXPECT_EQ(complete[e], manager.initializeCL(static_cast<Enum::Extension>(e))) << e;
-
-    std::vector<std::string> missing;
-    for (std::size_t i = 0; i < 89; ++i) {
-        EXPECT_EQ(::GetProcAddress(runtime, kSlots[i]), SlotValue(i)) << kSlots[i];
-        if (!SlotValue(i))
-            missing.push_back(kSlots[i]);
+    for (Slot const &slot : slots) {
+        FARPROC const exported = ::GetProcAddress(runtime, slot.name);
+        EXPECT_EQ(slot.group <= 1 ? exported : nullptr, ValueOf(slot)) << slot.name;
+        complete[slot.group] = complete[slot.group] && exported;
     }
-    std::vector<std::string> const lacking = {
-        "clReleaseDeviceEXT",           "clRetainDeviceEXT",          "clCreateSubDevicesEXT",
-        "clEnqueueMigrateMemObjectEXT", "clCreateEventFromGLsyncKHR", "clGetGLContextInfoKHR",
-        "clIcdGetPlatformIDsKHR"};
-    EXPECT_EQ(lacking, missing) << "what Wine's loader really lacks";
-    EXPECT_FALSE(manager.init_cl_ext_migrate_memobject());
-    EXPECT_TRUE(manager.init_cl_khr_fp64());
-    EXPECT_FALSE(manager.initializeCL(static_cast<Enum::Extension>(13)));
-    EXPECT_TRUE(manager.zeroSymbolsForExtensionCL(static_cast<Enum::Extension>(12)));
-    EXPECT_FALSE(manager.zeroSymbolsForExtensionCL(static_cast<Enum::Extension>(16)));
+    for (int e = -1; e <= 16; ++e) {
+        bool const known = e >= 0 && e <= 12;
+        EXPECT_EQ(known && complete[e], manager.initializeCL(Enum::Extension(e))) << e;
+        EXPECT_EQ(known, manager.zeroSymbolsForExtensionCL(Enum::Extension(e))) << e;
+    }
+    for (Slot const &slot : slots)
+        EXPECT_EQ(::GetProcAddress(runtime, slot.name), ValueOf(slot)) << slot.name;
+    EXPECT_EQ(complete[6], manager.init_cl_ext_migrate_memobject());
 }
 
-TEST(OpenCLRuntime, OpensAndClosesOnce) {
-    EXPECT_EQ("bInitialized_", MessageOf([] { Library::Terminate(); }));
-    EXPECT_EQ(nullptr, ExtensionManager::instance());
-    for (int round = 0; round < 3; ++round) {
-        Library::Initialize();
-        EXPECT_TRUE(Library::IsInitialized());
-        EXPECT_EQ("!bInitialized_", MessageOf([] { Library::Initialize(); }));
-        Library::InitializeIfNecessary();
-        Library::Terminate();
-        EXPECT_FALSE(Library::IsInitialized());
+// The path is glued to the file name as it is, and only the first one counts.
+TEST_P(LibraryTest, LooksWhereTheFirstPathSays) {
+    std::string const paths[] = {"", SystemDirectory() + '\\', SystemDirectory(), "C:\\nowhere\\"};
+    bool const found = GetParam() < 2;
+    EXPECT_EQ(found, Library::IsOpenCLAvailable(paths[GetParam()]));
+    EXPECT_EQ(found, Library::IsOpenCLAvailable(paths[3 - GetParam()]));
+    EXPECT_EQ(found ? "" : "openCLLibraryHandle", Failure());
+    EXPECT_EQ(found, Library::IsInitialized());
+    EXPECT_EQ(found, ExtensionManager::instance() != nullptr);
+}
+INSTANTIATE_TEST_SUITE_P(Paths, LibraryTest, ::testing::Range(0, 4));
+
+using VersionTest = LibraryTest;
+
+TEST_P(VersionTest, DecidesOnTheSlotsOf11) {
+    struct {
+        char const *folder;
+        char const *text;
+        bool isNew;
+    } const cases[] = {{"ocl_runtime", "OpenCL 1.0 old", false},
+                       {"ocl_runtime", "OpenCL 1.1", true},
+                       {"ocl_runtime", "OpenCL 2.0 new", true},
+                       {"ocl_runtime", "OpenCL ", false},
+                       {"ocl_runtime", "", false},
+                       {"ocl_runtime_1_0", "OpenCL 1.1 lie", false}};
+    auto const &[folder, text, isNew] = cases[GetParam()];
+    TestRuntime const runtime(folder);
+    EXPECT_TRUE(Library::IsOpenCLAvailable(runtime.folder()));
+    runtime->setVersion(text);
+    {
+        AutoInitializer const layer;
+        ExtensionManager &manager = *ExtensionManager::instance();
+        EXPECT_EQ(isNew, manager.table().clCreateUserEvent != nullptr);
+        // A caller may still ask.
+        EXPECT_EQ(GetParam() < 5, manager.init_CL_VERSION_1_1());
+        EXPECT_EQ(GetParam() < 5, manager.table().clCreateUserEvent != nullptr);
+        EXPECT_TRUE(manager.init_cl_ext_device_fission());
+    }
+    EXPECT_TRUE(IsUnused(runtime));
+}
+INSTANTIATE_TEST_SUITE_P(Versions, VersionTest, ::testing::Range(0, 6));
+
+TEST_F(LibraryTest, FailsOnAVersionTooShort) {
+    TestRuntime const runtime("ocl_runtime");
+    EXPECT_TRUE(Library::IsOpenCLAvailable(runtime.folder()));
+    runtime->setVersion("Open");
+    EXPECT_THROW(Library::Initialize(), std::out_of_range);
+    EXPECT_FALSE(Library::IsInitialized());
+}
+
+TEST_F(LibraryTest, RefusesARuntimeWithoutVersion10) {
+    CountingHooks hooks;
+    TestRuntime const runtime("ocl_runtime_empty");
+    EXPECT_FALSE(Library::IsOpenCLAvailable(runtime.folder()));
+    for (int i = 0; i < 2; ++i) {
+        EXPECT_EQ("isInitialized", Failure());
         EXPECT_EQ(nullptr, ExtensionManager::instance());
     }
-    {
-        AutoInitializer layer;
-        layer.release();
-    }
-    EXPECT_TRUE(Library::IsInitialized());
-    Library::Terminate();
+    EXPECT_TRUE(hooks.outstanding().empty());
+    EXPECT_TRUE(IsUnused(runtime));
 }
 
-TEST(OpenCLRuntime, IsLookedForInTheSystemDirectory) {
-    EXPECT_TRUE(Library::IsOpenCLAvailable(""));
-    EXPECT_TRUE(Library::IsOpenCLAvailable("C:\\no such folder\\")) << "the first answer stays";
-    AutoInitializer const layer;
-}
-
-// The first question settles the folder; a wrong one makes the initialisation fail, which Terminate
-// or a second attempt survives.
-TEST(OpenCLRuntime, IsMissingInAWrongFolder) {
-    EXPECT_FALSE(Library::IsOpenCLAvailable("C:\\no such folder\\"));
-    EXPECT_FALSE(Library::IsOpenCLAvailable("")) << "the first answer stays";
-    EXPECT_EQ("openCLLibraryHandle", MessageOf([] { Library::Initialize(); }));
+TEST_F(LibraryTest, OpensNothingWithoutPlatforms) {
+    CountingHooks hooks;
+    TestRuntime const runtime("ocl_runtime");
+    runtime->setPlatforms(false);
+    EXPECT_FALSE(Library::IsOpenCLAvailable(runtime.folder()));
+    EXPECT_EQ("CL_SUCCESS == error", Failure());
     EXPECT_FALSE(Library::IsInitialized());
-    EXPECT_EQ(nullptr, ExtensionManager::instance());
+    EXPECT_EQ("extMgrInstance_ == 0", Failure()) << "the half-made manager is in the way";
+    ExtensionManager::destroy();
+    runtime->setPlatforms(true);
+    EXPECT_EQ("", Failure());
+    EXPECT_FALSE(platforms().empty());
+    Library::Terminate();
+    EXPECT_TRUE(hooks.outstanding().empty());
+    // The folder is forgotten: what opens now is the system's runtime.
+    AutoInitializer const layer;
+    EXPECT_TRUE(IsUnused(runtime));
+}
+
+TEST_F(LibraryTest, OpensAndClosesAgainAndAgain) {
+    CountingHooks hooks;
     EXPECT_EQ("bInitialized_", MessageOf([] { Library::Terminate(); }));
-}
-
-// The prefix is glued to the file name as it is: it names a folder only with its separator.
-TEST(OpenCLRuntime, TakesThePathAsAPrefix) {
-    wchar_t path[MAX_PATH];
-    UINT const length = ::GetSystemDirectoryW(path, MAX_PATH);
-    std::string const directory(path, path + length);
-    EXPECT_TRUE(Library::IsOpenCLAvailable(directory + "\\"));
-    {
-        AutoInitializer const layer; // from that folder, by its path
+    for (int i = 0; i < 50; ++i) {
+        {
+            AutoInitializer layer;
+            EXPECT_EQ("!bInitialized_", Failure());
+            layer.release();
+        }
+        EXPECT_FALSE(platforms().empty());
+        Library::Terminate();
+        AutoInitializer const layer;
+        EXPECT_TRUE(Library::IsInitialized());
     }
-    AutoInitializer const again; // Terminate has forgotten the folder
+    EXPECT_EQ(nullptr, ExtensionManager::instance());
+    EXPECT_TRUE(hooks.outstanding().empty());
+    EXPECT_EQ(0, hooks.wrongReleases());
 }
 
-TEST(OpenCLRuntime, DoesNotTakeAFolderWithoutItsSeparator) {
-    wchar_t path[MAX_PATH];
-    UINT const length = ::GetSystemDirectoryW(path, MAX_PATH);
-    EXPECT_FALSE(Library::IsOpenCLAvailable(std::string(path, path + length)));
+TEST_F(LibraryTest, OpensAndClosesFromManyThreads) {
+    auto const inThreads = [](auto work) {
+        std::vector<std::thread> threads;
+        for (int i = 0; i < 8; ++i)
+            threads.emplace_back(work);
+        for (std::thread &thread : threads)
+            thread.join();
+    };
+    // Every thread opens or finds it open; of those that close, one does.
+    std::atomic<int> closed{0};
+    for (int round = 1; round <= 10; ++round) {
+        inThreads([] {
+            Library::InitializeIfNecessary();
+            EXPECT_TRUE(Library::IsInitialized());
+        });
+        inThreads([&closed] {
+            std::string const message = MessageOf([] { Library::Terminate(); });
+            closed += message.empty();
+            EXPECT_TRUE(message.empty() || message == "bInitialized_") << message;
+        });
+        EXPECT_EQ(round, closed);
+    }
+}
+
+TEST_F(LibraryTest, LeavesObjectsThatOutliveItHarmless) {
+    Library::Initialize();
+    Context const context(ContextProperties(platforms().front()), Device::TYPE_ALL);
+    Library::Terminate();
+    EXPECT_EQ("table_ != 0", MessageOf([&] { context.devices(); }));
 }

@@ -16,51 +16,55 @@ namespace oru_test {
 
 namespace OGL = ORU::OGL;
 
-/// An OpenGL context, current, and an OpenCL context with a queue that shares its objects.
-class SharingTest : public ComputeTest {
+/// An OpenGL context, current. A base, so that it is there before the OpenCL context.
+class WithGLContext {
+protected:
+    WithGLContext() { glContext->makeCurrent(); }
+
+private:
+    OGL::AutoInitializer library_;
+
+protected:
+    std::unique_ptr<OGL::ContextOffscreen> glContext = std::make_unique<OGL::ContextOffscreen>();
+};
+
+/// An OpenCL context that shares the objects of the current OpenGL context.
+class SharingTest : protected WithGLContext, public QueueTest {
 protected:
     using Pixels = std::vector<unsigned char>;
 
-    SharingTest()
-        : glContext(std::make_unique<OGL::ContextOffscreen>()), context(Share(*glContext)),
-          queue(context, device(), false, false) {
-        glContext->makeCurrent();
-    }
+    SharingTest() : QueueTest(ORU::OCL::Context(propertiesToShare(), device())) {}
 
     void TearDown() override {
         if (OGL::Context::CurrentContext()) {
             EXPECT_EQ(GLenum(GL_NO_ERROR), ::glGetError());
         }
-        EXPECT_EQ(2u, runtime()->liveHandles());
     }
 
-    static ORU::OCL::Context Share(OGL::Context const &glContext) {
+    ORU::OCL::ContextProperties propertiesToShare() const {
         ORU::OCL::ContextProperties properties(platform());
-        properties.setSharedRenderContext(glContext.renderContext());
-        properties.setDisplayContext(glContext.deviceContext());
-        return ORU::OCL::Context(properties, device());
+        properties.setSharedRenderContext(glContext->renderContext());
+        properties.setDisplayContext(glContext->deviceContext());
+        return properties;
     }
 
     /// Bytes that differ from pixel to pixel and from channel to channel.
-    static Pixels Pattern(std::size_t bytes, unsigned int seed) {
+    static Pixels Pattern(std::size_t bytes, std::size_t seed) {
         Pixels pixels(bytes);
         for (std::size_t i = 0; i < bytes; ++i)
             pixels[i] = static_cast<unsigned char>(i * 37 + i / 251 + seed);
         return pixels;
     }
 
-    /// RGBA bytes into a level of a 2-D or rectangle texture, and out again.
-    static void Upload(OGL::Texture2 const &texture, int level, Pixels const &pixels) {
+    /// RGBA bytes into a level of a 2-D or rectangle texture.
+    static void Upload(OGL::Texture2 const &texture, int level, std::size_t width,
+                       std::size_t height, Pixels const &pixels) {
         ORU_GL(BindTexture, texture.target(), texture.objectID());
-        auto const size = [&](GLenum query) {
-            GLint value = 0;
-            ORU_GL(GetTexLevelParameteriv, texture.target(), level, query, &value);
-            return value;
-        };
-        ORU_GL(TexSubImage2D, texture.target(), level, 0, 0, size(GL_TEXTURE_WIDTH),
-               size(GL_TEXTURE_HEIGHT), GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
+        ORU_GL(TexSubImage2D, texture.target(), level, 0, 0, GLsizei(width), GLsizei(height),
+               GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
     }
 
+    /// And out of any texture.
     static Pixels Download(OGL::Object const &texture, int level, std::size_t bytes) {
         Pixels pixels(bytes);
         ORU_GL(BindTexture, texture.target(), texture.objectID());
@@ -68,30 +72,22 @@ protected:
         return pixels;
     }
 
-    /// RGBA8 pixels of a row order turned left to right.
-    static Pixels Mirrored(Pixels const &pixels, std::size_t width) {
-        Pixels result(pixels.size());
-        for (std::size_t i = 0; i < pixels.size() / 4; ++i) {
-            std::size_t const from = i / width * width + (width - 1 - i % width);
-            std::copy_n(pixels.begin() + std::ptrdiff_t(4 * from), 4,
-                        result.begin() + std::ptrdiff_t(4 * i));
-        }
-        return result;
+    static Pixels Inverted(Pixels pixels) {
+        for (unsigned char &value : pixels)
+            value = static_cast<unsigned char>(255 - value);
+        return pixels;
     }
 
-    /// Mirrors one image into another by a kernel, both acquired for it.
-    void mirror(ORU::OCL::Image2D const &source, ORU::OCL::Image2D const &target, std::size_t width,
+    /// Inverts one image into another by a kernel, both acquired for it.
+    void invert(ORU::OCL::Image2D const &source, ORU::OCL::Image2D const &target, std::size_t width,
                 std::size_t height) {
-        ORU::OCL::Program program(context, R"(
+        ORU::OCL::Program const program = build(R"(
 constant sampler_t plain = CLK_NORMALIZED_COORDS_FALSE | CLK_ADDRESS_NONE | CLK_FILTER_NEAREST;
-kernel void mirror(read_only image2d_t source, write_only image2d_t target) {
+kernel void invert(read_only image2d_t source, write_only image2d_t target) {
     int2 at = (int2)(get_global_id(0), get_global_id(1));
-    int2 from = (int2)(get_global_size(0) - 1 - at.x, at.y);
-    write_imagef(target, at, read_imagef(source, plain, from));
+    write_imagef(target, at, 1 - read_imagef(source, plain, at));
 })");
-        program.build("");
-        ORU::OCL::Kernel kernel = program.kernel("mirror");
-        kernel.setArg(0, source);
+        ORU::OCL::Kernel kernel = KernelOf(program, "invert", source);
         kernel.setArg(1, target);
         ORU_GL0(Finish);
         ORU::OCL::Event const acquired = queue.enqueueAcquireGLObjects({source, target});
@@ -99,14 +95,6 @@ kernel void mirror(read_only image2d_t source, write_only image2d_t target) {
             queue.enqueueKernel(kernel, ORU::OCL::Range<2>(width, height), 0, 0, {acquired});
         queue.enqueueReleaseGLObjects({source, target}, {done}).wait();
     }
-
-private:
-    OGL::AutoInitializer library_;
-
-protected:
-    std::unique_ptr<OGL::ContextOffscreen> glContext;
-    ORU::OCL::Context context;
-    ORU::OCL::CommandQueue queue;
 };
 
 } // namespace oru_test
