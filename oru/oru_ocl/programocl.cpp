@@ -33,11 +33,13 @@ cl_program CreateWithBinaries(Context const &context, Program::BinaryArray const
 } // namespace
 
 Program::Program(Context const &context, std::string const &source)
-    : OpenCLObjectWrapper(CreateWithSource(context, source.c_str())), context_(context),
-      source_(source) {}
+    : context_(context), source_(source) {
+    adopt(CreateWithSource(context, source_.c_str()));
+}
 
-Program::Program(Context const &context, BinaryArray const &binaries)
-    : OpenCLObjectWrapper(CreateWithBinaries(context, binaries)), context_(context) {}
+Program::Program(Context const &context, BinaryArray const &binaries) : context_(context) {
+    adopt(CreateWithBinaries(context, binaries));
+}
 
 void Program::build(std::string const &options) {
     build(context_.devices(), options);

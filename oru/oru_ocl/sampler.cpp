@@ -36,9 +36,11 @@ int FromOpenCL(unsigned int const (&modes)[Size], unsigned int constant, char co
 } // namespace
 
 Sampler::Sampler(Context const &context, bool normalizedCoordinates,
-                 SamplerAddressingMode addressing, SamplerFilterMode filter)
-    : OpenCLObjectWrapper(ORU_CL(CreateSampler, context.id(), normalizedCoordinates,
-                                 OpenCLAddressingMode(addressing), OpenCLFilterMode(filter))) {}
+                 SamplerAddressingMode addressing, SamplerFilterMode filter) {
+    unsigned int const addressingMode = OpenCLAddressingMode(addressing);
+    unsigned int const filterMode = OpenCLFilterMode(filter);
+    adopt(ORU_CL(CreateSampler, context.id(), normalizedCoordinates, addressingMode, filterMode));
+}
 
 unsigned int Sampler::info(cl_sampler_info query) const {
     unsigned int value = 0;

@@ -16,7 +16,7 @@ std::vector<T> QueryList(Query const &query) {
     std::size_t bytes = 0;
     query(std::size_t(0), nullptr, &bytes);
     std::vector<T> list(bytes / sizeof(T));
-    query(bytes, list.data(), nullptr);
+    query(list.size() * sizeof(T), list.data(), nullptr);
     return list;
 }
 
