@@ -21,7 +21,7 @@ class Context;
 class OpenGLInterceptorDecorator;
 class WGLInterceptorDecorator;
 
-/// The profile a host asks its contexts to have; recorded and handed back, the layer reads it not.
+/// The profile that a host wants for its contexts: kept for the host, the layer acts on none.
 enum OpenGLProfile : unsigned int {
     OPENGLPROFILE_DEFAULT = 0,
     OPENGLPROFILE_CORE = 1,

@@ -4,11 +4,11 @@
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
+#include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/platformgl.h"
 
-#include <algorithm>
 #include <array>
 #include <cstddef>
 
@@ -23,12 +23,18 @@ std::size_t const kChannels = 3;
 /// A rectangle from the origin to (right, 1), with texture coordinates that equal the positions.
 void DrawRectangle(GLfloat right, bool textured) {
     ORU_GL(Begin, GL_QUADS);
-    ORU_GL(Color3f, 1, 1, 1);
-    GLfloat const corners[][2] = {{0, 0}, {0, 1}, {right, 1}, {right, 0}};
-    for (auto const &corner : corners) {
-        if (textured)
-            ORU_GL(TexCoord2f, corner[0], corner[1]);
-        ORU_GL(Vertex2f, corner[0], corner[1]);
+    try {
+        ORU_GL(Color3f, 1, 1, 1);
+        GLfloat const corners[][2] = {{0, 0}, {0, 1}, {right, 1}, {right, 0}};
+        for (auto const &corner : corners) {
+            if (textured)
+                ORU_GL(TexCoord2f, corner[0], corner[1]);
+            ORU_GL(Vertex2f, corner[0], corner[1]);
+        }
+    } catch (...) {
+        // The error checker is one for all contexts: left inside, it would check no call any more.
+        internal::DropExceptions([] { ORU_GL0(End); });
+        throw;
     }
     ORU_GL0(End);
 }

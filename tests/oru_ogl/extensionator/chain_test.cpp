@@ -5,6 +5,7 @@
 #include "oru/oru_ogl/exceptionogl.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/openglerrorchecker.h"
+#include "oru/oru_ogl/extensionator/opengltokenname.h"
 
 using namespace ORU::OGL;
 using oru_test::MessageOf;
@@ -25,16 +26,20 @@ private:
     std::string &log_;
 };
 
-/// Runs a call that must fail and gives the exception.
+/// The error, its place and its number that a call fails with.
 template<class Call>
-ExceptionOGL Failure(Call call) {
+std::string Failure(Call call) {
     try {
         call();
     } catch (ExceptionOGL const &e) {
-        return e;
+        return std::string(e.message()) + ' ' + std::to_string(e.errorNumber()) + ' ' + e.file() +
+               ':' + std::to_string(e.line());
     }
-    ADD_FAILURE() << "nothing was thrown";
-    return ExceptionOGL("", 0, "", 0);
+    return "";
+}
+
+OpenGLInterceptor &First() {
+    return *OpenGLInterceptor::Instance();
 }
 
 } // namespace
@@ -49,62 +54,54 @@ TEST_F(ChainTest, CallsTheLastPushedFirst) {
     ASSERT_NE(nullptr, dynamic_cast<OpenGLErrorChecker *>(checker));
     checker->addInterceptor(&a);
     record.addInterceptor(&b);
-    EXPECT_EQ(&a, b.interceptor());
     ORU_GL0(Flush);
     EXPECT_EQ("ba", log);
     EXPECT_EQ("Enforce dynamic_cast<OpenGLErrorChecker *>(sInterceptor_) != NULL",
               MessageOf([] { OpenGLInterceptor::Destroy(); }));
     EXPECT_EQ(&b, record.popInterceptor());
-    EXPECT_EQ(&a, OpenGLInterceptor::Instance()->popInterceptor());
-    EXPECT_EQ(nullptr, OpenGLInterceptor::Instance()->popInterceptor());
-    EXPECT_EQ(checker, OpenGLInterceptor::Instance());
+    EXPECT_EQ(&a, First().popInterceptor());
+    EXPECT_EQ(nullptr, First().popInterceptor());
+    EXPECT_EQ(checker, &First());
     OpenGLInterceptor::Destroy();
     OpenGLInterceptor::Destroy(); // an empty chain has nothing to destroy
-    EXPECT_NE(nullptr, dynamic_cast<OpenGLErrorChecker *>(OpenGLInterceptor::Instance()));
+    EXPECT_NE(nullptr, dynamic_cast<OpenGLErrorChecker *>(&First()));
 }
 
 TEST_F(ChainTest, ThrowsAtTheCallersFileAndLine) {
-    GLuint name = 0;
-    ORU_GL(GenTextures, 1, &name);
-    int const line = __LINE__ + 1;
-    ExceptionOGL const core = Failure([&] { ORU_GL(BindTexture, 0x1234, name); });
-    EXPECT_STREQ("GL_INVALID_ENUM", core.message());
-    EXPECT_EQ(0x0500u, core.errorNumber());
-    EXPECT_STREQ("tests/oru_ogl/extensionator/chain_test.cpp", core.file());
-    EXPECT_EQ(line, core.line());
-    ORU_GL(DeleteTextures, 1, &name);
-
-    ExceptionOGL const extended =
-        Failure([] { OpenGLInterceptor::Instance()->cgmUseProgram("host.cpp", 42, 999); });
-    EXPECT_STREQ("GL_INVALID_VALUE", extended.message());
-    EXPECT_STREQ("host.cpp", extended.file());
-    EXPECT_EQ(42, extended.line());
+    EXPECT_EQ("GL_INVALID_ENUM 1280 tests/oru_ogl/extensionator/chain_test.cpp:" +
+                  std::to_string(__LINE__ + 1),
+              Failure([] { ORU_GL(BindTexture, 0x1234, 0); }));
+    EXPECT_EQ("GL_INVALID_VALUE 1281 host.cpp:42",
+              Failure([] { First().cgmUseProgram("host.cpp", 42, 999); }));
     EXPECT_EQ(static_cast<GLenum>(GL_NO_ERROR), ::glGetError()) << "the error was taken";
+}
+
+TEST_F(ChainTest, NamesErrors) {
+    for (GLenum error = 0; error < 0x10000; ++error) {
+        bool const known = (error >= 0x0500 && error <= 0x0506) || error == 0x8031;
+        std::string const name = known             ? ORUOGLTokenName(error)
+                                 : error == 0x0507 ? "GL_CONTEXT_LOST"
+                                                   : "Unspecified GL error";
+        EXPECT_EQ(name,
+                  reinterpret_cast<char const *>(OpenGLErrorChecker::GetOpenGLErrorString(error)));
+    }
 }
 
 TEST_F(ChainTest, ReturnsResults) {
     GLuint const program = ORU_GL0(CreateProgram);
-    EXPECT_NE(0u, program);
     EXPECT_EQ(GL_TRUE, ORU_GL(IsProgram, program));
     ORU_GL(DeleteProgram, program);
-    EXPECT_EQ(static_cast<GLenum>(GL_NO_ERROR), ORU_GL0(GetError));
     ::glEnable(0x1234);
-    EXPECT_EQ(static_cast<GLenum>(GL_INVALID_ENUM), ORU_GL0(GetError))
-        << "a pending error is the result";
+    EXPECT_EQ(static_cast<GLenum>(GL_INVALID_ENUM), ORU_GL0(GetError)) << "pending: the result";
 }
 
 TEST_F(ChainTest, BalancesBeginAndEnd) {
-    ExceptionOGL const end = Failure([] { ORU_GL0(End); });
-    EXPECT_STREQ("Unbalanced glEnd()!", end.message());
-    EXPECT_EQ(0u, end.errorNumber());
+    EXPECT_EQ("Unbalanced glEnd()! 0 f:1", Failure([] { First().cgmEnd("f", 1); }));
     ASSERT_EQ(static_cast<GLenum>(GL_NO_ERROR), ::glGetError()) << "glEnd was not called";
-
     ORU_GL(Begin, GL_POINTS);
-    ExceptionOGL const begin = Failure([] { ORU_GL(Begin, GL_LINES); });
-    EXPECT_STREQ("Unbalanced glBegin()!", begin.message());
+    EXPECT_EQ("Unbalanced glBegin()! 0 f:2", Failure([] { First().cgmBegin("f", 2, GL_LINES); }));
     // No query is allowed here, so the error of this call waits for glEnd.
     EXPECT_NO_THROW(ORU_GL(Enable, 0x1234));
-    EXPECT_NO_THROW(ORU_GL(Vertex2f, 0.f, 0.f));
-    EXPECT_NE(0u, Failure([] { ORU_GL0(End); }).errorNumber());
-    EXPECT_STREQ("Unbalanced glEnd()!", Failure([] { ORU_GL0(End); }).message());
+    EXPECT_EQ("GL_INVALID_OPERATION 1282 f:3", Failure([] { First().cgmEnd("f", 3); }));
+    EXPECT_EQ("Unbalanced glEnd()! 0 f:4", Failure([] { First().cgmEnd("f", 4); }));
 }

@@ -1,11 +1,13 @@
 // The tracer's text and what it forwards, for every operation and many stream formats.
 #include "oru/oru_ogl/extensionator/opengltracer.h"
 
-#include "../glfixture.h"
 #include "tests/allocationcount.h"
 
-#include "oru/oru_ogl/exceptionogl.h"
+#include "oru/oru_ogl/extensionator/openglforwarder.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
+#include "oru/oru_ogl/platformgl.h"
+
+#include <gtest/gtest.h>
 
 #include <cmath>
 #include <cstdint>
@@ -13,26 +15,13 @@
 #include <iomanip>
 #include <limits>
 #include <locale>
-#include <ostream>
 #include <sstream>
-#include <string>
 #include <tuple>
 #include <type_traits>
+#include <utility>
 #include <vector>
 
 using namespace ORU::OGL;
-
-namespace oru_test {
-
-/// A way to set up a stream.
-struct Format {
-    char const *name;
-    void (*apply)(std::ostream &stream);
-};
-
-} // namespace oru_test
-
-using oru_test::Format;
 
 namespace {
 
@@ -54,166 +43,124 @@ Result Answer() {
         return static_cast<Result>(0x5A);
 }
 
-/// A last link that writes down what arrives.
+/// A last link that writes down what arrives and what was traced before.
 class Recorder : public OpenGLInterceptor {
 public:
+    std::ostringstream *trace_ = nullptr;
+    std::string traced_;
     std::string operation_;
     std::string arguments_;
 
 #define ORU_GL_OPERATION(Result, Name, Parameters, Arguments)                                      \
     Result cgm##Name Parameters override {                                                         \
-        operation_ = #Name;                                                                        \
+        operation_ = "gl" #Name;                                                                   \
         arguments_ = Bytes Arguments;                                                              \
+        traced_ = trace_ ? trace_->str() : "";                                                     \
         return Answer<Result>();                                                                   \
     }
 #include "oru/oru_ogl/extensionator/gloperations.inc"
 };
 
-/// The types of an operation's parameters after file and line, as the table of entry points says
-/// them.
-std::vector<std::string> TypeTexts(std::string const &parameters) {
-    std::vector<std::string> types;
-    std::size_t begin = 1;
-    for (std::size_t end; begin < parameters.size(); begin = end + 2) {
-        end = std::min(parameters.find(", ", begin), parameters.size() - 1);
-        std::string const declaration = parameters.substr(begin, end - begin);
-        std::size_t const type = declaration.find_last_of(" *") + 1;
-        types.push_back(declaration.substr(0, type - (declaration[type - 1] == ' ' ? 1 : 0)));
-    }
-    types.erase(types.begin(), types.begin() + 2);
-    return types;
-}
-
-/// The argument of a type at a place, different at each place of a call and at the extremes at
-/// times.
-template<class Type>
-Type Sample(std::size_t place) {
-    if constexpr (std::is_same<Type, char const *>::value) {
-        static char const *const texts[] = {"alpha", "", "b{eta}[1].gamma"};
-        return texts[place % 3];
-    } else if constexpr (std::is_pointer<Type>::value) {
-        return place % 7 == 6 ? nullptr : reinterpret_cast<Type>(0xABCD0000 + 16 * place);
-    } else if constexpr (std::is_floating_point<Type>::value) {
-        using Limits = std::numeric_limits<Type>;
-        static double const plain[] = {0.5,  -0.0,     1,       3.14159265, -1e20,
-                                       1e-7, 999999.5, -999999, 1000000,    123456.5};
-        static Type const extreme[] = {Limits::max(), Limits::infinity(), Limits::denorm_min(),
-                                       -Limits::infinity(), Limits::quiet_NaN()};
-        std::size_t const i = place % 15;
-        return i < 10 ? static_cast<Type>(plain[i]) : extreme[i - 10];
-    } else if constexpr (sizeof(Type) == 1) {
-        return static_cast<Type>(place % 4 == 3 ? 0 : 'A' + place);
-    } else if constexpr (sizeof(Type) == 8) {
-        return static_cast<Type>(place % 2 ? -5000000000 - 7 * std::int64_t(place)
-                                           : 5000000000 + 3 * std::int64_t(place));
-    } else {
-        static int const values[] = {0x0DE1, 0,      -2,     0x1908, 1,      0x12345678, 0x8892,
-                                     7,      0x140B, -32768, 9729,   0x4000, 32767,      100000};
-        return static_cast<Type>(values[place % (sizeof values / sizeof *values)]);
-    }
-}
-
-/// The beginning of the line of a call, then its arguments, inserted piece by piece.
-class Pieces {
-public:
-    explicit Pieces(std::ostream &stream) : stream_(stream) {}
-
-    void begin(char const *file, unsigned int line, char const *name) {
-        stream_ << file << ":" << line << ": " << (std::string("gl") + name + "(").c_str();
-    }
-
-    template<class Value>
-    void argument(std::string const &type, Value value) {
-        if (!first_)
-            stream_ << ", ";
-        first_ = false;
-        if constexpr (std::is_pointer<Value>::value) {
-            if constexpr (std::is_same<Value, char const *>::value)
-                stream_ << value;
-            else
-                stream_ << static_cast<void const *>(value);
-        } else if constexpr (std::is_same<Value, float>::value) {
-            std::int32_t pattern;
-            std::memcpy(&pattern, &value, 4);
-            stream_ << "makeFloat(" << pattern << ") /* " << value << " */";
-        } else if (type == "GLenum") {
-            stream_ << ORUOGLTokenName(static_cast<GLenum>(value));
-        } else if (type == "GLboolean") {
-            stream_ << (value != 0 ? "GL_TRUE" : "GL_FALSE");
-        } else if (type == "GLhandleARB") {
-            stream_ << "(GLhandleARB)" << value;
-        } else {
-            stream_ << value; // a byte is a character to a stream
-        }
-    }
-
-    void end() { stream_ << ")\n"; }
-
-private:
-    std::ostream &stream_;
-    bool first_ = true;
-};
-
-/// A tracer in front of a recorder, and the text that its calls should give.
+/// A tracer in front of a recorder, against the same pieces inserted into a stream one by one.
 class Trial {
 public:
-    explicit Trial(Format const &format) : format_(format), tracer_(actual_, &recorder_) {
-        format.apply(actual_);
-        format.apply(expected_);
+    explicit Trial(void (*setUp)(std::ostream &)) {
+        setUp(actual_);
+        setUp(expected_);
         width_ = actual_.width();
+        recorder_.trace_ = &actual_;
     }
 
     template<class Result, class... Arguments>
     void call(char const *name, char const *parameters,
               Result (OpenGLInterceptor::*operation)(char const *, unsigned int, Arguments...)) {
-        callWith(name, parameters, operation, std::index_sequence_for<Arguments...>());
-    }
-
-    int calls() const { return calls_; }
-
-private:
-    template<class Result, class... Arguments, std::size_t... Places>
-    void callWith(char const *name, char const *parameters,
-                  Result (OpenGLInterceptor::*operation)(char const *, unsigned int, Arguments...),
-                  std::index_sequence<Places...>) {
-        unsigned int const line = static_cast<unsigned int>(++calls_);
-        std::size_t const shift = line % 30;
-        std::tuple<Arguments...> const values(Sample<Arguments>(shift + Places)...);
-        std::vector<std::string> const types = TypeTexts(parameters);
-        ASSERT_EQ(sizeof...(Arguments), types.size()) << name;
-
+        auto const line = static_cast<unsigned int>(++calls_);
+        place_ = line % 30;
+        std::tuple<Arguments...> const values{sample<Arguments>()...};
         for (std::ostringstream *stream : {&actual_, &expected_}) {
             stream->str("");
             stream->width(width_);
         }
-        Pieces pieces(expected_);
-        pieces.begin(kFile, line, name);
-        (pieces.argument(types[Places], std::get<Places>(values)), ...);
-        pieces.end();
+        expected_ << kFile << ":" << line << ": " << name << "(";
+        separator_ = "";
+        std::istringstream declarations(parameters);
+        declarations.ignore(1000, ',').ignore(1000, ','); // file and line
+        std::apply([&](auto... each) { (insert(declarations, each), ...); }, values);
+        expected_ << ")\n";
 
-        OpenGLInterceptor &first = tracer_;
-        if constexpr (std::is_void<Result>::value)
-            (first.*operation)(kFile, line, std::get<Places>(values)...);
-        else
-            EXPECT_EQ(Answer<Result>(),
-                      (first.*operation)(kFile, line, std::get<Places>(values)...));
-        ASSERT_EQ(expected_.str(), actual_.str()) << format_.name;
+        std::apply(
+            [&](auto... each) {
+                OpenGLInterceptor &first = tracer_;
+                if constexpr (std::is_void<Result>::value)
+                    (first.*operation)(kFile, line, each...);
+                else
+                    EXPECT_EQ(Answer<Result>(), (first.*operation)(kFile, line, each...));
+                EXPECT_EQ(Bytes(kFile, line, each...), recorder_.arguments_) << name;
+            },
+            values);
         EXPECT_EQ(name, recorder_.operation_);
-        EXPECT_EQ(Bytes(kFile, line, std::get<Places>(values)...), recorder_.arguments_) << name;
+        ASSERT_EQ(expected_.str(), recorder_.traced_);
+        EXPECT_EQ(expected_.str(), actual_.str());
         EXPECT_EQ(expected_.flags(), actual_.flags());
         EXPECT_EQ(expected_.width(), actual_.width());
         EXPECT_TRUE(actual_.good());
     }
 
+    int calls() const { return calls_; }
+
+private:
+    /// The next argument of a type: different at each place of a call and extreme at times.
+    template<class Type>
+    Type sample() {
+        static float const floats[] = {0.5f,  -0.0f,  3.14159265f, -1e20f, 999999.5f,
+                                       1e-7f, 1e-45f, 1000000,     NAN,    -INFINITY};
+        std::size_t const place = place_++;
+        if constexpr (std::is_same<Type, char const *>::value)
+            return place % 2 ? "" : "b{eta}[1].gamma";
+        else if constexpr (std::is_pointer<Type>::value)
+            return reinterpret_cast<Type>(place % 7 * 0xABCD00);
+        else if constexpr (std::is_floating_point<Type>::value)
+            return static_cast<Type>(floats[place % std::size(floats)]);
+        else // a named value or one with all bits in use
+            return static_cast<Type>(place % 2 ? 0x1900 + place : place * 0x9E3779B97F4A7C15u);
+    }
+
+    /// Inserts an argument in the form of its type in the next of the declarations.
+    template<class Value>
+    void insert(std::istream &declarations, Value value) {
+        std::string declaration;
+        std::getline(declarations, declaration, ',');
+        bool const isEnum = !declaration.find(" GLenum ");
+        bool const isHandle = !declaration.find(" GLhandleARB ");
+        bool const isBoolean = !declaration.find(" GLboolean ");
+        expected_ << std::exchange(separator_, ", ");
+        if constexpr (std::is_same<Value, char const *>::value) {
+            expected_ << value;
+        } else if constexpr (std::is_pointer<Value>::value) {
+            expected_ << static_cast<void const *>(value);
+        } else if constexpr (std::is_same<Value, float>::value) {
+            std::int32_t pattern;
+            std::memcpy(&pattern, &value, 4);
+            expected_ << "makeFloat(" << pattern << ") /* " << value << " */";
+        } else if (isEnum || isBoolean) {
+            expected_ << (isEnum  ? ORUOGLTokenName(static_cast<GLenum>(value))
+                          : value ? "GL_TRUE"
+                                  : "GL_FALSE");
+        } else {
+            expected_ << (isHandle ? "(GLhandleARB)" : "") << value; // a byte is a character
+        }
+    }
+
     static constexpr char const *kFile = "some/source.cpp";
 
-    Format const &format_;
     std::ostringstream actual_;
     std::ostringstream expected_;
     std::streamsize width_ = 0;
+    std::size_t place_ = 0;
+    char const *separator_ = "";
     int calls_ = 0;
     Recorder recorder_;
-    OpenGLTracer tracer_;
+    OpenGLTracer tracer_{actual_, &recorder_};
 };
 
 struct GroupedDigits : std::numpunct<char> {
@@ -222,80 +169,61 @@ struct GroupedDigits : std::numpunct<char> {
     std::string do_grouping() const override { return "\3"; }
 };
 
-Format const kFormats[] = {
-    {"AsStarted", [](std::ostream &) {}},
-    {"Hexadecimal", [](std::ostream &s) { s << std::hex << std::showbase << std::uppercase; }},
-    {"OctalWithSign", [](std::ostream &s) { s << std::oct << std::showpos << std::showpoint; }},
-    {"Scientific", [](std::ostream &s) { s << std::scientific << std::setprecision(3); }},
-    {"LongerThanTheBuffer", [](std::ostream &s) { s << std::fixed << std::setprecision(1500); }},
-    {"Precise", [](std::ostream &s) { s << std::setprecision(17); }},
-    {"HexadecimalFloat", [](std::ostream &s) { s << std::hexfloat << std::boolalpha; }},
-    {"NoBase", [](std::ostream &s) { s.unsetf(std::ios_base::basefield); }},
-    {"GroupedDigits",
-     [](std::ostream &s) { s.imbue(std::locale(std::locale::classic(), new GroupedDigits)); }},
-    {"Wide", [](std::ostream &s) { s << std::setw(40) << std::setfill('.'); }},
-    {"WideAtTheLeft", [](std::ostream &s) { s << std::setw(18) << std::left; }}};
-
-class TracerFormatTest : public ::testing::TestWithParam<Format> {};
-
-/// A stream that counts its writes and keeps nothing.
-class CountingBuffer : public std::streambuf {
-public:
-    int writes = 0;
-
-protected:
-    std::streamsize xsputn(char const *, std::streamsize count) override {
-        ++writes;
-        return count;
-    }
-    int_type overflow(int_type c) override { return ++writes, traits_type::not_eof(c); }
+struct Format {
+    char const *name;
+    void (*setUp)(std::ostream &stream);
 };
+
+Format const kFormats[] = {
+    {"as started", [](std::ostream &) {}},
+    {"hexadecimal", [](std::ostream &s) { s << std::hex << std::showbase << std::uppercase; }},
+    {"octal with sign", [](std::ostream &s) { s << std::oct << std::showpos << std::showpoint; }},
+    {"scientific", [](std::ostream &s) { s << std::scientific << std::setprecision(3); }},
+    {"longer than the buffer", [](std::ostream &s) { s << std::fixed << std::setprecision(1500); }},
+    {"precise", [](std::ostream &s) { s << std::setprecision(17); }},
+    {"hexadecimal float", [](std::ostream &s) { s << std::hexfloat << std::boolalpha; }},
+    {"no base", [](std::ostream &s) { s.unsetf(std::ios_base::basefield); }},
+    {"grouped digits",
+     [](std::ostream &s) { s.imbue(std::locale(std::locale::classic(), new GroupedDigits)); }},
+    {"wide", [](std::ostream &s) { s << std::setw(40) << std::setfill('.'); }},
+    {"wide at the left", [](std::ostream &s) { s << std::setw(18) << std::left; }}};
 
 } // namespace
 
-TEST_P(TracerFormatTest, WritesAndForwardsEveryOperation) {
-    Trial trial(GetParam());
+TEST(Tracer, WritesAndForwardsEveryOperation) {
+    for (Format const &format : kFormats) {
+        SCOPED_TRACE(format.name);
+        Trial trial(format.setUp);
 #define ORU_GL_OPERATION(Result, Name, Parameters, Arguments)                                      \
-    trial.call(#Name, #Parameters, &OpenGLInterceptor::cgm##Name);                                 \
+    trial.call("gl" #Name, #Parameters, &OpenGLInterceptor::cgm##Name);                            \
     if (HasFatalFailure())                                                                         \
         return;
 #include "oru/oru_ogl/extensionator/gloperations.inc"
-    EXPECT_EQ(1182, trial.calls());
+        EXPECT_EQ(1182, trial.calls());
+    }
 }
-
-INSTANTIATE_TEST_SUITE_P(Streams, TracerFormatTest, ::testing::ValuesIn(kFormats),
-                         [](auto const &format) { return format.param.name; });
 
 TEST(Tracer, WritesTheseLines) {
     Recorder recorder;
-    std::ostringstream text;
+    std::ostringstream text, other;
     OpenGLTracer tracer(text, &recorder);
-    OpenGLInterceptor &first = tracer;
-    first.cgmGetError("f", 87);
-    first.cgmBlendFunc("f", 88, GL_ONE, GL_ZERO);
-    first.cgmColorMask("f", 89, 1, 0, 2, 0);
-    first.cgmBufferData("f", 91, GL_ARRAY_BUFFER, 5000000000, nullptr, GL_STATIC_DRAW);
-    first.cgmVertex2f("f", 92, 0.5f, -0.0f);
-    first.cgmColor4b("f", 93, 'a', 'b', 'c', 'd');
+    tracer.cgmBlendFunc("f", 88, GL_ONE, GL_ZERO);
+    tracer.cgmColorMask("f", 89, 1, 0, 2, 0);
+    tracer.cgmBufferData("f", 91, GL_ARRAY_BUFFER, 5000000000, nullptr, GL_STATIC_DRAW);
+    tracer.cgmVertex2f("f", 92, 0.5f, -0.0f);
     // A pointer that is null where a text belongs must not spoil the stream for later lines.
-    first.cgmGetUniformLocation("f", 94, 7, nullptr);
-    first.cgmAttachObjectARB("f", 4294967295, 3, 4);
-    EXPECT_EQ("f:87: glGetError()\n"
-              "f:88: glBlendFunc(GL_CURRENT_BIT, GL_POINTS)\n"
+    tracer.cgmGetUniformLocation("f", 94, 7, nullptr);
+    tracer.cgmAttachObjectARB("f", 4294967295, 3, 4);
+    tracer.setOutputStream(other);
+    tracer.cgmFlush("g", 1);
+    EXPECT_EQ("f:88: glBlendFunc(GL_CURRENT_BIT, GL_POINTS)\n"
               "f:89: glColorMask(GL_TRUE, GL_FALSE, GL_TRUE, GL_FALSE)\n"
               "f:91: glBufferData(GL_ARRAY_BUFFER, 5000000000, 0, GL_STATIC_DRAW)\n"
               "f:92: glVertex2f(makeFloat(1056964608) /* 0.5 */, makeFloat(-2147483648) /* -0 */)\n"
-              "f:93: glColor4b(a, b, c, d)\n"
               "f:94: glGetUniformLocation(7, 0)\n"
               "f:4294967295: glAttachObjectARB((GLhandleARB)3, (GLhandleARB)4)\n",
               text.str());
-
-    std::ostringstream other;
-    tracer.setOutputStream(other);
-    text.str("");
-    first.cgmFlush("g", 1);
     EXPECT_EQ("g:1: glFlush()\n", other.str());
-    EXPECT_EQ("", text.str());
 }
 
 // Numbers of a new stream have a formatter of their own: floats of all magnitudes, ties between two
@@ -303,16 +231,12 @@ TEST(Tracer, WritesTheseLines) {
 TEST(Tracer, WritesNumbersAsTheStreamDoes) {
     std::vector<double> numbers;
     for (std::uint64_t pattern = 0; pattern <= 0xFFFFFFFF; pattern += 65521) {
-        auto const bits = static_cast<std::uint32_t>(pattern);
         float number;
-        std::memcpy(&number, &bits, sizeof number);
+        std::memcpy(&number, &pattern, sizeof number);
         numbers.push_back(static_cast<double>(number));
     }
     for (int i = 0; i < 13000; ++i)
         numbers.push_back(1000000.5 + 1234.5 * i);
-    double number = 0.5;
-    for (int i = 0; i < 60; ++i, number = number * 1.25 + 0.125)
-        numbers.insert(numbers.end(), {number, number + 1. / 16, number + 3. / 64, number * 1.1});
     for (int power = -9; power < 21; ++power)
         for (float const side : {0.f, 1.f, 1e30f}) {
             float const ten = std::pow(10.f, static_cast<float>(power));
@@ -321,12 +245,9 @@ TEST(Tracer, WritesNumbersAsTheStreamDoes) {
         }
 
     Recorder recorder;
-    std::ostringstream text, expected;
-    OpenGLTracer tracer(text, &recorder);
     for (double const value : numbers) {
-        text.str("");
-        tracer.cgmClearDepth("", 1, value);
-        expected.str("");
+        std::ostringstream text, expected;
+        OpenGLTracer(text, &recorder).cgmClearDepth("", 1, value);
         expected << ":1: glClearDepth(" << value << ")\n";
         ASSERT_EQ(expected.str(), text.str());
     }
@@ -334,32 +255,30 @@ TEST(Tracer, WritesNumbersAsTheStreamDoes) {
 
 TEST(Tracer, WritesTextsOfAnyLength) {
     Recorder recorder;
-    for (std::size_t const length : {900u, 1000u, 1015u, 1023u, 1024u, 1025u, 5000u}) {
+    for (std::size_t length = 950; length < 2100; ++length) {
         std::string const file(length, 'f');
-        std::string const name(length + 3, 'n');
+        std::string const name(length % 1100, 'n');
         std::ostringstream text;
-        OpenGLTracer tracer(text, &recorder);
-        tracer.cgmGetUniformLocation(file.c_str(), 5, 6, name.c_str());
-        tracer.cgmUniform4f(file.c_str(), 8, 9, 0.1f, 0.1f, 0.1f, 0.1f);
-        std::string const tenth = ", makeFloat(1036831949) /* 0.1 */";
-        std::ostringstream expected;
-        expected << file << ":5: glGetUniformLocation(6, " << name << ")\n"
-                 << file << ":8: glUniform4f(9" << tenth << tenth << tenth << tenth << ")\n";
-        EXPECT_EQ(expected.str(), text.str());
+        OpenGLTracer(text, &recorder).cgmGetUniformLocation(file.c_str(), 12345, 6, name.c_str());
+        ASSERT_EQ(file + ":12345: glGetUniformLocation(6, " + name + ")\n", text.str());
     }
 }
 
 TEST(Tracer, WritesALineAtOnceWithoutAllocating) {
-    Recorder recorder;
-    CountingBuffer buffer;
-    std::ostream stream(&buffer);
-    OpenGLTracer tracer(stream, nullptr);
+    struct CountingBuffer : std::streambuf {
+        int writes = 0;
+        std::streamsize xsputn(char const *, std::streamsize count) override {
+            return ++writes, count;
+        }
+        int_type overflow(int_type c) override { return ++writes, traits_type::not_eof(c); }
+    } buffer;
     struct Nothing : OpenGLForwarder {
         void cgmUniform4f(char const *, unsigned int, GLint, GLfloat, GLfloat, GLfloat,
                           GLfloat) override {}
         void cgmVertex3d(char const *, unsigned int, GLdouble, GLdouble, GLdouble) override {}
     } nothing;
-    tracer.setInterceptor(&nothing);
+    std::ostream stream(&buffer);
+    OpenGLTracer tracer(stream, &nothing);
 
     long const before = oru_test::AllocationCount();
     tracer.cgmUniform4f("f", 1, 2, 0.1f, -1e-20f, std::numeric_limits<float>::infinity(), 4);
@@ -368,15 +287,4 @@ TEST(Tracer, WritesALineAtOnceWithoutAllocating) {
     tracer.cgmVertex3d("f", 1, 0.1, 2, -3e200);
     EXPECT_EQ(2, buffer.writes);
     EXPECT_EQ(before, oru_test::AllocationCount());
-}
-
-class TracerOnContextTest : public oru_test::OffscreenTest {};
-
-TEST_F(TracerOnContextTest, WritesACallThatIsRejected) {
-    oru_test::Pushed<OpenGLTracer> tracer;
-    std::ostringstream text;
-    tracer->setOutputStream(text);
-    EXPECT_THROW(OpenGLInterceptor::Instance()->cgmBindTexture("f", 3, 0x12345678, 0),
-                 ExceptionOGL);
-    EXPECT_EQ("f:3: glBindTexture(Unknown Token, 0)\n", text.str());
 }

@@ -5,6 +5,7 @@
 #include "oru/oru_ogl/extensionator/internal/opengltoken.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
