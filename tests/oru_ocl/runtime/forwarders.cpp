@@ -37,7 +37,7 @@ constexpr bool StartsWith(std::string_view name, std::string_view prefix) {
 
 /// The result of a call that did nothing.
 template<class Result, class... Arguments>
-Result Failed(cl_int code, Arguments... arguments) {
+Result Failed([[maybe_unused]] cl_int code, [[maybe_unused]] Arguments... arguments) {
     if constexpr (std::is_same_v<Result, cl_int>) {
         return code;
     } else {
@@ -59,65 +59,57 @@ bool Usable([[maybe_unused]] Argument argument) {
         return true;
 }
 
+template<class Handle, class... Kinds>
+constexpr bool IsOneOf = (std::is_same_v<Handle, Kinds> || ...);
 template<class Handle>
-constexpr bool IsCounted =
-    std::is_same_v<Handle, cl_context> || std::is_same_v<Handle, cl_command_queue> ||
-    std::is_same_v<Handle, cl_mem> || std::is_same_v<Handle, cl_sampler> ||
-    std::is_same_v<Handle, cl_program> || std::is_same_v<Handle, cl_kernel> ||
-    std::is_same_v<Handle, cl_event>;
+constexpr bool IsCounted = IsOneOf<Handle, cl_context, cl_command_queue, cl_mem, cl_sampler,
+                                   cl_program, cl_kernel, cl_event>;
 
-/// Notes the reference that the caller received through an argument.
-template<class Argument>
-void NoteReceived([[maybe_unused]] Argument argument) {
-    if constexpr (std::is_same_v<Argument, cl_event *>)
-        if (argument && *argument)
-            CallBook::Instance().add(*argument);
+bool Count(void const *handle, int change) {
+    return handle && CallBook::Instance().count(handle, change);
 }
 
 [[maybe_unused]] void NoteKernels(cl_program, cl_uint count, cl_kernel *kernels, cl_uint *) {
     for (cl_uint i = 0; kernels && i < count; ++i)
-        CallBook::Instance().add(kernels[i]);
+        Count(kernels[i], 1);
 }
 
-template<class Handle>
-void NoteReleased(Handle handle) {
-    if (CallBook::Instance().remove(handle))
-        Forget(handle);
+/// Notes the reference that goes with an argument: the handle's own one, or a received event's.
+template<int Change, class Argument>
+void NoteArgument([[maybe_unused]] Argument argument) {
+    if constexpr (std::is_same_v<Argument, cl_event *>)
+        Count(argument ? *argument : nullptr, 1);
+    else if constexpr (Change != 0 && IsCounted<Argument>)
+        if (Count(argument, Change))
+            Forget(argument);
 }
 
 /// What became of the caller's references by a call that succeeded.
 template<class Name, class Result, class... Arguments>
-void Note(Result result, Arguments... arguments) {
+void Note([[maybe_unused]] Result result, [[maybe_unused]] Arguments... arguments) {
     constexpr std::string_view name = Name::text();
-    CallBook &book = CallBook::Instance();
-    if constexpr (IsCounted<Result>) {
-        if (result)
-            book.add(result);
-    } else if constexpr (name == "clCreateKernelsInProgram") {
+    constexpr int change = StartsWith(name, "clRetain") - StartsWith(name, "clRelease");
+    if constexpr (IsCounted<Result>)
+        Count(result, 1);
+    else if constexpr (name == "clCreateKernelsInProgram")
         NoteKernels(arguments...);
-    } else if constexpr (StartsWith(name, "clRetain") && (IsCounted<Arguments> && ...)) {
-        book.add(arguments...);
-    } else if constexpr (StartsWith(name, "clRelease") && (IsCounted<Arguments> && ...)) {
-        NoteReleased(arguments...);
-    } else {
-        (NoteReceived(arguments), ...);
-    }
+    else
+        (NoteArgument<change>(arguments), ...);
 }
 
-/// One exported function.
+/// What an export does.
 template<class Name, class Result, class... Parameters>
-struct Entry {
-    Result (CL_API_CALL *FunctionTable::*slot)(Parameters...);
-
-    Result operator()(Parameters... arguments) const {
+auto Call(Result (CL_API_CALL *FunctionTable::*slot)(Parameters...)) {
+    return [slot](Parameters... arguments) -> Result {
+        constexpr std::string_view name = Name::text();
         if (cl_int const code = CallBook::Instance().enter(Name::text()))
             return Failed<Result>(code, arguments...);
         auto const function = Replacements().*slot ? Replacements().*slot : System().*slot;
-        if (!function)
+        bool allowed = function && (faces.hasImages || !StartsWith(name, "clCreateImage"));
+        if constexpr (StartsWith(name, "clEnqueue"))
+            allowed = allowed && (Usable(arguments) && ...);
+        if (!allowed)
             return Failed<Result>(CL_INVALID_OPERATION, arguments...);
-        if constexpr (StartsWith(Name::text(), "clEnqueue"))
-            if (!(Usable(arguments) && ...))
-                return Failed<Result>(CL_INVALID_OPERATION, arguments...);
         Result const result = function(arguments...);
         bool succeeded = true;
         if constexpr (std::is_same_v<Result, cl_int>)
@@ -125,13 +117,7 @@ struct Entry {
         if (succeeded)
             Note<Name>(result, arguments...);
         return result;
-    }
-};
-
-template<class Name, class Result, class... Parameters>
-Entry<Name, Result, Parameters...>
-EntryOf(Result (CL_API_CALL *FunctionTable::*slot)(Parameters...)) {
-    return {slot};
+    };
 }
 
 } // namespace
@@ -151,41 +137,21 @@ FunctionTable const &Replacements() {
     return table;
 }
 
-#define ORU_CL_EXPORT(Result, Name, Parameters, Arguments)                                         \
+#define ORU_CL_ENTRY(Result, Name, Parameters, Arguments)                                          \
     namespace {                                                                                    \
     struct NameOf_##Name {                                                                         \
         static constexpr char const *text() { return #Name; }                                      \
     };                                                                                             \
     }                                                                                              \
     extern "C" CL_API_ENTRY Result CL_API_CALL Name Parameters {                                   \
-        return EntryOf<NameOf_##Name>(&FunctionTable::Name) Arguments;                             \
+        return Call<NameOf_##Name>(&FunctionTable::Name) Arguments;                                \
     }
-
-// The older faces lack whole groups.
-#ifdef ORU_TEST_WITHOUT_1_0
-#define ORU_CL_EXPORTS_EXTENSION_VERSION_1_0(...)
-#else
-#define ORU_CL_EXPORTS_EXTENSION_VERSION_1_0(...) ORU_CL_EXPORT(__VA_ARGS__)
-#endif
-#ifdef ORU_TEST_WITHOUT_1_1
-#define ORU_CL_EXPORTS_EXTENSION_VERSION_1_1(...)
-#else
-#define ORU_CL_EXPORTS_EXTENSION_VERSION_1_1(...) ORU_CL_EXPORT(__VA_ARGS__)
-#endif
-#define ORU_CL_EXPORTS_EXTENSION_EXT_DEVICE_FISSION(...) ORU_CL_EXPORT(__VA_ARGS__)
-#define ORU_CL_EXPORTS_EXTENSION_EXT_MIGRATE_MEMOBJECT(...) ORU_CL_EXPORT(__VA_ARGS__)
-#define ORU_CL_EXPORTS_EXTENSION_KHR_GL_EVENT(...) ORU_CL_EXPORT(__VA_ARGS__)
-#define ORU_CL_EXPORTS_EXTENSION_KHR_GL_SHARING(...) ORU_CL_EXPORT(__VA_ARGS__)
-#define ORU_CL_EXPORTS_EXTENSION_KHR_ICD(...) ORU_CL_EXPORT(__VA_ARGS__)
-
-#define ORU_CL_ENTRY(Extension, Result, Name, Parameters, Arguments)                               \
-    ORU_CL_EXPORTS_##Extension(Result, Name, Parameters, Arguments)
 #include "tests/oru_ocl/runtime/entrypoints.inc"
 
 } // namespace oru_test::runtime
 
 extern "C" __declspec(dllexport) oru_test::RuntimeControl const *OruTestRuntimeControl() {
-    using oru_test::runtime::CallBook;
+    using namespace oru_test::runtime;
     static oru_test::RuntimeControl const control = {
         [](char const *entryPoint, unsigned int call, cl_int code) {
             CallBook::Instance().fail(entryPoint, call, code);
@@ -194,9 +160,11 @@ extern "C" __declspec(dllexport) oru_test::RuntimeControl const *OruTestRuntimeC
         [](char const *entryPoint) { return CallBook::Instance().calls(entryPoint); },
         [] { return CallBook::Instance().liveHandles(); },
         [](void const *handle) { return CallBook::Instance().references(handle); },
-        oru_test::runtime::SetVersion,
-        oru_test::runtime::SetPlatforms,
-        oru_test::runtime::SetImages,
+        [](char const *version) {
+            faces.version = version ? std::optional<std::string>(version) : std::nullopt;
+        },
+        [](bool some) { faces.hasPlatforms = some; },
+        [](bool supported) { faces.hasImages = supported; },
     };
     return &control;
 }

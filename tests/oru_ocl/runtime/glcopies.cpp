@@ -2,9 +2,7 @@
 #include "glcopies.h"
 
 #include <algorithm>
-#include <array>
 #include <cmath>
-#include <cstdint>
 
 #include <GL/gl.h>
 
@@ -36,33 +34,17 @@ struct Functions {
 #undef ORU_GL_FUNCTION
 };
 
-// One row for each of the channel orders that the extension lists for a component type.
-#define ORU_SHARED_FORMATS(Suffix, Type, ClType, R, RG, RGBA, Bytes)                               \
-    {GL_R##Suffix, R, Type, {CL_R, ClType}, Bytes},                                                \
-        {GL_RG##Suffix, RG, Type, {CL_RG, ClType}, 2 * std::size_t(Bytes)},                        \
-        {GL_RGBA##Suffix, RGBA, Type, {CL_RGBA, ClType}, 4 * std::size_t(Bytes)},
-
-#define ORU_SHARED_FIXED(Suffix, Type, ClType, Bytes)                                              \
-    ORU_SHARED_FORMATS(Suffix, Type, ClType, GL_RED, GL_RG, GL_RGBA, Bytes)
-#define ORU_SHARED_INTEGER(Suffix, Type, ClType, Bytes)                                            \
-    ORU_SHARED_FORMATS(Suffix, Type, ClType, GL_RED_INTEGER, GL_RG_INTEGER, GL_RGBA_INTEGER, Bytes)
-
 constexpr SharedFormat formats[] = {
-    ORU_SHARED_FIXED(8, GL_UNSIGNED_BYTE, CL_UNORM_INT8,
-                     1) ORU_SHARED_FIXED(16, GL_UNSIGNED_SHORT, CL_UNORM_INT16,
-                                         2) ORU_SHARED_FIXED(8_SNORM, GL_BYTE, CL_SNORM_INT8, 1)
-        ORU_SHARED_FIXED(16_SNORM, GL_SHORT, CL_SNORM_INT16, 2) ORU_SHARED_FIXED(
-            16F, GL_HALF_FLOAT, CL_HALF_FLOAT, 2) ORU_SHARED_FIXED(32F, GL_FLOAT, CL_FLOAT, 4)
-            ORU_SHARED_INTEGER(8I, GL_BYTE, CL_SIGNED_INT8, 1)
-                ORU_SHARED_INTEGER(16I, GL_SHORT, CL_SIGNED_INT16, 2)
-                    ORU_SHARED_INTEGER(32I, GL_INT, CL_SIGNED_INT32, 4)
-                        ORU_SHARED_INTEGER(8UI, GL_UNSIGNED_BYTE, CL_UNSIGNED_INT8, 1)
-                            ORU_SHARED_INTEGER(16UI, GL_UNSIGNED_SHORT, CL_UNSIGNED_INT16, 2)
-                                ORU_SHARED_INTEGER(32UI, GL_UNSIGNED_INT, CL_UNSIGNED_INT32, 4)};
+    {GL_RGBA8, GL_RGBA, GL_UNSIGNED_BYTE, {CL_RGBA, CL_UNORM_INT8}, 4},
+    {GL_RGBA16, GL_RGBA, GL_UNSIGNED_SHORT, {CL_RGBA, CL_UNORM_INT16}, 8},
+    {GL_RGBA16F, GL_RGBA, GL_HALF_FLOAT, {CL_RGBA, CL_HALF_FLOAT}, 8},
+    {GL_RGBA32F, GL_RGBA, GL_FLOAT, {CL_RGBA, CL_FLOAT}, 16},
+    {GL_R32F, GL_RED, GL_FLOAT, {CL_R, CL_FLOAT}, 4},
+};
 
-SharedFormat const *FormatOf(int internalFormat) {
+SharedFormat const *FormatOf(std::size_t internalFormat) {
     for (SharedFormat const &format : formats)
-        if (format.internalFormat == static_cast<unsigned int>(internalFormat))
+        if (format.internalFormat == internalFormat)
             return &format;
     return nullptr;
 }
@@ -91,68 +73,46 @@ private:
     GLuint previous_;
 };
 
+/// The query for what is bound to a texture target.
 GLenum TextureBinding(GLenum target) {
-    switch (target) {
-    case GL_TEXTURE_2D:
-        return GL_TEXTURE_BINDING_2D;
-    case GL_TEXTURE_3D:
+    if (target == GL_TEXTURE_3D)
         return GL_TEXTURE_BINDING_3D;
-    default:
-        return GL_TEXTURE_BINDING_RECTANGLE;
-    }
+    return target == GL_TEXTURE_2D ? GL_TEXTURE_BINDING_2D : GL_TEXTURE_BINDING_RECTANGLE;
 }
 
 /// Pixels lie densely in memory, for a scope.
 class DensePixels {
 public:
-    explicit DensePixels(Functions const &gl)
-        : pack_(gl.BindBuffer, GL_PIXEL_PACK_BUFFER, GL_PIXEL_PACK_BUFFER_BINDING, 0),
-          unpack_(gl.BindBuffer, GL_PIXEL_UNPACK_BUFFER, GL_PIXEL_UNPACK_BUFFER_BINDING, 0) {
-        for (std::size_t i = 0; i < stores.size(); ++i) {
-            previous_[i] = GetInteger(stores[i]);
-            bool const alignment =
-                stores[i] == GL_PACK_ALIGNMENT || stores[i] == GL_UNPACK_ALIGNMENT;
-            glPixelStorei(stores[i], alignment ? 1 : 0);
-        }
+    explicit DensePixels(Functions const &gl) {
+        glPushClientAttrib(GL_CLIENT_PIXEL_STORE_BIT); // the bound buffers, too
+        gl.BindBuffer(GL_PIXEL_PACK_BUFFER, 0);
+        gl.BindBuffer(GL_PIXEL_UNPACK_BUFFER, 0);
+        constexpr GLenum stores[] = {
+            GL_PACK_ROW_LENGTH,    GL_PACK_SKIP_PIXELS,    GL_PACK_SKIP_ROWS,
+            GL_PACK_SKIP_IMAGES,   GL_PACK_IMAGE_HEIGHT,   GL_PACK_SWAP_BYTES,
+            GL_UNPACK_ROW_LENGTH,  GL_UNPACK_SKIP_PIXELS,  GL_UNPACK_SKIP_ROWS,
+            GL_UNPACK_SKIP_IMAGES, GL_UNPACK_IMAGE_HEIGHT, GL_UNPACK_SWAP_BYTES};
+        for (GLenum const store : stores)
+            glPixelStorei(store, 0);
+        glPixelStorei(GL_PACK_ALIGNMENT, 1);
+        glPixelStorei(GL_UNPACK_ALIGNMENT, 1);
     }
-    ~DensePixels() {
-        for (std::size_t i = 0; i < stores.size(); ++i)
-            glPixelStorei(stores[i], previous_[i]);
-    }
+    ~DensePixels() { glPopClientAttrib(); }
     DensePixels(DensePixels const &) = delete;
     DensePixels &operator=(DensePixels const &) = delete;
-
-private:
-    static constexpr std::array<GLenum, 14> stores = {
-        GL_PACK_ALIGNMENT,      GL_PACK_ROW_LENGTH,    GL_PACK_SKIP_PIXELS, GL_PACK_SKIP_ROWS,
-        GL_PACK_SKIP_IMAGES,    GL_PACK_IMAGE_HEIGHT,  GL_PACK_SWAP_BYTES,  GL_UNPACK_ALIGNMENT,
-        GL_UNPACK_ROW_LENGTH,   GL_UNPACK_SKIP_PIXELS, GL_UNPACK_SKIP_ROWS, GL_UNPACK_SKIP_IMAGES,
-        GL_UNPACK_IMAGE_HEIGHT, GL_UNPACK_SWAP_BYTES};
-
-    Bound<PFNGLBINDBUFFERPROC> pack_, unpack_;
-    std::array<GLint, stores.size()> previous_;
 };
 
-/// A framebuffer of our own, bound to `target` for a scope.
-class Framebuffer {
-public:
-    Framebuffer(Functions const &gl, GLenum target, GLenum query)
-        : gl_(gl), name_(Generate(gl)), bound_(gl.BindFramebuffer, target, query, name_) {}
-    ~Framebuffer() { gl_.DeleteFramebuffers(1, &name_); }
-    Framebuffer(Framebuffer const &) = delete;
-    Framebuffer &operator=(Framebuffer const &) = delete;
-
-private:
-    static GLuint Generate(Functions const &gl) {
-        GLuint name = 0;
-        gl.GenFramebuffers(1, &name);
-        return name;
+/// Does `work` with a framebuffer of our own bound to `target`.
+template<class Work>
+void InFramebuffer(Functions const &gl, GLenum target, GLenum query, Work work) {
+    GLuint name = 0;
+    gl.GenFramebuffers(1, &name);
+    {
+        Bound const bound(gl.BindFramebuffer, target, query, name);
+        work();
     }
-
-    Functions const &gl_;
-    GLuint name_;
-    Bound<PFNGLBINDFRAMEBUFFERPROC> bound_;
-};
+    gl.DeleteFramebuffers(1, &name);
+}
 
 auto const bindTexture = [](GLenum target, GLuint name) { glBindTexture(target, name); };
 using BoundTexture = Bound<decltype(bindTexture)>;
@@ -192,18 +152,17 @@ cl_int DescribeTexture(GLObject &object) {
         return CL_INVALID_GL_OBJECT;
     if (object.level < 0 || object.level > LastLevel(object.target))
         return CL_INVALID_MIP_LEVEL;
-    GLint size[3] = {}, internalFormat = 0;
-    glGetTexLevelParameteriv(object.target, object.level, GL_TEXTURE_WIDTH, &size[0]);
-    glGetTexLevelParameteriv(object.target, object.level, GL_TEXTURE_HEIGHT, &size[1]);
-    glGetTexLevelParameteriv(object.target, object.level, GL_TEXTURE_DEPTH, &size[2]);
-    glGetTexLevelParameteriv(object.target, object.level, GL_TEXTURE_INTERNAL_FORMAT,
-                             &internalFormat);
-    if (size[0] == 0 || size[1] == 0)
+    auto const get = [&object](GLenum query) {
+        GLint value = 0;
+        glGetTexLevelParameteriv(object.target, object.level, query, &value);
+        return static_cast<std::size_t>(value);
+    };
+    object.width = get(GL_TEXTURE_WIDTH);
+    object.height = get(GL_TEXTURE_HEIGHT);
+    object.depth = object.target == GL_TEXTURE_3D ? get(GL_TEXTURE_DEPTH) : 1;
+    if (object.width == 0 || object.height == 0)
         return CL_INVALID_GL_OBJECT;
-    object.width = static_cast<std::size_t>(size[0]);
-    object.height = static_cast<std::size_t>(size[1]);
-    object.depth = object.target == GL_TEXTURE_3D ? static_cast<std::size_t>(size[2]) : 1;
-    object.format = FormatOf(internalFormat);
+    object.format = FormatOf(get(GL_TEXTURE_INTERNAL_FORMAT));
     return object.format ? CL_SUCCESS : CL_INVALID_IMAGE_FORMAT_DESCRIPTOR;
 }
 
@@ -214,10 +173,10 @@ cl_int DescribeRenderbuffer(Functions const &gl, GLObject &object) {
     auto const get = [&gl](GLenum query) {
         GLint value = 0;
         gl.GetRenderbufferParameteriv(GL_RENDERBUFFER, query, &value);
-        return value;
+        return static_cast<std::size_t>(value);
     };
-    object.width = static_cast<std::size_t>(get(GL_RENDERBUFFER_WIDTH));
-    object.height = static_cast<std::size_t>(get(GL_RENDERBUFFER_HEIGHT));
+    object.width = get(GL_RENDERBUFFER_WIDTH);
+    object.height = get(GL_RENDERBUFFER_HEIGHT);
     if (object.width == 0 || object.height == 0)
         return CL_INVALID_GL_OBJECT;
     if (get(GL_RENDERBUFFER_SAMPLES) > 0)
@@ -226,38 +185,39 @@ cl_int DescribeRenderbuffer(Functions const &gl, GLObject &object) {
     return object.format ? CL_SUCCESS : CL_INVALID_IMAGE_FORMAT_DESCRIPTOR;
 }
 
-void ReadRenderbuffer(Functions const &gl, GLObject const &object, unsigned char *pixels) {
-    Framebuffer const source(gl, GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING);
-    gl.FramebufferRenderbuffer(GL_READ_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_RENDERBUFFER,
-                               object.name);
-    glReadBuffer(GL_COLOR_ATTACHMENT0);
-    glReadPixels(0, 0, static_cast<GLsizei>(object.width), static_cast<GLsizei>(object.height),
-                 object.format->format, object.format->type, pixels);
+void ReadRenderbuffer(Functions const &gl, GLObject const &object, void *pixels) {
+    InFramebuffer(gl, GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING, [&] {
+        gl.FramebufferRenderbuffer(GL_READ_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_RENDERBUFFER,
+                                   object.name);
+        glReadBuffer(GL_COLOR_ATTACHMENT0);
+        glReadPixels(0, 0, static_cast<GLsizei>(object.width), static_cast<GLsizei>(object.height),
+                     object.format->format, object.format->type, pixels);
+    });
 }
 
 /// Through a texture, since only rendering and blitting write to a renderbuffer.
-void WriteRenderbuffer(Functions const &gl, GLObject const &object, unsigned char const *pixels) {
+void WriteRenderbuffer(Functions const &gl, GLObject const &object, void *pixels) {
     auto const width = static_cast<GLsizei>(object.width);
     auto const height = static_cast<GLsizei>(object.height);
-    GLuint texture = 0;
-    glGenTextures(1, &texture);
-    {
-        BoundTexture const bound(bindTexture, GL_TEXTURE_2D, GL_TEXTURE_BINDING_2D, texture);
-        glTexImage2D(GL_TEXTURE_2D, 0, static_cast<GLint>(object.format->internalFormat), width,
-                     height, 0, object.format->format, object.format->type, pixels);
-        Framebuffer const source(gl, GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING);
-        gl.FramebufferTexture2D(GL_READ_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, texture,
-                                0);
-        Framebuffer const target(gl, GL_DRAW_FRAMEBUFFER, GL_DRAW_FRAMEBUFFER_BINDING);
+    auto const blit = [&] {
         gl.FramebufferRenderbuffer(GL_DRAW_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_RENDERBUFFER,
                                    object.name);
-        GLboolean const scissor = glIsEnabled(GL_SCISSOR_TEST);
+        glPushAttrib(GL_SCISSOR_BIT);
         glDisable(GL_SCISSOR_TEST);
         gl.BlitFramebuffer(0, 0, width, height, 0, 0, width, height, GL_COLOR_BUFFER_BIT,
                            GL_NEAREST);
-        if (scissor)
-            glEnable(GL_SCISSOR_TEST);
-    }
+        glPopAttrib();
+    };
+    GLuint texture = 0;
+    glGenTextures(1, &texture);
+    InFramebuffer(gl, GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING, [&] {
+        BoundTexture const bound(bindTexture, GL_TEXTURE_2D, GL_TEXTURE_BINDING_2D, texture);
+        glTexImage2D(GL_TEXTURE_2D, 0, static_cast<GLint>(object.format->internalFormat), width,
+                     height, 0, object.format->format, object.format->type, pixels);
+        gl.FramebufferTexture2D(GL_READ_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, texture,
+                                0);
+        InFramebuffer(gl, GL_DRAW_FRAMEBUFFER, GL_DRAW_FRAMEBUFFER_BINDING, blit);
+    });
     glDeleteTextures(1, &texture);
 }
 
@@ -292,26 +252,7 @@ cl_int Describe(GLObject &object) {
     }
 }
 
-void ReadGL(GLObject const &object, std::vector<unsigned char> &pixels) {
-    Functions const gl;
-    DensePixels const dense(gl);
-    pixels.resize(object.bytes());
-    if (object.kind == CL_GL_OBJECT_BUFFER) {
-        Bound const bound(gl.BindBuffer, GL_COPY_READ_BUFFER, GL_COPY_READ_BUFFER_BINDING,
-                          object.name);
-        gl.GetBufferSubData(GL_COPY_READ_BUFFER, 0, static_cast<GLsizeiptr>(object.width),
-                            pixels.data());
-    } else if (object.kind == CL_GL_OBJECT_RENDERBUFFER) {
-        ReadRenderbuffer(gl, object, pixels.data());
-    } else {
-        BoundTexture const bound(bindTexture, object.target, TextureBinding(object.target),
-                                 object.name);
-        glGetTexImage(object.target, object.level, object.format->format, object.format->type,
-                      pixels.data());
-    }
-}
-
-void WriteGL(GLObject const &object, std::vector<unsigned char> const &pixels) {
+void CopyGL(GLObject const &object, std::vector<unsigned char> &pixels, bool toOpenGL) {
     Functions const gl;
     DensePixels const dense(gl);
     auto const width = static_cast<GLsizei>(object.width);
@@ -319,20 +260,25 @@ void WriteGL(GLObject const &object, std::vector<unsigned char> const &pixels) {
     if (object.kind == CL_GL_OBJECT_BUFFER) {
         Bound const bound(gl.BindBuffer, GL_COPY_READ_BUFFER, GL_COPY_READ_BUFFER_BINDING,
                           object.name);
-        gl.BufferSubData(GL_COPY_READ_BUFFER, 0, static_cast<GLsizeiptr>(object.width),
-                         pixels.data());
+        if (toOpenGL)
+            gl.BufferSubData(GL_COPY_READ_BUFFER, 0, width, pixels.data());
+        else
+            gl.GetBufferSubData(GL_COPY_READ_BUFFER, 0, width, pixels.data());
     } else if (object.kind == CL_GL_OBJECT_RENDERBUFFER) {
-        WriteRenderbuffer(gl, object, pixels.data());
+        (toOpenGL ? WriteRenderbuffer : ReadRenderbuffer)(gl, object, pixels.data());
     } else {
         BoundTexture const bound(bindTexture, object.target, TextureBinding(object.target),
                                  object.name);
-        if (object.target == GL_TEXTURE_3D)
+        SharedFormat const &format = *object.format;
+        if (!toOpenGL)
+            glGetTexImage(object.target, object.level, format.format, format.type, pixels.data());
+        else if (object.target == GL_TEXTURE_3D)
             gl.TexSubImage3D(object.target, object.level, 0, 0, 0, width, height,
-                             static_cast<GLsizei>(object.depth), object.format->format,
-                             object.format->type, pixels.data());
+                             static_cast<GLsizei>(object.depth), format.format, format.type,
+                             pixels.data());
         else
-            glTexSubImage2D(object.target, object.level, 0, 0, width, height, object.format->format,
-                            object.format->type, pixels.data());
+            glTexSubImage2D(object.target, object.level, 0, 0, width, height, format.format,
+                            format.type, pixels.data());
     }
 }
 

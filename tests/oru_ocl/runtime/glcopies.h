@@ -60,8 +60,7 @@ private:
 /// prescribes.
 cl_int Describe(GLObject &object);
 
-/// Reads or writes the whole storage.
-void ReadGL(GLObject const &object, std::vector<unsigned char> &pixels);
-void WriteGL(GLObject const &object, std::vector<unsigned char> const &pixels);
+/// Copies the whole storage to `pixels`, or from there.
+void CopyGL(GLObject const &object, std::vector<unsigned char> &pixels, bool toOpenGL);
 
 } // namespace oru_test::runtime

@@ -4,6 +4,7 @@
 #include "oru/oru_ocl/functiontable.h"
 
 #include <cstddef>
+#include <optional>
 #include <string>
 
 namespace oru_test::runtime {
@@ -20,13 +21,13 @@ FunctionTable const &Replacements();
 void ReplaceQueries(FunctionTable &table);
 void ReplaceSharing(FunctionTable &table);
 
-/// @name Faces
-/// @{
-void SetVersion(char const *version);
-void SetPlatforms(bool some);
-void SetImages(bool supported);
-bool HasImages();
-/// @}
+/// What the runtime pretends to be; set while nobody uses it.
+struct Faces {
+    std::optional<std::string> version;
+    bool hasPlatforms = true;
+    bool hasImages = true;
+};
+inline Faces faces;
 
 /// Whether a command may use the memory object: one over an OpenGL object must be acquired.
 bool MayUse(cl_mem memory);
@@ -36,10 +37,6 @@ bool MayUse(cl_kernel kernel);
 
 /// The caller gave up its last reference.
 void Forget(void const *handle);
-
-/// Answers an information query with `size` bytes at `value`.
-cl_int Answer(void const *value, std::size_t size, std::size_t room, void *result,
-              std::size_t *sizeReturned);
 
 /// Sets an error out-parameter that may be null, and gives the null result that goes with it.
 inline std::nullptr_t Refuse(cl_int *error, cl_int code) {

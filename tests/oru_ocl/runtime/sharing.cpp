@@ -4,7 +4,6 @@
 
 #include <map>
 #include <mutex>
-#include <set>
 
 #include <GL/gl.h>
 
@@ -18,10 +17,10 @@ constexpr cl_int invalidShareGroup = -1000; // CL_INVALID_GL_SHAREGROUP_REFERENC
 
 using ContextCallback = void(CL_CALLBACK *)(char const *, void const *, std::size_t, void *);
 
+/// The OpenGL context with whose objects an OpenCL context shares.
 struct SharingContext {
     HDC dc = nullptr;
     HGLRC context = nullptr;
-    std::vector<cl_context_properties> properties; ///< as the caller gave them
 };
 
 struct SharedMemory {
@@ -36,7 +35,6 @@ struct State {
     std::map<cl_context, SharingContext> contexts;
     std::map<cl_mem, SharedMemory> memory;
     std::map<cl_kernel, std::map<cl_uint, cl_mem>> arguments;
-    std::map<cl_event, cl_command_type> events;
 };
 
 State &TheState() {
@@ -48,45 +46,37 @@ State &TheState() {
     State &name = TheState();                                                                      \
     std::lock_guard const lock(name.mutex)
 
-/// The caller's properties, and those of them that the system's runtime knows.
-struct ParsedProperties {
+/// Moves the sharing keys out of a list of properties.
+SharingContext TakeSharing(cl_context_properties const *properties,
+                           std::vector<cl_context_properties> &others) {
     SharingContext sharing;
-    std::vector<cl_context_properties> system;
-};
-
-ParsedProperties Parse(cl_context_properties const *properties) {
-    ParsedProperties parsed;
-    for (; properties && *properties; properties += 2) {
-        parsed.sharing.properties.insert(parsed.sharing.properties.end(),
-                                         {properties[0], properties[1]});
+    for (; properties && *properties; properties += 2)
         if (properties[0] == CL_WGL_HDC_KHR)
-            parsed.sharing.dc = reinterpret_cast<HDC>(properties[1]);
+            sharing.dc = reinterpret_cast<HDC>(properties[1]);
         else if (properties[0] == CL_GL_CONTEXT_KHR)
-            parsed.sharing.context = reinterpret_cast<HGLRC>(properties[1]);
+            sharing.context = reinterpret_cast<HGLRC>(properties[1]);
         else
-            parsed.system.insert(parsed.system.end(), {properties[0], properties[1]});
-    }
-    parsed.sharing.properties.push_back(0);
-    parsed.system.push_back(0);
-    return parsed;
+            others.insert(others.end(), {properties[0], properties[1]});
+    others.push_back(0);
+    return sharing;
 }
 
 /// Creates a context by `create(properties, error)` of the system, and remembers what it shares.
 template<class Create>
 cl_context CreateSharing(cl_context_properties const *properties, ContextCallback notify,
                          void *userData, cl_int *error, Create create) {
-    ParsedProperties parsed = Parse(properties);
-    bool const shares = parsed.sharing.context != nullptr;
-    if (shares && !CurrentGL(parsed.sharing.dc, parsed.sharing.context)) {
+    std::vector<cl_context_properties> others;
+    SharingContext const sharing = TakeSharing(properties, others);
+    if (sharing.context && !CurrentGL(sharing.dc, sharing.context)) {
         // Wine's opencl.dll takes no callback, so the only thing to call it for is ours.
         if (notify)
             notify("The OpenGL context is gone or current on another thread", nullptr, 0, userData);
         return Refuse(error, invalidShareGroup);
     }
-    cl_context const context = create(properties ? parsed.system.data() : nullptr, error);
-    if (context && shares) {
+    cl_context const context = create(properties ? others.data() : nullptr, error);
+    if (context && sharing.context) {
         ORU_LOCKED_STATE(state);
-        state.contexts[context] = parsed.sharing;
+        state.contexts[context] = sharing;
     }
     return context;
 }
@@ -107,43 +97,14 @@ cl_context CL_API_CALL CreateContextFromType(cl_context_properties const *proper
     });
 }
 
-cl_int CL_API_CALL GetContextInfo(cl_context context, cl_context_info query, std::size_t room,
-                                  void *result, std::size_t *sizeReturned) {
-    ORU_LOCKED_STATE(state);
-    auto const found = state.contexts.find(context);
-    if (found == state.contexts.end() || query != CL_CONTEXT_PROPERTIES)
-        return System().clGetContextInfo(context, query, room, result, sizeReturned);
-    auto const &properties = found->second.properties;
-    return Answer(properties.data(), properties.size() * sizeof properties[0], room, result,
-                  sizeReturned);
-}
-
-cl_int CL_API_CALL GetGLContextInfo(cl_context_properties const *properties,
-                                    cl_gl_context_info query, std::size_t room, void *result,
-                                    std::size_t *sizeReturned) {
-    SharingContext const sharing = Parse(properties).sharing;
-    if (!sharing.context || !CurrentGL(sharing.dc, sharing.context))
-        return invalidShareGroup;
-    if (query != CL_CURRENT_DEVICE_FOR_GL_CONTEXT_KHR && query != CL_DEVICES_FOR_GL_CONTEXT_KHR)
-        return CL_INVALID_VALUE;
-    cl_platform_id platform = nullptr;
-    for (auto const *entry = properties; *entry; entry += 2)
-        if (*entry == CL_CONTEXT_PLATFORM)
-            platform = reinterpret_cast<cl_platform_id>(entry[1]);
-    cl_device_id device = nullptr;
-    if (cl_int const error =
-            System().clGetDeviceIDs(platform, CL_DEVICE_TYPE_DEFAULT, 1, &device, nullptr))
-        return error;
-    return Answer(&device, sizeof device, room, result, sizeReturned);
-}
-
 /// The system's memory object that stands in for an OpenGL object.
 cl_mem CreateStandIn(cl_context context, cl_mem_flags flags, GLObject const &object,
                      cl_int *error) {
+    // The forwarders do not see these calls.
+    if (object.format && !faces.hasImages)
+        return Refuse(error, CL_INVALID_OPERATION);
     if (!object.format)
         return System().clCreateBuffer(context, flags, object.width, nullptr, error);
-    if (!HasImages())
-        return Refuse(error, CL_INVALID_OPERATION);
     cl_mem const image =
         object.kind == CL_GL_OBJECT_TEXTURE3D
             ? System().clCreateImage3D(context, flags, &object.format->image, object.width,
@@ -177,71 +138,22 @@ cl_mem CreateShared(cl_context context, cl_mem_flags flags, GLObject object,
     return memory;
 }
 
-cl_mem CreateFromTexture(cl_context context, cl_mem_flags flags, std::set<cl_GLenum> const &targets,
-                         cl_gl_object_type kind, cl_GLenum target, cl_GLint level, cl_GLuint name,
-                         cl_int *error) {
-    if (targets.count(target) == 0)
-        return Refuse(error, CL_INVALID_VALUE);
-    GLObject object;
-    object.kind = kind;
-    object.name = name;
-    object.target = target;
-    object.level = level;
-    return CreateShared(context, flags, object, error);
-}
-
 cl_mem CL_API_CALL CreateFromGLBuffer(cl_context context, cl_mem_flags flags, cl_GLuint name,
                                       cl_int *error) {
-    GLObject object;
-    object.kind = CL_GL_OBJECT_BUFFER;
-    object.name = name;
-    return CreateShared(context, flags, object, error);
+    return CreateShared(context, flags, {CL_GL_OBJECT_BUFFER, name}, error);
 }
 
 cl_mem CL_API_CALL CreateFromGLRenderbuffer(cl_context context, cl_mem_flags flags, cl_GLuint name,
                                             cl_int *error) {
-    GLObject object;
-    object.kind = CL_GL_OBJECT_RENDERBUFFER;
-    object.name = name;
-    return CreateShared(context, flags, object, error);
+    return CreateShared(context, flags, {CL_GL_OBJECT_RENDERBUFFER, name}, error);
 }
 
-cl_mem CL_API_CALL CreateFromGLTexture2D(cl_context context, cl_mem_flags flags, cl_GLenum target,
-                                         cl_GLint level, cl_GLuint name, cl_int *error) {
-    return CreateFromTexture(context, flags, {GL_TEXTURE_2D, GL_TEXTURE_RECTANGLE},
-                             CL_GL_OBJECT_TEXTURE2D, target, level, name, error);
-}
-
-cl_mem CL_API_CALL CreateFromGLTexture3D(cl_context context, cl_mem_flags flags, cl_GLenum target,
-                                         cl_GLint level, cl_GLuint name, cl_int *error) {
-    return CreateFromTexture(context, flags, {GL_TEXTURE_3D}, CL_GL_OBJECT_TEXTURE3D, target, level,
-                             name, error);
-}
-
-cl_int CL_API_CALL GetGLObjectInfo(cl_mem memory, cl_gl_object_type *kind, cl_GLuint *name) {
-    ORU_LOCKED_STATE(state);
-    auto const found = state.memory.find(memory);
-    if (found == state.memory.end())
-        return CL_INVALID_GL_OBJECT;
-    if (kind)
-        *kind = found->second.object.kind;
-    if (name)
-        *name = found->second.object.name;
-    return CL_SUCCESS;
-}
-
-cl_int CL_API_CALL GetGLTextureInfo(cl_mem memory, cl_gl_texture_info query, std::size_t room,
-                                    void *result, std::size_t *sizeReturned) {
-    ORU_LOCKED_STATE(state);
-    auto const found = state.memory.find(memory);
-    if (found == state.memory.end() || found->second.object.target == 0)
-        return CL_INVALID_GL_OBJECT;
-    GLObject const &object = found->second.object;
-    if (query == CL_GL_TEXTURE_TARGET)
-        return Answer(&object.target, sizeof object.target, room, result, sizeReturned);
-    if (query == CL_GL_MIPMAP_LEVEL)
-        return Answer(&object.level, sizeof object.level, room, result, sizeReturned);
-    return CL_INVALID_VALUE;
+template<cl_gl_object_type Kind, cl_GLenum Target, cl_GLenum OtherTarget>
+cl_mem CL_API_CALL CreateFromTexture(cl_context context, cl_mem_flags flags, cl_GLenum target,
+                                     cl_GLint level, cl_GLuint name, cl_int *error) {
+    if (target != Target && target != OtherTarget)
+        return Refuse(error, CL_INVALID_VALUE);
+    return CreateShared(context, flags, {Kind, name, target, level}, error);
 }
 
 /// Copies between an OpenGL object and its stand-in, through the host.
@@ -250,7 +162,7 @@ cl_int Copy(cl_command_queue queue, cl_mem memory, GLObject const &object, bool 
     std::size_t const origin[3] = {}, region[3] = {object.width, object.height, object.depth};
     auto const &system = System();
     if (!toOpenGL) {
-        ReadGL(object, pixels);
+        CopyGL(object, pixels, false);
         return object.format ? system.clEnqueueWriteImage(queue, memory, CL_TRUE, origin, region, 0,
                                                           0, pixels.data(), 0, nullptr, nullptr)
                              : system.clEnqueueWriteBuffer(queue, memory, CL_TRUE, 0, pixels.size(),
@@ -262,7 +174,7 @@ cl_int Copy(cl_command_queue queue, cl_mem memory, GLObject const &object, bool 
                              : system.clEnqueueReadBuffer(queue, memory, CL_TRUE, 0, pixels.size(),
                                                           pixels.data(), 0, nullptr, nullptr);
     if (error == CL_SUCCESS)
-        WriteGL(object, pixels);
+        CopyGL(object, pixels, true);
     return error;
 }
 
@@ -286,8 +198,9 @@ cl_int CheckTransfer(State &state, cl_context context, cl_uint count, cl_mem con
 }
 
 /// Acquires or releases.
-cl_int Transfer(bool toOpenGL, cl_command_queue queue, cl_uint count, cl_mem const *objects,
-                cl_uint waitCount, cl_event const *waits, cl_event *event) {
+template<bool ToOpenGL>
+cl_int CL_API_CALL Transfer(cl_command_queue queue, cl_uint count, cl_mem const *objects,
+                            cl_uint waitCount, cl_event const *waits, cl_event *event) {
     if ((count == 0) != (objects == nullptr))
         return CL_INVALID_VALUE;
     if ((waitCount == 0) != (waits == nullptr))
@@ -303,43 +216,18 @@ cl_int Transfer(bool toOpenGL, cl_command_queue queue, cl_uint count, cl_mem con
     CurrentGL const current(sharing->second.dc, sharing->second.context);
     if (!current)
         return CL_INVALID_GL_OBJECT;
-    if (cl_int const error = CheckTransfer(state, context, count, objects, toOpenGL))
+    if (cl_int const error = CheckTransfer(state, context, count, objects, ToOpenGL))
         return error;
     if (waitCount > 0)
         if (cl_int const error = System().clWaitForEvents(waitCount, waits))
             return error;
     for (cl_uint i = 0; i < count; ++i) {
         SharedMemory &shared = state.memory[objects[i]];
-        if (cl_int const error = Copy(queue, objects[i], shared.object, toOpenGL))
+        if (cl_int const error = Copy(queue, objects[i], shared.object, ToOpenGL))
             return error;
-        shared.acquired = !toOpenGL;
+        shared.acquired = !ToOpenGL;
     }
-    if (!event)
-        return CL_SUCCESS;
-    cl_int const error = System().clEnqueueMarker(queue, event);
-    if (error == CL_SUCCESS)
-        state.events[*event] =
-            toOpenGL ? CL_COMMAND_RELEASE_GL_OBJECTS : CL_COMMAND_ACQUIRE_GL_OBJECTS;
-    return error;
-}
-
-cl_int CL_API_CALL EnqueueAcquire(cl_command_queue queue, cl_uint count, cl_mem const *objects,
-                                  cl_uint waitCount, cl_event const *waits, cl_event *event) {
-    return Transfer(false, queue, count, objects, waitCount, waits, event);
-}
-
-cl_int CL_API_CALL EnqueueRelease(cl_command_queue queue, cl_uint count, cl_mem const *objects,
-                                  cl_uint waitCount, cl_event const *waits, cl_event *event) {
-    return Transfer(true, queue, count, objects, waitCount, waits, event);
-}
-
-cl_int CL_API_CALL GetEventInfo(cl_event event, cl_event_info query, std::size_t room, void *result,
-                                std::size_t *sizeReturned) {
-    ORU_LOCKED_STATE(state);
-    auto const found = state.events.find(event);
-    if (found == state.events.end() || query != CL_EVENT_COMMAND_TYPE)
-        return System().clGetEventInfo(event, query, room, result, sizeReturned);
-    return Answer(&found->second, sizeof found->second, room, result, sizeReturned);
+    return event ? System().clEnqueueMarker(queue, event) : CL_SUCCESS;
 }
 
 cl_int CL_API_CALL SetKernelArg(cl_kernel kernel, cl_uint index, std::size_t size,
@@ -377,23 +265,19 @@ void Forget(void const *handle) {
     state.contexts.erase(static_cast<cl_context>(key));
     state.memory.erase(static_cast<cl_mem>(key));
     state.arguments.erase(static_cast<cl_kernel>(key));
-    state.events.erase(static_cast<cl_event>(key));
 }
 
 void ReplaceSharing(FunctionTable &table) {
     table.clCreateContext = CreateContext;
     table.clCreateContextFromType = CreateContextFromType;
-    table.clGetContextInfo = GetContextInfo;
-    table.clGetGLContextInfoKHR = GetGLContextInfo;
     table.clCreateFromGLBuffer = CreateFromGLBuffer;
-    table.clCreateFromGLTexture2D = CreateFromGLTexture2D;
-    table.clCreateFromGLTexture3D = CreateFromGLTexture3D;
+    table.clCreateFromGLTexture2D =
+        CreateFromTexture<CL_GL_OBJECT_TEXTURE2D, GL_TEXTURE_2D, GL_TEXTURE_RECTANGLE>;
+    table.clCreateFromGLTexture3D =
+        CreateFromTexture<CL_GL_OBJECT_TEXTURE3D, GL_TEXTURE_3D, GL_TEXTURE_3D>;
     table.clCreateFromGLRenderbuffer = CreateFromGLRenderbuffer;
-    table.clGetGLObjectInfo = GetGLObjectInfo;
-    table.clGetGLTextureInfo = GetGLTextureInfo;
-    table.clEnqueueAcquireGLObjects = EnqueueAcquire;
-    table.clEnqueueReleaseGLObjects = EnqueueRelease;
-    table.clGetEventInfo = GetEventInfo;
+    table.clEnqueueAcquireGLObjects = Transfer<false>;
+    table.clEnqueueReleaseGLObjects = Transfer<true>;
     table.clSetKernelArg = SetKernelArg;
 }
 
