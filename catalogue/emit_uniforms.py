@@ -20,7 +20,7 @@ class Row:
     def __init__(self, cells):
         self.setter, self.form, self.element, self.upload, self.type = cells
         if self.form == "values":
-            names = "xyzw"[:int(self.upload[0])] if self.type.find("SAMPLER") < 0 else ["unit"]
+            names = "xyzw"[:int(self.upload[0])] if "SAMPLER" not in self.type else ["unit"]
             self.parameters = ", ".join(f"{self.element} {name}" for name in names)
             self.arguments = ", ".join(names)
         elif self.form in PARAMETERS:

@@ -54,6 +54,10 @@ TemporaryBlendScope::~TemporaryBlendScope() {
 }
 
 TemporaryAlphaBlendScope::TemporaryAlphaBlendScope() {
+    // What the calls will set: when one of them fails, the base puts it back.
+    current_ = {true,         GL_ONE_MINUS_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA,
+                GL_SRC_ALPHA, GL_SRC_ALPHA,           GL_FUNC_ADD,
+                GL_FUNC_ADD};
     ORU_GL(Enable, GL_BLEND);
     ORU_GL(BlendFunc, GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
     ORU_GL(BlendEquation, GL_FUNC_ADD);

@@ -24,7 +24,7 @@ struct ORU_API BlendState {
 /// Puts blending back at its end, as far as a derived scope changed it.
 ///
 /// It compares what it found with what the scope set, so changes that the caller makes itself stay,
-/// and a scope that changed nothing makes no call.
+/// and a scope that changed nothing changes nothing at its end.
 class ORU_API TemporaryBlendScope {
 public:
     /// Captures the blending. @throws as BlendState::setToCurrentGLValues

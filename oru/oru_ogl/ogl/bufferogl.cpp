@@ -47,6 +47,8 @@ Buffer::Buffer(std::int64_t size, Type type, Usage usage, void const *data)
     ORU_ASSERT_SUPPORTED(GL_ARB_VERTEX_BUFFER_OBJECT);
     if (size < 1)
         ORU_THROW_INTERNAL("Range error: nSize > 0");
+    // A context may name both extensions and be too old for the entry points that are called here.
+    ORU_ASSERT_SUPPORTED(GL_VERSION_1_5);
     ORU_GL(GenBuffers, 1, &objectID_);
     ORU_ASSERT(objectID_ != 0);
     try {

@@ -19,7 +19,7 @@ namespace ORU::OGL {
 ///     pixels.unmap();
 ///     Buffer::BindDefaultUnpackBuffer();
 ///
-/// GL functions of version 2.1, or GL_ARB_vertex_buffer_object and GL_ARB_pixel_buffer_object.
+/// OpenGL 2.1, or 1.5 with GL_ARB_vertex_buffer_object and GL_ARB_pixel_buffer_object.
 class ORU_API Buffer : public Object {
 public:
     enum Type : unsigned int {
@@ -46,8 +46,8 @@ public:
     /// @param size bytes, at least 1
     /// @param type a number that is no Type makes a pixel unpack buffer
     /// @param data `size` bytes to fill the store with, or null for one without contents
-    /// @throws InternalException without the two extensions, or for a size below 1; ExceptionOGL
-    ///         when there is no memory
+    /// @throws InternalException without the two extensions or OpenGL 1.5, and for a size below 1;
+    ///         ExceptionOGL when there is no memory
     /// @note glGenBuffers, glBufferData
     Buffer(std::int64_t size, Type type, Usage usage, void const *data);
 

@@ -146,11 +146,10 @@ public:
     /// | setter | values | GL call |
     /// |---|---|---|
     /// | `setUniform` | 1 to 4 of bool, unsigned char, int or float | glUniform{1,2,3,4}{i,f} |
-    /// | `setUniform`, `setUniform2`, `3`, `4` | a count and a pointer to int or float |
-    /// glUniform{1,2,3,4}{iv,fv} | | `setUniformSampler1D`, `2D`, `2DRECT`, `3D` | a texture unit's
-    /// index | glUniform1i | | `setUniformMatrix2`, `3`, `4` | n × n floats, whether to transpose |
-    /// glUniformMatrix{2,3,4}fv | | `setUniformMatrices2`, `3`, `4` | the same after a count |
-    /// glUniformMatrix{2,3,4}fv |
+    /// | `setUniform`, `…2`, `…3`, `…4` | a count, int or float array | glUniform{1,2,3,4}{i,f}v |
+    /// | `setUniformSampler1D`, `…2D`, `…2DRECT`, `…3D` | a texture unit's index | glUniform1i |
+    /// | `setUniformMatrix2`, `…3`, `…4` | n × n floats, transpose | glUniformMatrix{2,3,4}fv |
+    /// | `setUniformMatrices2`, `…3`, `…4` | the same after a count | glUniformMatrix{2,3,4}fv |
     ///
     /// Matrices lie column after column unless transposed. A location of -1 is ignored.
     ///

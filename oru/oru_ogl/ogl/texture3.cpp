@@ -16,6 +16,7 @@ void Texture3::initialize(Allocate allocate) {
         !(internal::IsPowerOfTwoSize(width(0)) && internal::IsPowerOfTwoSize(height(0)) &&
           internal::IsPowerOfTwoSize(Texture::depth(0))))
         ORU_THROW_INTERNAL("Texture3::ctor hardware only supports power of two textures");
+    ORU_ASSERT_SUPPORTED(GL_VERSION_1_2); // glTexImage3D
 
     unsigned int const previous = getBoundID();
     ORU_GL(BindTexture, target(), objectID());
@@ -33,10 +34,10 @@ void Texture3::initialize(Allocate allocate) {
 Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
                    std::uint64_t height, std::uint64_t depth, bool mipmapped)
     : Texture(target, binding, format, width, height, depth) {
-    auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format));
-    unsigned int const glFormat = getGLFormat(format);
     std::size_t const halved = target == TARGET_TEXTURE_2D_ARRAY ? 2 : 3;
     initialize([&](std::array<GLsizei, 3> const &level0) {
+        auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format));
+        unsigned int const glFormat = getGLFormat(format);
         internal::ForEachLevel(
             level0, halved, mipmapped, [&](GLint level, std::array<GLsizei, 3> const &sides) {
                 ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1],
@@ -50,14 +51,16 @@ Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, 
                    Format clientFormat, Type type, void const *data,
                    PixelUnpackParameters const &params)
     : Texture(target, binding, format, width, height, depth) {
-    auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format));
-    unsigned int const glFormat = Format2GL(clientFormat);
-    unsigned int const glType = Type2GL(type);
     initialize([&](std::array<GLsizei, 3> const &sides) {
-        internal::WithUnpackState(params, [&] {
-            ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1],
-                   sides[2], 0, glFormat, glType, data);
-        });
+        auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format));
+        unsigned int const glFormat = Format2GL(clientFormat);
+        unsigned int const glType = Type2GL(type);
+        ORU_GL(PushClientAttrib, GL_CLIENT_PIXEL_STORE_BIT);
+        internal::Ending restoreUnpackState([] { ORU_GL0(PopClientAttrib); });
+        params.apply();
+        ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1], sides[2], 0,
+               glFormat, glType, data);
+        restoreUnpackState.now();
     });
 }
 

@@ -61,8 +61,8 @@ public:
     std::size_t pixelDataSize(int level, Format format, Type type) const;
 
 protected:
-    /// @throws InternalException for a size that is no power of two where that is needed,
-    ///         ExceptionOGL when OpenGL refuses size or format
+    /// @throws InternalException for a size that is no power of two where that is needed, and
+    ///         before OpenGL 1.2; ExceptionOGL when OpenGL refuses size or format
     /// @note glTexImage3D
     Texture3(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
              std::uint64_t height, std::uint64_t depth, bool mipmapped);

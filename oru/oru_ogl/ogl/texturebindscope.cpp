@@ -3,7 +3,7 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/dropexceptions.h"
+#include "oru/oru_ogl/ogl/internal/release.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texturestate.h"
 #include "oru/oru_ogl/ogl/textureunit.h"
@@ -38,7 +38,7 @@ Texture2DBindScope::~Texture2DBindScope() {
 }
 
 void Texture2DBindScope::end() const noexcept {
-    internal::DropExceptions([this] {
+    internal::Release([this] {
         TextureState::SetActiveTextureUnit(unit_);
         TextureUnit const &unit = *TextureUnit::Unit(unit_);
         unit.bind2DDefault();

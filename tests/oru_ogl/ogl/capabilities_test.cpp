@@ -2,6 +2,7 @@
 #include "objecttest.h"
 
 #include "oru/core/utility/versionstring.h"
+#include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/programogl.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
@@ -11,75 +12,77 @@
 #include <algorithm>
 
 using namespace ORU::OGL;
-using oru_test::MessageOf;
+using namespace oru_test;
 
 namespace {
 
-class CapabilitiesTest : public oru_test::ObjectTest {
-protected:
-    /// Whether the context's own version text is at least this.
-    static bool isVersion(unsigned int wantedMajor, unsigned int wantedMinor) {
-        unsigned int major = 0, minor = 0;
-        int release = 0;
-        std::string rest;
-        ORU::TokenizeVersionString(reinterpret_cast<char const *>(::glGetString(GL_VERSION)), major,
-                                   minor, release, rest);
-        return major > wantedMajor || (major == wantedMajor && minor >= wantedMinor);
+/// Whether the context's own version text is at least this.
+bool IsVersion(unsigned int wantedMajor, unsigned int wantedMinor) {
+    unsigned int major = 0, minor = 0;
+    int release = 0;
+    std::string rest;
+    ORU::TokenizeVersionString(reinterpret_cast<char const *>(::glGetString(GL_VERSION)), major,
+                               minor, release, rest);
+    return major > wantedMajor || (major == wantedMajor && minor >= wantedMinor);
+}
+
+bool Has(char const *name) {
+    auto const &names = ExtensionManager::Instance()->supportedExtensionNames();
+    return std::find(names.begin(), names.end(), name) != names.end();
+}
+
+/// The failure of a constructor with these needs: the first that the context does not meet.
+std::string Failure(std::vector<std::pair<bool, char const *>> const &needs) {
+    for (auto const &[met, name] : needs) {
+        if (!met)
+            return std::string("ExtensionManager::Instance()->isSupported(") + name + ")";
     }
-    static bool has(char const *name) {
-        auto const &names = ExtensionManager::Instance()->supportedExtensionNames();
-        return std::find(names.begin(), names.end(), name) != names.end();
-    }
-};
+    return "";
+}
 
 } // namespace
 
+class CapabilitiesTest : public ObjectTest {};
+
 TEST_F(CapabilitiesTest, ShadersAndPrograms) {
-    RecordProperty("version", reinterpret_cast<char const *>(::glGetString(GL_VERSION)));
-    bool const programs = isVersion(2, 0);
+    bool const programs = IsVersion(2, 0);
     EXPECT_EQ(programs, Program::IsSupported());
-    EXPECT_EQ(programs ? "" : "OpenGL shader programs must be supported",
-              MessageOf([] { Program program; }));
-    bool const tessellation = programs && has("GL_ARB_tessellation_shader");
-    struct Kind {
-        Shader::ShaderType type;
-        bool supported;
-    } const kinds[] = {{Shader::SHADERTYPE_FRAGMENT, programs},
-                       {Shader::SHADERTYPE_VERTEX, programs},
-                       {Shader::SHADERTYPE_TESSELLATION_CONTROL, tessellation},
-                       {Shader::SHADERTYPE_TESSELLATION_EVALUATION, tessellation},
-                       {Shader::SHADERTYPE_GEOMETRY, isVersion(3, 2)},
-                       {Shader::SHADERTYPE_COMPUTE, false}};
-    for (Kind const &kind : kinds) {
-        EXPECT_EQ(kind.supported, Shader::IsSupported(kind.type)) << kind.type;
-        EXPECT_EQ(kind.supported ? "" : "Unsupported shader type",
-                  MessageOf([&] { Shader shader(kind.type); }))
-            << kind.type;
+    EXPECT_FAILURE(programs ? "" : "OpenGL shader programs must be supported", Program());
+    bool const tessellation = programs && Has("GL_ARB_tessellation_shader");
+    bool const supported[] = {programs,        programs, tessellation, tessellation,
+                              IsVersion(3, 2), false,    false};
+    for (unsigned int i = 0; i < 7; ++i) {
+        auto const type = static_cast<Shader::ShaderType>(i);
+        EXPECT_EQ(supported[i], Shader::IsSupported(type)) << i;
+        EXPECT_FAILURE(supported[i] ? "" : "Unsupported shader type", Shader shader(type)) << i;
     }
 }
 
-TEST_F(CapabilitiesTest, FramebuffersAndVertexArrays) {
-    bool const framebuffers = has("GL_EXT_framebuffer_object");
+TEST_F(CapabilitiesTest, BuffersOfEveryKind) {
+    bool const pixels = Has("GL_ARB_pixel_buffer_object"),
+               vertices = Has("GL_ARB_vertex_buffer_object");
+    EXPECT_EQ(pixels && vertices, Buffer::IsSupported());
+    EXPECT_FAILURE(Failure({{pixels, "GL_ARB_PIXEL_BUFFER_OBJECT"},
+                            {vertices, "GL_ARB_VERTEX_BUFFER_OBJECT"},
+                            {IsVersion(1, 5), "GL_VERSION_1_5"}}),
+                   Buffer(4, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr));
+    bool const framebuffers = Has("GL_EXT_framebuffer_object");
     EXPECT_EQ(framebuffers, Framebuffer::IsSupported());
     EXPECT_EQ(framebuffers, Renderbuffer::IsSupported());
-    EXPECT_EQ(framebuffers ? "" : "IsSupported()", MessageOf([] { Framebuffer framebuffer; }));
-    EXPECT_EQ(framebuffers ? ""
-                           : "ExtensionManager::Instance()->isSupported(GL_EXT_FRAMEBUFFER_OBJECT)",
-              MessageOf([] { Renderbuffer renderbuffer(GL_RGBA8, 1, 1); }));
-
-    char const *const needed = !isVersion(2, 0)                     ? "GL_VERSION_2_0"
-                               : !has("GL_ARB_vertex_array_object") ? "GL_ARB_VERTEX_ARRAY_OBJECT"
-                                                                    : nullptr;
-    EXPECT_EQ(needed ? std::string("ExtensionManager::Instance()->isSupported(") + needed + ")"
-                     : "",
-              MessageOf([] { VertexBuffer().setupWithProgram(0u); }));
+    EXPECT_FAILURE(framebuffers ? "" : "IsSupported()", Framebuffer());
+    EXPECT_FAILURE(Failure({{framebuffers, "GL_EXT_FRAMEBUFFER_OBJECT"}}),
+                   Renderbuffer(GL_RGBA8, 1, 1));
+    EXPECT_FAILURE(Failure({{IsVersion(2, 0), "GL_VERSION_2_0"},
+                            {Has("GL_ARB_vertex_array_object"), "GL_ARB_VERTEX_ARRAY_OBJECT"}}),
+                   VertexBuffer().setupWithProgram(0u));
 }
 
 TEST_F(CapabilitiesTest, NothingIsSupportedWithoutAContext) {
     ScopedContextWrapper const restore;
     ::wglMakeCurrent(nullptr, nullptr);
-    EXPECT_FALSE(Program::IsSupported());
-    EXPECT_FALSE(Shader::IsSupported(Shader::SHADERTYPE_VERTEX));
-    EXPECT_FALSE(Framebuffer::IsSupported());
+    EXPECT_FALSE(Program::IsSupported() || Shader::IsSupported(Shader::SHADERTYPE_VERTEX));
+    EXPECT_FALSE(Buffer::IsSupported() || Framebuffer::IsSupported());
     EXPECT_FALSE(Renderbuffer::IsSupported());
+    EXPECT_FAILURE(Failure({{false, "GL_ARB_PIXEL_BUFFER_OBJECT"}}),
+                   Buffer(4, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr));
 }

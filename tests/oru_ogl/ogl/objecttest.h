@@ -1,4 +1,4 @@
-// What tests of GL objects share: the fixture that counts names, and expected failures.
+// What tests of GL objects share: the fixture that counts names, expected failures, queries.
 #pragma once
 
 #include "../glfixture.h"
@@ -12,7 +12,16 @@
 #include <string>
 #include <vector>
 
+/// Expects a statement to throw the library's exception with a message, or nothing where it is "".
+#define EXPECT_FAILURE(text, ...) EXPECT_EQ(text, ::oru_test::MessageOf([&] { __VA_ARGS__; }))
+
 namespace oru_test {
+
+inline GLint Get(GLenum name) {
+    GLint value = -1;
+    ::glGetIntegerv(name, &value);
+    return value;
+}
 
 /// Follows the names of GL objects from generation to deletion.
 class NameLedger : public ORU::OGL::OpenGLForwarder {
@@ -34,24 +43,19 @@ public:
     ORU_FOLLOW(VertexArrays)
 #undef ORU_FOLLOW
 
-    GLuint cgmCreateShader(char const *file, unsigned int line, GLenum type) override {
-        GLuint const name = OpenGLForwarder::cgmCreateShader(file, line, type);
-        add("Shader", 1, &name);
-        return name;
+#define ORU_FOLLOW(Object, Parameters, ...)                                                        \
+    GLuint cgmCreate##Object Parameters override {                                                 \
+        GLuint const name = OpenGLForwarder::cgmCreate##Object(__VA_ARGS__);                       \
+        add(#Object, 1, &name);                                                                    \
+        return name;                                                                               \
+    }                                                                                              \
+    void cgmDelete##Object(char const *file, unsigned int line, GLuint name) override {            \
+        remove(#Object, 1, &name);                                                                 \
+        OpenGLForwarder::cgmDelete##Object(file, line, name);                                      \
     }
-    void cgmDeleteShader(char const *file, unsigned int line, GLuint name) override {
-        remove("Shader", 1, &name);
-        OpenGLForwarder::cgmDeleteShader(file, line, name);
-    }
-    GLuint cgmCreateProgram(char const *file, unsigned int line) override {
-        GLuint const name = OpenGLForwarder::cgmCreateProgram(file, line);
-        add("Program", 1, &name);
-        return name;
-    }
-    void cgmDeleteProgram(char const *file, unsigned int line, GLuint name) override {
-        remove("Program", 1, &name);
-        OpenGLForwarder::cgmDeleteProgram(file, line, name);
-    }
+    ORU_FOLLOW(Shader, (char const *file, unsigned int line, GLenum type), file, line, type)
+    ORU_FOLLOW(Program, (char const *file, unsigned int line), file, line)
+#undef ORU_FOLLOW
 
     int made() const {
         return made_;
