@@ -12,20 +12,6 @@ using oru_test::MessageOf;
 
 namespace {
 
-/// Writes its letter down when a call passes.
-class Marker : public OpenGLForwarder {
-public:
-    Marker(char letter, std::string &log) : letter_(letter), log_(log) {}
-    void cgmFlush(char const *file, unsigned int line) override {
-        log_ += letter_;
-        OpenGLForwarder::cgmFlush(file, line);
-    }
-
-private:
-    char letter_;
-    std::string &log_;
-};
-
 /// The error, its place and its number that a call fails with.
 template<class Call>
 std::string Failure(Call call) {
@@ -46,16 +32,16 @@ OpenGLInterceptor &First() {
 
 class ChainTest : public oru_test::OffscreenTest {};
 
-TEST_F(ChainTest, CallsTheLastPushedFirst) {
-    std::string log;
-    Marker a('a', log), b('b', log);
+TEST_F(ChainTest, StartsWithTheLastPushed) {
+    OpenGLForwarder a, b;
     ExtensionManager &record = *ExtensionManager::Instance();
-    OpenGLInterceptor *const checker = OpenGLInterceptor::Instance();
+    OpenGLInterceptor *const checker = &First();
     ASSERT_NE(nullptr, dynamic_cast<OpenGLErrorChecker *>(checker));
     checker->addInterceptor(&a);
     record.addInterceptor(&b);
-    ORU_GL0(Flush);
-    EXPECT_EQ("ba", log);
+    EXPECT_EQ(&b, &First());
+    EXPECT_EQ(&a, b.interceptor());
+    EXPECT_EQ(checker, a.interceptor());
     EXPECT_EQ("Enforce dynamic_cast<OpenGLErrorChecker *>(sInterceptor_) != NULL",
               MessageOf([] { OpenGLInterceptor::Destroy(); }));
     EXPECT_EQ(&b, record.popInterceptor());

@@ -6,7 +6,7 @@
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 
 #include <algorithm>
-#include <cstring>
+#include <utility>
 
 using namespace ORU::OGL;
 using oru_test::ContextCounter;
@@ -33,19 +33,6 @@ public:
             throw ORU::InternalException(file, static_cast<int>(line), "an obstacle");
         OpenGLForwarder::cgmTexCoord2f(file, line, s, t);
     }
-};
-
-/// Hides WGL_ARB_render_texture from the records that are built meanwhile.
-class FewWGLExtensions : public WGLForwarder {
-public:
-    PROC wcgmGetProcAddress(char const *file, unsigned int line, char const *name) override {
-        if (!std::strcmp(name, "wglGetExtensionsStringARB"))
-            return reinterpret_cast<PROC>(reinterpret_cast<void *>(&Text));
-        return WGLForwarder::wcgmGetProcAddress(file, line, name);
-    }
-
-private:
-    static char const *WINAPI Text(HDC) { return "WGL_ARB_extensions_string"; }
 };
 
 ExtensionManager &Record() {
@@ -110,19 +97,4 @@ TEST_F(FilteringTest, KeepsANo) {
     *obstacle = Obstacle();
     EXPECT_FALSE(Record().supportsFloatFiltering());
     EXPECT_FALSE(Record().supportsHalfFiltering());
-}
-
-TEST(FilteringWithoutRenderTexture, AnswersNoWithoutDrawing) {
-    AutoInitializer const library;
-    FewWGLExtensions hidden;
-    WGLInterceptor::Instance()->addInterceptor(&hidden);
-    ContextOffscreen const context;
-    WGLInterceptor::Instance()->popInterceptor();
-    context.makeCurrent();
-    ASSERT_FALSE(Record().isSupported(WGL_ARB_RENDER_TEXTURE));
-    ASSERT_TRUE(Record().supportsFloatingPointTextures());
-    Pushed<CountingForwarder> calls;
-    EXPECT_FALSE(Record().supportsFloatFiltering());
-    EXPECT_FALSE(Record().supportsHalfFiltering());
-    EXPECT_EQ(0, calls->total());
 }

@@ -25,16 +25,7 @@ using namespace ORU::OGL;
 
 namespace {
 
-/// The memory of all values, one after the other.
-template<class... Values>
-std::string Bytes(Values const &...values) {
-    std::string bytes;
-    // NOLINTNEXTLINE(bugprone-sizeof-expression): of a pointer the pointer itself is meant
-    (bytes.append(reinterpret_cast<char const *>(&values), sizeof values), ...);
-    return bytes;
-}
-
-/// What the recorder answers to a call.
+/// What the last link answers to a call.
 template<class Result>
 Result Answer() {
     if constexpr (std::is_pointer<Result>::value)
@@ -43,70 +34,46 @@ Result Answer() {
         return static_cast<Result>(0x5A);
 }
 
-/// A last link that writes down what arrives and what was traced before.
-class Recorder : public OpenGLInterceptor {
+/// A tracer, and behind it a last link that inserts what arrives into a stream piece by piece.
+class Trial : public OpenGLInterceptor {
 public:
-    std::ostringstream *trace_ = nullptr;
-    std::string traced_;
-    std::string operation_;
-    std::string arguments_;
+    std::ostringstream traced_;
+    OpenGLTracer tracer_{traced_, this};
 
-#define ORU_GL_OPERATION(Result, Name, Parameters, Arguments)                                      \
-    Result cgm##Name Parameters override {                                                         \
-        operation_ = "gl" #Name;                                                                   \
-        arguments_ = Bytes Arguments;                                                              \
-        traced_ = trace_ ? trace_->str() : "";                                                     \
-        return Answer<Result>();                                                                   \
-    }
-#include "oru/oru_ogl/extensionator/gloperations.inc"
-};
-
-/// A tracer in front of a recorder, against the same pieces inserted into a stream one by one.
-class Trial {
-public:
-    explicit Trial(void (*setUp)(std::ostream &)) {
-        setUp(actual_);
+    explicit Trial(void (*setUp)(std::ostream &) = [](std::ostream &) {}) {
+        setUp(traced_);
         setUp(expected_);
-        width_ = actual_.width();
-        recorder_.trace_ = &actual_;
+        width_ = traced_.width();
     }
 
-    template<class Result, class... Arguments>
-    void call(char const *name, char const *parameters,
-              Result (OpenGLInterceptor::*operation)(char const *, unsigned int, Arguments...)) {
-        auto const line = static_cast<unsigned int>(++calls_);
-        place_ = line % 30;
-        std::tuple<Arguments...> const values{sample<Arguments>()...};
-        for (std::ostringstream *stream : {&actual_, &expected_}) {
+    /// Makes a call through the tracer.
+    template<class Result, class... Parameters, class... Arguments>
+    void call(Result (OpenGLInterceptor::*operation)(Parameters...), Arguments... arguments) {
+        for (std::ostringstream *stream : {&traced_, &expected_}) {
             stream->str("");
             stream->width(width_);
         }
-        expected_ << kFile << ":" << line << ": " << name << "(";
-        separator_ = "";
-        std::istringstream declarations(parameters);
-        declarations.ignore(1000, ',').ignore(1000, ','); // file and line
-        std::apply([&](auto... each) { (insert(declarations, each), ...); }, values);
-        expected_ << ")\n";
-
-        std::apply(
-            [&](auto... each) {
-                OpenGLInterceptor &first = tracer_;
-                if constexpr (std::is_void<Result>::value)
-                    (first.*operation)(kFile, line, each...);
-                else
-                    EXPECT_EQ(Answer<Result>(), (first.*operation)(kFile, line, each...));
-                EXPECT_EQ(Bytes(kFile, line, each...), recorder_.arguments_) << name;
-            },
-            values);
-        EXPECT_EQ(name, recorder_.operation_);
-        ASSERT_EQ(expected_.str(), recorder_.traced_);
-        EXPECT_EQ(expected_.str(), actual_.str());
-        EXPECT_EQ(expected_.flags(), actual_.flags());
-        EXPECT_EQ(expected_.width(), actual_.width());
-        EXPECT_TRUE(actual_.good());
+        if constexpr (std::is_void<Result>::value)
+            (tracer_.*operation)(arguments...);
+        else
+            EXPECT_EQ(Answer<Result>(), (tracer_.*operation)(arguments...));
+        ASSERT_EQ(expected_.str(), tracedBefore_);
+        EXPECT_EQ(expected_.str(), traced_.str());
+        EXPECT_EQ(expected_.flags(), traced_.flags());
+        EXPECT_EQ(expected_.width(), traced_.width());
+        EXPECT_TRUE(traced_.good());
     }
 
-    int calls() const { return calls_; }
+    template<class Result, class... Arguments>
+    void callWithSamples(Result (OpenGLInterceptor::*operation)(char const *, unsigned int,
+                                                                Arguments...)) {
+        place_ = ++calls_ % 30;
+        std::tuple<Arguments...> const values{sample<Arguments>()...};
+        std::apply([&](auto... each) { call(operation, "some/source.cpp", calls_, each...); },
+                   values);
+    }
+
+    unsigned int calls() const { return calls_; }
 
 private:
     /// The next argument of a type: different at each place of a call and extreme at times.
@@ -130,37 +97,52 @@ private:
     void insert(std::istream &declarations, Value value) {
         std::string declaration;
         std::getline(declarations, declaration, ',');
-        bool const isEnum = !declaration.find(" GLenum ");
-        bool const isHandle = !declaration.find(" GLhandleARB ");
-        bool const isBoolean = !declaration.find(" GLboolean ");
+        std::string const type = declaration.substr(1, declaration.find(' ', 1) - 1);
         expected_ << std::exchange(separator_, ", ");
-        if constexpr (std::is_same<Value, char const *>::value) {
-            expected_ << value;
-        } else if constexpr (std::is_pointer<Value>::value) {
+        if constexpr (std::is_pointer<Value>::value && !std::is_same<Value, char const *>::value) {
             expected_ << static_cast<void const *>(value);
         } else if constexpr (std::is_same<Value, float>::value) {
             std::int32_t pattern;
             std::memcpy(&pattern, &value, 4);
             expected_ << "makeFloat(" << pattern << ") /* " << value << " */";
-        } else if (isEnum || isBoolean) {
-            expected_ << (isEnum  ? ORUOGLTokenName(static_cast<GLenum>(value))
-                          : value ? "GL_TRUE"
-                                  : "GL_FALSE");
+        } else if constexpr (std::is_same<Value, GLenum>::value) {
+            if (type == "GLenum")
+                expected_ << ORUOGLTokenName(value);
+            else
+                expected_ << (type == "GLhandleARB" ? "(GLhandleARB)" : "") << value;
+        } else if (type == "GLboolean") {
+            expected_ << (value ? "GL_TRUE" : "GL_FALSE");
         } else {
-            expected_ << (isHandle ? "(GLhandleARB)" : "") << value; // a byte is a character
+            expected_ << value; // a byte is a character to a stream
         }
     }
 
-    static constexpr char const *kFile = "some/source.cpp";
+    /// What writes an arriving call down.
+    auto note(char const *name, char const *parameters) {
+        return [=](char const *file, unsigned int line, auto... arguments) {
+            std::istringstream declarations(parameters);
+            declarations.ignore(1000, ',').ignore(1000, ','); // of file and line
+            separator_ = "";
+            expected_ << file << ":" << line << ": " << name << "(";
+            (insert(declarations, arguments), ...);
+            expected_ << ")\n";
+            tracedBefore_ = traced_.str();
+        };
+    }
 
-    std::ostringstream actual_;
+#define ORU_GL_OPERATION(Result, Name, Parameters, Arguments)                                      \
+    Result cgm##Name Parameters override {                                                         \
+        note("gl" #Name, #Parameters) Arguments;                                                   \
+        return Answer<Result>();                                                                   \
+    }
+#include "oru/oru_ogl/extensionator/gloperations.inc"
+
     std::ostringstream expected_;
+    std::string tracedBefore_;
     std::streamsize width_ = 0;
     std::size_t place_ = 0;
     char const *separator_ = "";
-    int calls_ = 0;
-    Recorder recorder_;
-    OpenGLTracer tracer_{actual_, &recorder_};
+    unsigned int calls_ = 0;
 };
 
 struct GroupedDigits : std::numpunct<char> {
@@ -195,18 +177,17 @@ TEST(Tracer, WritesAndForwardsEveryOperation) {
         SCOPED_TRACE(format.name);
         Trial trial(format.setUp);
 #define ORU_GL_OPERATION(Result, Name, Parameters, Arguments)                                      \
-    trial.call("gl" #Name, #Parameters, &OpenGLInterceptor::cgm##Name);                            \
+    trial.callWithSamples(&OpenGLInterceptor::cgm##Name);                                          \
     if (HasFatalFailure())                                                                         \
         return;
 #include "oru/oru_ogl/extensionator/gloperations.inc"
-        EXPECT_EQ(1182, trial.calls());
+        EXPECT_EQ(1182u, trial.calls());
     }
 }
 
 TEST(Tracer, WritesTheseLines) {
-    Recorder recorder;
-    std::ostringstream text, other;
-    OpenGLTracer tracer(text, &recorder);
+    Trial trial;
+    OpenGLTracer &tracer = trial.tracer_;
     tracer.cgmBlendFunc("f", 88, GL_ONE, GL_ZERO);
     tracer.cgmColorMask("f", 89, 1, 0, 2, 0);
     tracer.cgmBufferData("f", 91, GL_ARRAY_BUFFER, 5000000000, nullptr, GL_STATIC_DRAW);
@@ -214,6 +195,7 @@ TEST(Tracer, WritesTheseLines) {
     // A pointer that is null where a text belongs must not spoil the stream for later lines.
     tracer.cgmGetUniformLocation("f", 94, 7, nullptr);
     tracer.cgmAttachObjectARB("f", 4294967295, 3, 4);
+    std::ostringstream other;
     tracer.setOutputStream(other);
     tracer.cgmFlush("g", 1);
     EXPECT_EQ("f:88: glBlendFunc(GL_CURRENT_BIT, GL_POINTS)\n"
@@ -222,7 +204,7 @@ TEST(Tracer, WritesTheseLines) {
               "f:92: glVertex2f(makeFloat(1056964608) /* 0.5 */, makeFloat(-2147483648) /* -0 */)\n"
               "f:94: glGetUniformLocation(7, 0)\n"
               "f:4294967295: glAttachObjectARB((GLhandleARB)3, (GLhandleARB)4)\n",
-              text.str());
+              trial.traced_.str());
     EXPECT_EQ("g:1: glFlush()\n", other.str());
 }
 
@@ -244,23 +226,21 @@ TEST(Tracer, WritesNumbersAsTheStreamDoes) {
             numbers.insert(numbers.end(), {neighbour, -neighbour, neighbour * (1 + 1e-12)});
         }
 
-    Recorder recorder;
+    Trial trial;
     for (double const value : numbers) {
-        std::ostringstream text, expected;
-        OpenGLTracer(text, &recorder).cgmClearDepth("", 1, value);
-        expected << ":1: glClearDepth(" << value << ")\n";
-        ASSERT_EQ(expected.str(), text.str());
+        trial.call(&OpenGLInterceptor::cgmClearDepth, "", 1u, value);
+        ASSERT_FALSE(HasFatalFailure());
     }
 }
 
 TEST(Tracer, WritesTextsOfAnyLength) {
-    Recorder recorder;
+    Trial trial;
     for (std::size_t length = 950; length < 2100; ++length) {
         std::string const file(length, 'f');
         std::string const name(length % 1100, 'n');
-        std::ostringstream text;
-        OpenGLTracer(text, &recorder).cgmGetUniformLocation(file.c_str(), 12345, 6, name.c_str());
-        ASSERT_EQ(file + ":12345: glGetUniformLocation(6, " + name + ")\n", text.str());
+        trial.call(&OpenGLInterceptor::cgmGetUniformLocation, file.c_str(), 12345u, 6u,
+                   name.c_str());
+        ASSERT_FALSE(HasFatalFailure());
     }
 }
 

@@ -6,27 +6,31 @@
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"
 
+#include <set>
+#include <utility>
+#include <vector>
+
 using namespace ORU::OGL;
 using oru_test::MessageOf;
 
 namespace {
 
-/// Answers for its life as if an entry point were missing, and notes what is asked for from where.
+/// Answers for its life as if entry points were missing, and notes what is asked for from where.
 class Withholder : public WGLForwarder {
 public:
-    explicit Withholder(std::string name = "") : name_(std::move(name)) {
+    explicit Withholder(std::set<std::string> names) : names_(std::move(names)) {
         WGLInterceptor::Instance()->addInterceptor(this);
     }
     ~Withholder() override { WGLInterceptor::Instance()->popInterceptor(); }
 
     PROC wcgmGetProcAddress(char const *file, unsigned int line, char const *name) override {
         asked_.emplace_back(name, line);
-        return name == name_ ? nullptr : WGLForwarder::wcgmGetProcAddress(file, line, name);
+        return names_.count(name) ? nullptr : WGLForwarder::wcgmGetProcAddress(file, line, name);
     }
     std::vector<std::pair<std::string, unsigned int>> asked_;
 
 private:
-    std::string name_;
+    std::set<std::string> names_;
 };
 
 } // namespace
@@ -47,7 +51,7 @@ TEST_F(WGLTest, ForwardsToThePlatform) {
 }
 
 TEST_F(WGLTest, LoadsEachExtension) {
-    Withholder const none;
+    Withholder const none({});
     for (unsigned int value = 0; value <= UNKNOWN_OPENGL_EXTENSION; ++value)
         EXPECT_EQ(value >= 102 && value <= 112,
                   InitializeWGLExtension(static_cast<OpenGLExtension>(value)))
@@ -77,15 +81,21 @@ TEST_F(WGLTest, LoadsEachExtension) {
 TEST(WGLRecord, LacksAnExtensionWithoutItsEntryPoint) {
     AutoInitializer const library;
     _wcgmSwapIntervalEXT = nullptr;
-    Withholder const without("wglGetSwapIntervalEXT");
+    Withholder const without({"wglGetSwapIntervalEXT", "wglBindTexImageARB"});
     ContextOffscreen context;
     context.makeCurrent();
-    ExtensionManager const &record = *ExtensionManager::Instance();
+    ExtensionManager &record = *ExtensionManager::Instance();
     EXPECT_FALSE(record.isSupported(WGL_EXT_SWAP_CONTROL));
     EXPECT_TRUE(record.isSupported(WGL_ARB_PBUFFER));
     EXPECT_EQ(nullptr, _wcgmGetSwapIntervalEXT);
     EXPECT_NE(nullptr, _wcgmSwapIntervalEXT);
     EXPECT_FALSE(Context::SupportsVerticalRetraceControl());
+    EXPECT_FALSE(record.supportsRenderToTexture());
+    ASSERT_TRUE(record.supportsFloatingPointTextures() && record.isSupported(GL_EXT_GPU_SHADER4));
+    oru_test::Pushed<oru_test::CountingForwarder> calls;
+    EXPECT_FALSE(record.supportsFloatFiltering());
+    EXPECT_FALSE(record.supportsHalfFiltering());
+    EXPECT_EQ(0, calls->total());
     oru_test::TestWindow const window;
     ContextWindowed windowed(window.hwnd(), BufferFormat(BufferFormat::FORMAT_RGBA8),
                              Context::BUFFERING_DOUBLE, Context::MULTISAMPLING_NONE, &context);
