@@ -23,23 +23,21 @@ class TestSummary(unittest.TestCase):
             with contextlib.redirect_stdout(self.out):
                 return test_summary.main(expected, results)
 
-    def test_listed_skips_pass_and_others_fail(self):
-        cases = {"A.a": "run", "A.b": "notrun", "A.c": "disabled"}
-        listed = "# why\nA.b  # no such device\nA.c  # too slow here\n"
-        self.assertEqual(self.verdict(cases, listed), 0)
-        self.assertEqual(self.verdict(cases, "A.b  # no such device\n"), 1)
-        self.assertIn("A.c (NOT EXPECTED", self.out.getvalue())
+    def test_verdicts(self):
+        for cases, skips, verdict, output in (
+                ({"A.a": "run", "A.b": "notrun", "A.c": "disabled"},
+                 "# why\nA.b  # no such device\nA.c  # too slow here\n", 0, "skipped: A.b (no such device)"),
+                ({"A.a": "run", "A.b": "notrun"}, "", 1, "A.b (NOT EXPECTED"),
+                ({"A.a": "run"}, "A.a  # outdated\n", 0, "note: A.a"),
+                ({"A.a": "run", "A.b": "fail"}, "A.b  # not a licence to fail\n", 1, "failed: A.b")):
+            self.assertEqual(self.verdict(cases, skips), verdict)
+            self.assertIn(output, self.out.getvalue())
 
-    def test_a_listed_test_that_ran_is_a_note(self):
-        self.assertEqual(self.verdict({"A.a": "run"}, "A.a  # outdated\n"), 0)
-        self.assertIn("note: A.a", self.out.getvalue())
-
-    def test_failures_and_empty_runs_fail(self):
-        self.assertEqual(self.verdict({"A.a": "run", "A.b": "fail"}, "A.b  # not a licence to fail\n"), 1)
-        with self.assertRaises(SystemExit):
-            self.verdict({})
-        with self.assertRaises(SystemExit):
-            self.verdict({"A.b": "notrun"}, "A.b  # everything was skipped\n")
+    def test_runs_without_tests_and_skips_without_reasons_end_it(self):
+        for cases, skips in (({}, ""), ({"A.b": "notrun"}, "A.b  # everything was skipped\n"),
+                             ({"A.a": "run"}, "A.a\n")):
+            with self.assertRaises(SystemExit):
+                self.verdict(cases, skips)
 
     def test_only_a_program_that_never_began_runs_again(self):
         with tempfile.TemporaryDirectory() as folder:
@@ -53,10 +51,6 @@ class TestSummary(unittest.TestCase):
             for again, failed in ("run", ["A.b"]), ("fail", ["A.a", "A.b"]):
                 second.write_text(f'<testsuite><testcase name="A.a" status="{again}"/></testsuite>')
                 self.assertEqual(test_summary.read_results([first, second])[1], failed)
-
-    def test_a_reason_is_demanded(self):
-        with self.assertRaises(SystemExit):
-            self.verdict({"A.a": "run"}, "A.a\n")
 
 
 if __name__ == "__main__":
