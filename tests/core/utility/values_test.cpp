@@ -5,9 +5,9 @@
 
 #include <gtest/gtest.h>
 
-#include <limits>
 #include <locale>
 #include <sstream>
+#include <tuple>
 
 using ambra::lumo::TVec2;
 using ORU::IntegerRect;
@@ -19,18 +19,13 @@ TEST(Size2, ComputesAndComparesByComponents) {
     size2 const a(640, 481), b(7, 9);
     EXPECT_EQ(a / b, size2(91, 53));
     EXPECT_EQ(a / b * b + a % b, a);
-    size2 const largest(std::numeric_limits<std::size_t>::max());
-    EXPECT_EQ(largest + size2(1, 0), size2(0, largest[1])) << "64 bits, modulo 2^64";
-    size2 self(6, 4);
-    EXPECT_EQ(self += self, size2(12, 8));
-    EXPECT_EQ(self %= self, size2());
+    EXPECT_EQ(size2(~std::size_t(0)) + size2(1, 0), size2(0, ~std::size_t(0))) << "modulo 2^64";
 
     // A strict order of all pairs: the first component decides, the second between equals.
     for (std::size_t i = 0; i < 81; ++i) {
         size2 const x(i / 27, i / 9 % 3), y(i / 3 % 3, i % 3);
         EXPECT_EQ(x < y, x[0] * 3 + x[1] < y[0] * 3 + y[1]);
         EXPECT_EQ(x == y, !(x < y) && !(y < x));
-        EXPECT_NE(x == y, x != y);
     }
 }
 
@@ -49,13 +44,6 @@ TEST(IntegerRect, MovesComparesAndPrints) {
     }
 }
 
-struct Version {
-    char const *text;
-    unsigned major, minor;
-    int release;
-    char const *vendor;
-};
-
 /// A locale that would read "1,024" as one number.
 struct Grouping : std::numpunct<char> {
     char do_thousands_sep() const override { return ','; }
@@ -63,7 +51,7 @@ struct Grouping : std::numpunct<char> {
 };
 
 TEST(VersionString, SplitsWhatDriversSay) {
-    Version const versions[] = {
+    std::tuple<char const *, unsigned, unsigned, int, std::string> const versions[] = {
         {"3.3.0 - Build 26.20", 3, 3, 0, "- Build 26.20"},
         {"4.50", 4, 50, -1, ""},
         {"1.2.11", 1, 2, 11, ""},
@@ -76,26 +64,22 @@ TEST(VersionString, SplitsWhatDriversSay) {
     };
     std::locale const before =
         std::locale::global(std::locale(std::locale::classic(), new Grouping));
-    for (Version const &version : versions) {
+    for (auto const &version : versions) {
         unsigned major = 77, minor = 77;
         int release = 77;
         std::string vendor = "stale";
-        ORU::TokenizeVersionString(version.text, major, minor, release, vendor);
-        SCOPED_TRACE(version.text);
-        EXPECT_EQ(major, version.major);
-        EXPECT_EQ(minor, version.minor);
-        EXPECT_EQ(release, version.release);
-        EXPECT_EQ(vendor, version.vendor);
+        char const *const text = std::get<0>(version);
+        ORU::TokenizeVersionString(text, major, minor, release, vendor);
+        EXPECT_EQ(std::make_tuple(text, major, minor, release, vendor), version);
     }
     std::locale::global(before);
 }
 
 TEST(Boundary, IsTheNextMultiple) {
     for (int boundary = 1; boundary <= 17; ++boundary) {
-        for (int value = 0; value <= 100; ++value) {
-            int next = value;
-            while (next % boundary != 0)
-                ++next;
+        for (int value = 0, next = 0; value <= 100; ++value) {
+            if (value > next)
+                next += boundary;
             EXPECT_EQ(ORU::IncrementToBoundary(value, boundary), next);
             EXPECT_EQ(ORU::IncrementToBoundaryPtr(static_cast<std::size_t>(value), boundary),
                       static_cast<std::size_t>(next));
@@ -106,11 +90,10 @@ TEST(Boundary, IsTheNextMultiple) {
     EXPECT_EQ(ORU::IncrementToBoundaryPtr(5, -16), std::size_t(0) - 16) << "signed when widened";
 
     int powers = 0;
-    for (unsigned x = 1; x <= 1u << 16; ++x)
+    for (unsigned x = 0; x <= 1u << 16; ++x)
         powers += ORU::IsPowerOfTwo(x);
-    EXPECT_EQ(powers, 17);
-    EXPECT_TRUE(ORU::IsPowerOfTwo(0) && ORU::IsPowerOfTwo(1u << 31));
-    EXPECT_FALSE(ORU::IsPowerOfTwo(0xFFFFFFFF));
+    EXPECT_EQ(powers, 18) << "0 counts as one";
+    EXPECT_TRUE(ORU::IsPowerOfTwo(1u << 31));
 }
 
 } // namespace

@@ -149,8 +149,9 @@ void BoundingRect::erode(BoundingRect const &r) {
 }
 
 void BoundingRect::translate(Vec const &d) {
-    minimum_ = Moved(minimum_, d);
-    maximum_ = Moved(maximum_, d);
+    Vec const by = d; // which may be one of this rectangle's own bounds
+    minimum_ = Moved(minimum_, by);
+    maximum_ = Moved(maximum_, by);
 }
 
 std::vector<Vec> BoundingRect::convexHull() const {
