@@ -1,4 +1,4 @@
-// What tests of OpenCL objects share: the layer on the tests' runtime, a context, memory checks.
+// What tests of OpenCL objects share: the layer on the tests' runtime, contexts, leak checks.
 #pragma once
 
 #include "oru/core/exceptions/internalexception.h"
@@ -7,14 +7,18 @@
 #include "oru/oru_ocl/extensionmanagerocl.h"
 #include "oru/oru_ocl/programocl.h"
 #include "tests/oru_ocl/testruntime.h"
+#include "tests/oru_ogl/glfixture.h"
 
 #include <gtest/gtest.h>
 
+#include <memory>
 #include <numeric>
 #include <string>
 #include <vector>
 
 namespace oru_test {
+
+namespace OGL = ORU::OGL;
 
 /// What a call throws: an internal exception's message or the name of an OpenCL error; empty when
 /// it throws nothing.
@@ -114,6 +118,37 @@ protected:
 
     ORU::OCL::Context context;
     ORU::OCL::CommandQueue queue;
+};
+
+/// An OpenGL context, current. A base, so that it is there before the OpenCL context.
+class WithGLContext {
+protected:
+    WithGLContext() { glContext->makeCurrent(); }
+
+private:
+    OGL::AutoInitializer library_;
+
+protected:
+    std::unique_ptr<OGL::ContextOffscreen> glContext = std::make_unique<OGL::ContextOffscreen>();
+};
+
+/// An OpenCL context that shares the objects of the current OpenGL context.
+class SharingTest : protected WithGLContext, public QueueTest {
+protected:
+    SharingTest() : QueueTest(ORU::OCL::Context(propertiesToShare(), device())) {}
+
+    void TearDown() override {
+        if (OGL::Context::CurrentContext()) {
+            EXPECT_EQ(GLenum(GL_NO_ERROR), ::glGetError());
+        }
+    }
+
+    ORU::OCL::ContextProperties propertiesToShare() const {
+        ORU::OCL::ContextProperties properties(platform());
+        properties.setSharedRenderContext(glContext->renderContext());
+        properties.setDisplayContext(glContext->deviceContext());
+        return properties;
+    }
 };
 
 /// 0, 1, 2 and so on.

@@ -1,7 +1,11 @@
 // Every entry point that the layer calls is made to fail once.
 #include "oru/core/utility/integerrect.h"
 #include "oru/oru_ocl/sampler.h"
-#include "tests/oru_ocl/sharingtest.h"
+#include "oru/oru_ogl/ogl/bufferogl.h"
+#include "oru/oru_ogl/ogl/renderbuffer.h"
+#include "oru/oru_ogl/ogl/texture2.h"
+#include "oru/oru_ogl/ogl/texture3.h"
+#include "tests/oru_ocl/computetest.h"
 
 #include <fstream>
 #include <functional>

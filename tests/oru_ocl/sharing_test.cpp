@@ -1,12 +1,50 @@
 // OpenCL memory over OpenGL objects: what one writes, the other reads.
-#include "tests/oru_ocl/sharingtest.h"
+#include "oru/oru_ogl/ogl/bufferogl.h"
+#include "oru/oru_ogl/ogl/renderbuffer.h"
+#include "oru/oru_ogl/ogl/texture2.h"
+#include "oru/oru_ogl/ogl/texture3.h"
+#include "tests/oru_ocl/computetest.h"
 
 using namespace ORU::OCL;
 using namespace oru_test;
 
 namespace {
+
 constexpr auto RGBA8 = OGL::Texture::INTERNALFORMAT_RGBA8;
+
+using Pixels = std::vector<unsigned char>;
+
+/// Bytes that differ from pixel to pixel and from channel to channel.
+Pixels Pattern(std::size_t bytes, std::size_t seed) {
+    Pixels pixels(bytes);
+    for (std::size_t i = 0; i < bytes; ++i)
+        pixels[i] = static_cast<unsigned char>(i * 37 + i / 251 + seed);
+    return pixels;
 }
+
+/// RGBA bytes into a level of a 2-D or rectangle texture.
+void Upload(OGL::Texture2 const &texture, int level, std::size_t width, std::size_t height,
+            Pixels const &pixels) {
+    ORU_GL(BindTexture, texture.target(), texture.objectID());
+    ORU_GL(TexSubImage2D, texture.target(), level, 0, 0, GLsizei(width), GLsizei(height), GL_RGBA,
+           GL_UNSIGNED_BYTE, pixels.data());
+}
+
+/// And out of any texture.
+Pixels Download(OGL::Object const &texture, int level, std::size_t bytes) {
+    Pixels pixels(bytes);
+    ORU_GL(BindTexture, texture.target(), texture.objectID());
+    ORU_GL(GetTexImage, texture.target(), level, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
+    return pixels;
+}
+
+Pixels Inverted(Pixels pixels) {
+    for (unsigned char &value : pixels)
+        value = static_cast<unsigned char>(255 - value);
+    return pixels;
+}
+
+} // namespace
 
 TEST_F(SharingTest, BuffersGoThereAndBack) {
     std::vector<cl_uint> values = Counting<cl_uint>(3001), read(3001);
@@ -49,8 +87,21 @@ TEST_F(SharingTest, ImagesGoThereAndBack) {
         Image2D(context, both, renderbuffer), Image2D(context, writes, last, 0)};
     EXPECT_EQ(cl_mem_flags(CL_MEM_WRITE_ONLY),
               Get<cl_mem_flags>(images[3], Memory::MEMORYINFO_FLAGS));
-    for (int i = 0; i < 3; ++i)
-        invert(images[i], images[i + 1], width, height);
+    Program const program = build(R"(
+constant sampler_t plain = CLK_NORMALIZED_COORDS_FALSE | CLK_ADDRESS_NONE | CLK_FILTER_NEAREST;
+kernel void invert(read_only image2d_t source, write_only image2d_t target) {
+    int2 at = (int2)(get_global_id(0), get_global_id(1));
+    write_imagef(target, at, 1 - read_imagef(source, plain, at));
+})");
+    Kernel invert = program.kernel("invert");
+    for (int i = 0; i < 3; ++i) {
+        std::vector<Memory> const pair = {images[i], images[i + 1]};
+        invert.setArg(0, images[i]);
+        invert.setArg(1, images[i + 1]);
+        Event const acquired = queue.enqueueAcquireGLObjects(pair);
+        Event const done = queue.enqueueKernel(invert, Range<2>(width, height), 0, 0, {acquired});
+        queue.enqueueReleaseGLObjects(pair, {done}).wait();
+    }
     EXPECT_EQ(sibling.renderContext(), OGL::Context::CurrentContext());
     EXPECT_EQ(Inverted(pattern), Download(rectangle, 0, bytes));
     EXPECT_EQ(Inverted(pattern), Download(last, 0, bytes));

@@ -148,10 +148,10 @@ cl_mem CL_API_CALL CreateFromGLRenderbuffer(cl_context context, cl_mem_flags fla
     return CreateShared(context, flags, {CL_GL_OBJECT_RENDERBUFFER, name}, error);
 }
 
-template<cl_gl_object_type Kind, cl_GLenum Target, cl_GLenum OtherTarget>
+template<cl_gl_object_type Kind, cl_GLenum... Targets>
 cl_mem CL_API_CALL CreateFromTexture(cl_context context, cl_mem_flags flags, cl_GLenum target,
                                      cl_GLint level, cl_GLuint name, cl_int *error) {
-    if (target != Target && target != OtherTarget)
+    if (((target != Targets) && ...))
         return Refuse(error, CL_INVALID_VALUE);
     return CreateShared(context, flags, {Kind, name, target, level}, error);
 }
@@ -273,8 +273,7 @@ void ReplaceSharing(FunctionTable &table) {
     table.clCreateFromGLBuffer = CreateFromGLBuffer;
     table.clCreateFromGLTexture2D =
         CreateFromTexture<CL_GL_OBJECT_TEXTURE2D, GL_TEXTURE_2D, GL_TEXTURE_RECTANGLE>;
-    table.clCreateFromGLTexture3D =
-        CreateFromTexture<CL_GL_OBJECT_TEXTURE3D, GL_TEXTURE_3D, GL_TEXTURE_3D>;
+    table.clCreateFromGLTexture3D = CreateFromTexture<CL_GL_OBJECT_TEXTURE3D, GL_TEXTURE_3D>;
     table.clCreateFromGLRenderbuffer = CreateFromGLRenderbuffer;
     table.clEnqueueAcquireGLObjects = Transfer<false>;
     table.clEnqueueReleaseGLObjects = Transfer<true>;
