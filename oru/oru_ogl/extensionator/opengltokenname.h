@@ -8,8 +8,9 @@ extern "C" {
 
 /// The name of the OpenGL constant with a value, "Unknown Token" when none is known.
 ///
-/// Known are the constants of OpenGL up to 4.1 and of the extensions in OpenGLExtension; where
-/// several share a value one of them is given, a core name if there is one. The text is static.
+/// Known are the constants of OpenGL up to 4.1 and of the extensions in OpenGLExtension, but for
+/// those that only GL_ARB_fragment_program has; where several share a value one of them is given, a
+/// core name if there is one. The text is static.
 ORU_API char const *ORUOGLTokenName(GLenum value);
 
 /// "GL_FALSE" for 0, "GL_TRUE" for every other value. The text is static.

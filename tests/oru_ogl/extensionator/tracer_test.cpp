@@ -95,7 +95,7 @@ private:
             else
                 expected_ << (type == "GLhandleARB" ? "(GLhandleARB)" : "") << value;
         } else if (type == "GLboolean") {
-            expected_ << (value ? "GL_TRUE" : "GL_FALSE");
+            expected_ << (value != Value() ? "GL_TRUE" : "GL_FALSE");
         } else {
             expected_ << value; // a byte is a character to a stream
         }
