@@ -6,7 +6,6 @@
 #include <gtest/gtest.h>
 
 #include <locale>
-#include <sstream>
 #include <tuple>
 
 using ambra::lumo::TVec2;
@@ -32,16 +31,12 @@ TEST(Size2, ComputesAndComparesByComponents) {
 TEST(IntegerRect, MovesComparesAndPrints) {
     IntegerRect rect(TVec2<int>(10, 20), size2(640, 480));
     rect.translate(TVec2<int>(-30, 1));
+    EXPECT_EQ(testing::PrintToString(rect), "[o=(-20 21), s=(640, 480)]");
     EXPECT_EQ(rect, IntegerRect(TVec2<int>(-20, 21), size2(640, 480)));
     EXPECT_NE(rect, IntegerRect(TVec2<int>(-20, 21), size2(640, 481)));
     EXPECT_NE(rect, IntegerRect(TVec2<int>(-20, 20), size2(640, 480)));
-    std::ostringstream stream;
-    stream << rect;
-    EXPECT_EQ(stream.str(), "[o=(-20 21), s=(640, 480)]");
-    for (size2 const &size : {size2(0, 5), size2(5, 0)}) {
-        rect.setSize(size);
-        EXPECT_EQ(rect.toString(), "Empty");
-    }
+    EXPECT_EQ(IntegerRect(TVec2<int>(1, 2), size2(0, 5)).toString(), "Empty");
+    EXPECT_EQ(IntegerRect(TVec2<int>(1, 2), size2(5, 0)).toString(), "Empty");
 }
 
 /// A locale that would read "1,024" as one number.

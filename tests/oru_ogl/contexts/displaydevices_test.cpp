@@ -2,8 +2,7 @@
 // Direct3D.
 #include "testwindow.h"
 
-#include "oru/oru_ogl/libraryogl.h"
-#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+#include "oru/oru_ogl/ogl/context.h"
 
 #include <dxgi.h>
 #include <gtest/gtest.h>
@@ -94,14 +93,4 @@ TEST(DisplayDevices, AreFoundForWindowsAndNames) {
                   "nullptr, nullptr)",
                   message);
     }
-}
-
-TEST(DisplayDevices, NameTheDeviceOfEveryContext) {
-    AutoInitializer library;
-    ContextOffscreen const first, second(&first);
-    EXPECT_EQ(Exposed::PrimaryDisplayDevice().displayName, first.displayDeviceKey().displayName);
-    EXPECT_EQ(first.displayDeviceKey().deviceID, second.displayDeviceKey().deviceID);
-    EXPECT_EQ("Adapter not found", MessageOf([] {
-                  ContextOffscreen const nowhere(DisplayDeviceKey("", "no such adapter", "999"));
-              }));
 }
