@@ -32,6 +32,11 @@ public:
     using Context::initialize;
     using Context::setPixelFormat;
     using Context::shareLists;
+    using Context::UnregisterShareContext;
+};
+
+struct NeverMade : Context {
+    NeverMade() : Context(DisplayDeviceKey()) {}
 };
 
 /// A host's own kind, whose makeCurrent fails in a way that the layer does not know.
@@ -95,8 +100,10 @@ TEST(ContextFailures, LeaveNothingBehind) {
     ContextCounter const counter;
     {
         Exposed current;
+        Exposed::UnregisterShareContext(&current);
         int const alive = ContextCounter::Alive();
         auto const windows = oru_test::InternalWindowClasses();
+        NeverMade const neverMade;
         for (bool hasCurrent : {true, false}) {
             if (hasCurrent)
                 current.makeCurrent();
@@ -121,6 +128,11 @@ TEST(ContextFailures, LeaveNothingBehind) {
             EXPECT_EQ(none, failure(BufferFormat::FORMAT_RGBA16F, Context::BUFFERING_DOUBLE, 1));
             EXPECT_EQ(none, failure(BufferFormat::FORMAT_RGBA8, Context::BUFFERING_DOUBLE, 64));
             EXPECT_THROW(Refusing(window.hwnd()), std::range_error);
+            EXPECT_EQ("outerIter != gVectorOfContextVectors->end()",
+                      MessageOf([&] { ContextOffscreen const orphan(&current); }));
+            EXPECT_EQ("Context::createRenderingContext cannot share lists.", MessageOf([&] {
+                          current.createRenderingContext(current.deviceContext(), &neverMade);
+                      }));
             EXPECT_EQ(hasCurrent ? current.renderContext() : nullptr, ::wglGetCurrentContext());
             EXPECT_EQ(alive, ContextCounter::Alive());
             EXPECT_EQ(windows, oru_test::InternalWindowClasses());
