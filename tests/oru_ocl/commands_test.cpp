@@ -3,7 +3,9 @@
 #include "oru/core/math/tvec4.h"
 #include "tests/oru_ocl/computetest.h"
 
+#include <chrono>
 #include <set>
+#include <thread>
 
 using ambra::lumo::TVec2;
 using ambra::lumo::TVec4;
@@ -219,24 +221,33 @@ TEST_F(CommandQueueTest, TransfersReachTheBytesTheyName) {
 }
 
 TEST_F(CommandQueueTest, EventsOrderCommandsAcrossQueues) {
-    // Each step doubles and adds, on the queue that is next; only its event orders it.
+    // Steps that do not commute, each on the queue that is next; only its event orders it. A gate
+    // holds back the first, so that whatever does not wait comes too early.
     std::size_t const count = 2048;
     std::vector<cl_uint> values = Counting<cl_uint>(count), read(count);
     Buffer const buffer = bufferOf(values);
-    Program const program = build("kernel void advance(global uint *v) { size_t i ="
-                                  " get_global_id(0); v[i] = 2 * v[i] + i; }");
-    Kernel const step = KernelOf(program, "advance", buffer);
-    CommandQueue queues[] = {CommandQueue(context, device(), true, false),
+    Program const program = build("kernel void advance(global uint *v, uint step) {"
+                                  " v[get_global_id(0)] = 3 * v[get_global_id(0)] + step; }");
+    Kernel advance = KernelOf(program, "advance", buffer);
+    CommandQueue queues[] = {CommandQueue(context, device(), false, false),
                              CommandQueue(context, device(), true, false),
                              CommandQueue(context, device(), false, true)};
+    cl_uint const first = values.front();
+    cl_event const gate = ORU_CL(CreateUserEvent, context.id());
+    ORU_CL(EnqueueWriteBuffer, queues[0].id(), buffer.id(), CL_FALSE, 0, sizeof first, &first, 1,
+           &gate, nullptr);
     std::vector<Event> all, last;
-    for (int i = 0; i < 24; ++i) {
-        last = {queues[i % 3].enqueueKernel(step, Range<1>(count), 0, 0, last)};
+    for (cl_uint i = 0; i < 24; ++i) {
+        advance.setArg(1, i);
+        last = {queues[i % 3].enqueueKernel(advance, Range<1>(count), 0, 0, last)};
         all.push_back(last.front());
         queues[i % 3].flush();
-        for (std::size_t item = 0; item < count; ++item)
-            values[item] = 2 * values[item] + static_cast<cl_uint>(item);
+        for (cl_uint &value : values)
+            value = 3 * value + i;
     }
+    std::this_thread::sleep_for(std::chrono::milliseconds(20));
+    ORU_CL(SetUserEventStatus, gate, CL_COMPLETE);
+    ORU_CL(ReleaseEvent, gate);
     // More events than fit without allocating.
     queue.enqueueBlockingRead(buffer, 0, count * sizeof(cl_uint), read.data(), all);
     EXPECT_EQ(values, read);
