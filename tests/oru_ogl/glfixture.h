@@ -31,6 +31,18 @@ public:
         return sum;
     }
 
+    /// The names of the calls that are no queries, in their alphabetical order, since the last
+    /// time.
+    std::string takeChanges() {
+        std::string names;
+        for (auto const &[name, calls] : counts_) {
+            for (int i = 0; name.rfind("Get", 0) != 0 && i < calls; ++i)
+                names += name + " ";
+        }
+        reset();
+        return names;
+    }
+
     void reset() { counts_.clear(); }
 
 #define ORU_GL_OPERATION(Result, Name, Parameters, Arguments)                                      \

@@ -6,243 +6,184 @@
 #include "oru/oru_ogl/ogl/blendscope.h"
 #include "oru/oru_ogl/ogl/linescope.h"
 
+#include <array>
 #include <memory>
 
 using namespace ORU::OGL;
-using oru_test::CountingForwarder;
-using oru_test::MessageOf;
-using oru_test::Pushed;
+using namespace oru_test;
 
 namespace {
 
-std::vector<int> Blending() {
-    std::vector<int> values;
-    GLenum const names[] = {
-        GL_BLEND,           GL_BLEND_SRC_RGB,      GL_BLEND_DST_RGB,       GL_BLEND_SRC_ALPHA,
-        GL_BLEND_DST_ALPHA, GL_BLEND_EQUATION_RGB, GL_BLEND_EQUATION_ALPHA};
-    for (GLenum const name : names) {
-        GLint value = -1;
-        ::glGetIntegerv(name, &value);
-        values.push_back(value);
-    }
-    return values;
+using Values = std::vector<int>;
+
+/// In the order of BlendState's members.
+Values Blending() {
+    return {Get(GL_BLEND),
+            Get(GL_BLEND_DST_ALPHA),
+            Get(GL_BLEND_DST_RGB),
+            Get(GL_BLEND_SRC_ALPHA),
+            Get(GL_BLEND_SRC_RGB),
+            Get(GL_BLEND_EQUATION_ALPHA),
+            Get(GL_BLEND_EQUATION_RGB)};
 }
 
-std::vector<int> Stippling() {
-    GLint factor = -1, pattern = -1;
-    ::glGetIntegerv(GL_LINE_STIPPLE_REPEAT, &factor);
-    ::glGetIntegerv(GL_LINE_STIPPLE_PATTERN, &pattern);
-    return {::glIsEnabled(GL_LINE_STIPPLE), factor, pattern};
+Values Blending(BlendState const &s) {
+    return {s.enabled, s.dstAlpha, s.dstRGB, s.srcAlpha, s.srcRGB, s.equationAlpha, s.equationRGB};
 }
 
-float Width() {
-    float width = -1;
-    ::glGetFloatv(GL_LINE_WIDTH, &width);
-    return width;
+Values Stippling() {
+    return {Get(GL_LINE_STIPPLE), Get(GL_LINE_STIPPLE_REPEAT), Get(GL_LINE_STIPPLE_PATTERN)};
 }
 
-/// The calls that change state, in order, without those that ask.
-class Changes : public OpenGLForwarder {
-public:
-    std::string log;
-
-#define ORU_NOTE(Name, Parameters, ...)                                                            \
-    void cgm##Name Parameters override {                                                           \
-        log += #Name " ";                                                                          \
-        OpenGLForwarder::cgm##Name(f, l, __VA_ARGS__);                                             \
-    }
-    ORU_NOTE(Enable, (char const *f, unsigned l, GLenum a), a)
-    ORU_NOTE(Disable, (char const *f, unsigned l, GLenum a), a)
-    ORU_NOTE(LineWidth, (char const *f, unsigned l, GLfloat a), a)
-    ORU_NOTE(LineStipple, (char const *f, unsigned l, GLint a, GLushort b), a, b)
-    ORU_NOTE(BlendFunc, (char const *f, unsigned l, GLenum a, GLenum b), a, b)
-    ORU_NOTE(BlendEquation, (char const *f, unsigned l, GLenum a), a)
-    ORU_NOTE(BlendEquationSeparate, (char const *f, unsigned l, GLenum a, GLenum b), a, b)
-    ORU_NOTE(BlendFuncSeparate, (char const *f, unsigned l, GLenum a, GLenum b, GLenum c, GLenum d),
-             a, b, c, d)
-#undef ORU_NOTE
-
-    /// What was noted since the last time.
-    std::string take() {
-        std::string taken;
-        taken.swap(log);
-        return taken;
-    }
-};
-
-class ScopesTest : public oru_test::ObjectTest {
-protected:
-    Pushed<Changes> changes_;
-};
+void SetStippling(int on, int factor, int pattern) {
+    if (on)
+        ORU_GL(Enable, GL_LINE_STIPPLE);
+    else
+        ORU_GL(Disable, GL_LINE_STIPPLE);
+    ORU_GL(LineStipple, factor, static_cast<GLushort>(pattern));
+}
 
 } // namespace
 
+class ScopesTest : public ObjectTest {
+protected:
+    Pushed<CountingForwarder> calls_;
+};
+
 TEST_F(ScopesTest, BlendStateIsWhatTheContextHas) {
     BlendState state;
-    EXPECT_FALSE(state.enabled);
-    EXPECT_EQ(GL_ONE, state.dstAlpha + state.dstRGB + state.srcAlpha + state.srcRGB - 3);
-    EXPECT_EQ(GL_FUNC_ADD, state.equationAlpha);
+    EXPECT_EQ((Values{0, GL_ONE, GL_ONE, GL_ONE, GL_ONE, GL_FUNC_ADD, GL_FUNC_ADD}),
+              Blending(state));
     ORU_GL(Enable, GL_BLEND);
     ORU_GL(BlendFuncSeparate, GL_SRC_COLOR, GL_DST_COLOR, GL_SRC_ALPHA, GL_DST_ALPHA);
     ORU_GL(BlendEquationSeparate, GL_FUNC_SUBTRACT, GL_MAX);
     state.setToCurrentGLValues();
-    EXPECT_EQ((std::vector<int>{state.enabled, state.srcRGB, state.dstRGB, state.srcAlpha,
-                                state.dstAlpha, state.equationRGB, state.equationAlpha}),
-              Blending());
+    EXPECT_EQ(Blending(), Blending(state));
     EXPECT_EQ(GL_FUNC_SUBTRACT, state.equationRGB);
-
     ::glEnable(0x1234); // an error of nobody here
     EXPECT_THROW(TemporaryBlendScope(), ORU::LogicalException);
 }
 
 // With each single value away from what the scope sets, the end makes the one call that it needs.
 TEST_F(ScopesTest, AlphaBlendScopePutsBackWhatDiffers) {
-    auto const standard = [] {
-        ORU_GL(Enable, GL_BLEND);
-        ORU_GL(BlendFunc, GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
-        ORU_GL(BlendEquation, GL_FUNC_ADD);
-    };
     struct Case {
-        void (*change)();
+        bool enabled;
+        std::array<GLenum, 6> values; ///< factors, as glBlendFuncSeparate takes them, and equations
         char const *calls;
     } const cases[] = {
-        {[] {}, ""},
-        {[] { ORU_GL(Disable, GL_BLEND); }, "Disable "},
-        {[] { ORU_GL(BlendFuncSeparate, 1, 0x303, 0x302, 0x303); }, "BlendFuncSeparate "},
-        {[] { ORU_GL(BlendFuncSeparate, 0x302, 1, 0x302, 0x303); }, "BlendFuncSeparate "},
-        {[] { ORU_GL(BlendFuncSeparate, 0x302, 0x303, 1, 0x303); }, "BlendFuncSeparate "},
-        {[] { ORU_GL(BlendFuncSeparate, 0x302, 0x303, 0x302, 1); }, "BlendFuncSeparate "},
-        {[] { ORU_GL(BlendEquationSeparate, GL_MIN, GL_FUNC_ADD); }, "BlendEquationSeparate "},
-        {[] { ORU_GL(BlendEquationSeparate, GL_FUNC_ADD, GL_MIN); }, "BlendEquationSeparate "},
-        {[] {
-             ORU_GL(Disable, GL_BLEND);
-             ORU_GL(BlendFunc, GL_ONE, GL_ZERO);
-             ORU_GL(BlendEquation, GL_MAX);
-         },
-         "Disable BlendFuncSeparate BlendEquationSeparate "}};
-    standard();
-    std::vector<int> const wanted = Blending();
-    for (Case const &c : cases) {
-        standard();
-        c.change();
-        std::vector<int> const found = Blending();
+        {true, {0x302, 0x303, 0x302, 0x303, GL_FUNC_ADD, GL_FUNC_ADD}, ""},
+        {false, {0x302, 0x303, 0x302, 0x303, GL_FUNC_ADD, GL_FUNC_ADD}, "Disable "},
+        {true, {1, 0x303, 0x302, 0x303, GL_FUNC_ADD, GL_FUNC_ADD}, "BlendFuncSeparate "},
+        {true, {0x302, 1, 0x302, 0x303, GL_FUNC_ADD, GL_FUNC_ADD}, "BlendFuncSeparate "},
+        {true, {0x302, 0x303, 1, 0x303, GL_FUNC_ADD, GL_FUNC_ADD}, "BlendFuncSeparate "},
+        {true, {0x302, 0x303, 0x302, 1, GL_FUNC_ADD, GL_FUNC_ADD}, "BlendFuncSeparate "},
+        {true, {0x302, 0x303, 0x302, 0x303, GL_MIN, GL_FUNC_ADD}, "BlendEquationSeparate "},
+        {true, {0x302, 0x303, 0x302, 0x303, GL_FUNC_ADD, GL_MIN}, "BlendEquationSeparate "},
+        {false, {1, 0, 1, 0, GL_MAX, GL_MAX}, "BlendEquationSeparate BlendFuncSeparate Disable "}};
+    for (auto const &[enabled, v, calls] : cases) {
+        if (enabled)
+            ORU_GL(Enable, GL_BLEND);
+        else
+            ORU_GL(Disable, GL_BLEND);
+        ORU_GL(BlendFuncSeparate, v[0], v[1], v[2], v[3]);
+        ORU_GL(BlendEquationSeparate, v[4], v[5]);
+        Values const found = Blending();
         {
             TemporaryAlphaBlendScope const scope;
-            EXPECT_EQ(wanted, Blending());
-            changes_->take();
+            EXPECT_EQ((Values{1, 0x303, 0x303, 0x302, 0x302, GL_FUNC_ADD, GL_FUNC_ADD}),
+                      Blending());
+            calls_->reset();
         }
-        EXPECT_EQ(c.calls, changes_->take());
+        EXPECT_EQ(calls, calls_->takeChanges());
         EXPECT_EQ(found, Blending());
     }
+}
+
+TEST_F(ScopesTest, AlphaBlendScopeThatFailsPutsBlendingBack) {
+    struct Failing : OpenGLForwarder {
+        void cgmBlendEquation(char const *file, unsigned int line, GLenum) override {
+            OpenGLForwarder::cgmBlendEquation(file, line, 0x1234);
+        }
+    };
+    ORU_GL(BlendFunc, GL_DST_COLOR, GL_ONE);
+    Values const found = Blending();
+    Pushed<Failing> failing;
+    EXPECT_FAILURE("GL_INVALID_ENUM", TemporaryAlphaBlendScope());
+    EXPECT_EQ(found, Blending());
 }
 
 TEST_F(ScopesTest, BlendScopeEndsWithoutAnError) {
     {
         TemporaryBlendScope const plain;
-        EXPECT_EQ("", changes_->take());
+        EXPECT_EQ("", calls_->takeChanges());
         ORU_GL(Enable, GL_BLEND); // the caller's own change
         {
             std::unique_ptr<TemporaryBlendScope> const nested =
                 std::make_unique<TemporaryAlphaBlendScope>();
-            ORU_GL(BlendColor, 1.f, 1.f, 1.f, 1.f);
             ::glEnable(0x1234);
         }
         EXPECT_EQ(static_cast<GLenum>(GL_NO_ERROR), ::glGetError());
-        EXPECT_EQ((std::vector<int>{1, 1, 0, 1, 0, GL_FUNC_ADD, GL_FUNC_ADD}), Blending())
+        EXPECT_EQ((Values{1, 0, 0, 1, 1, GL_FUNC_ADD, GL_FUNC_ADD}), Blending())
             << "restored although the first call of the end reported somebody else's error";
     }
     EXPECT_TRUE(::glIsEnabled(GL_BLEND)) << "the caller's change stays";
 }
 
-TEST_F(ScopesTest, LineScopesChangeNothingThatIsAsWanted) {
-    ORU_GL(LineWidth, 2.f);
-    ORU_GL(Enable, GL_LINE_SMOOTH);
-    ORU_GL(Enable, GL_LINE_STIPPLE);
-    ORU_GL(LineStipple, 3, GLushort{0x00FF});
-    changes_->take();
-    {
-        TemporaryLineWidthScope const width(2);
-        TemporaryLineSmoothScope const smooth;
-        TemporaryLineStippleScope const stipple(1, 3, 0x00FF);
-        EXPECT_EQ("", changes_->take());
+TEST_F(ScopesTest, LineScopesChangeWhatIsNotAsWantedAndPutItBack) {
+    for (bool const found : {false, true}) {
+        float const width = found ? 2 : 1;
+        if (found)
+            ORU_GL(Enable, GL_LINE_SMOOTH);
+        ORU_GL(LineWidth, width);
+        calls_->reset();
+        LineWidthState widthState;
+        LineSmoothState smoothState;
+        {
+            TemporaryLineWidthScope const two(2);
+            TemporaryLineSmoothScope const smooth;
+            EXPECT_EQ(found ? "" : "Enable LineWidth ", calls_->takeChanges());
+            widthState.setToCurrentGLValues();
+            smoothState.getLineSmoothState();
+            EXPECT_EQ(2, widthState.width);
+            EXPECT_TRUE(smoothState.enabled);
+            TemporaryLineWidthScope const inner(3.5f);
+            calls_->reset();
+        }
+        EXPECT_EQ(found ? "LineWidth " : "Disable LineWidth LineWidth ", calls_->takeChanges());
+        widthState.setToCurrentGLValues();
+        smoothState.getLineSmoothState();
+        EXPECT_EQ(width, widthState.width);
+        EXPECT_EQ(found, smoothState.enabled);
     }
-    EXPECT_EQ("", changes_->take());
-}
-
-TEST_F(ScopesTest, LineScopesPutBackWhatTheyFound) {
-    {
-        TemporaryLineWidthScope const width(2);
-        EXPECT_EQ(2, Width());
-        TemporaryLineWidthScope const inner(3.5f);
-        TemporaryLineSmoothScope const smooth;
-        EXPECT_TRUE(::glIsEnabled(GL_LINE_SMOOTH));
-        EXPECT_EQ("LineWidth LineWidth Enable ", changes_->take());
-    }
-    EXPECT_EQ("Disable LineWidth LineWidth ", changes_->take());
-    EXPECT_EQ(1, Width());
-    EXPECT_FALSE(::glIsEnabled(GL_LINE_SMOOTH));
-    LineWidthState widthState;
-    LineSmoothState smoothState;
-    ORU_GL(LineWidth, 4.f);
-    ORU_GL(Enable, GL_LINE_SMOOTH);
-    widthState.setToCurrentGLValues();
-    smoothState.getLineSmoothState();
-    EXPECT_EQ(4, widthState.width);
-    EXPECT_TRUE(smoothState.enabled);
 }
 
 TEST_F(ScopesTest, StippleScopeOverEveryState) {
-    struct Stipple {
-        unsigned char on;
-        int factor;
-        unsigned short pattern;
-    };
-    Stipple const stipples[] = {{0, 1, 0xFFFF}, {1, 3, 0x00FF}, {1, 4, 0x00FF}, {1, 3, 0x0F0F}};
-    for (Stipple const &found : stipples) {
-        for (Stipple const &wanted : stipples) {
-            if (found.on)
-                ORU_GL(Enable, GL_LINE_STIPPLE);
-            else
-                ORU_GL(Disable, GL_LINE_STIPPLE);
-            ORU_GL(LineStipple, found.factor, found.pattern);
-            std::vector<int> const before = Stippling();
-            changes_->take();
+    Values const stipples[] = {{0, 1, 0xFFFF}, {1, 3, 0x00FF}, {1, 4, 0x00FF}, {1, 3, 0x0F0F}};
+    for (Values const &found : stipples) {
+        for (Values const &wanted : stipples) {
+            SetStippling(found[0], found[1], found[2]);
+            calls_->reset();
             {
-                TemporaryLineStippleScope const scope(wanted.on, wanted.factor, wanted.pattern);
-                std::vector<int> const now = Stippling();
-                EXPECT_EQ(wanted.on, now[0]);
-                if (wanted.on) {
-                    EXPECT_EQ((std::vector<int>{1, wanted.factor, wanted.pattern}), now);
-                }
-                bool const same = &found == &wanted;
-                EXPECT_EQ(same        ? ""
-                          : wanted.on ? "Enable LineStipple "
-                                      : "Disable ",
-                          changes_->take());
+                TemporaryLineStippleScope const scope(static_cast<unsigned char>(wanted[0]),
+                                                      wanted[1],
+                                                      static_cast<unsigned short>(wanted[2]));
+                Values const now = Stippling();
+                EXPECT_EQ(wanted[0] ? wanted : Values({0, now[1], now[2]}), now);
+                EXPECT_EQ(&found == &wanted ? ""
+                          : wanted[0]       ? "Enable LineStipple "
+                                            : "Disable ",
+                          calls_->takeChanges());
             }
-            EXPECT_EQ(before[0], Stippling()[0]);
-            if (found.on) {
-                EXPECT_EQ(before, Stippling());
-            }
+            Values const after = Stippling();
+            EXPECT_EQ(found[0] ? found : Values({0, after[1], after[2]}), after);
+            EXPECT_TRUE(!found[0] || &found != &wanted || calls_->takeChanges().empty());
         }
     }
     LineStippleState state;
-    ORU_GL(Enable, GL_LINE_STIPPLE);
-    ORU_GL(LineStipple, 5, GLushort{0xF00F});
+    SetStippling(1, 5, 0xF00F);
     state.setToCurrentGLValues();
     EXPECT_TRUE(state == (LineStippleState{true, 5, 0xF00F}));
-    ORU_GL(Disable, GL_LINE_STIPPLE);
-    ORU_GL(LineStipple, 1, GLushort{0xFFFF});
+    SetStippling(0, 1, 0xFFFF);
     state.setToCurrentGLValues();
     EXPECT_TRUE(state == (LineStippleState{false, 5, 0xF00F})) << "not read while off";
-}
-
-TEST_F(ScopesTest, EndsWithoutAContextChangeNothing) {
-    ScopedContextWrapper const restore;
-    TemporaryAlphaBlendScope const blend;
-    TemporaryLineWidthScope const width(3);
-    TemporaryLineSmoothScope const smooth;
-    TemporaryLineStippleScope const stipple(1, 2, 0xAAAA);
-    changes_->take();
-    ::wglMakeCurrent(nullptr, nullptr);
 }

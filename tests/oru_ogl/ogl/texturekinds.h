@@ -8,11 +8,14 @@
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"
 
+#include <algorithm>
 #include <array>
 #include <memory>
 #include <vector>
 
 namespace oru_test {
+
+using namespace ORU::OGL;
 
 /// Width, height (or layers), depth (or layers); the sides a kind lacks are 1.
 using Sides = std::array<int, 3>;
@@ -23,20 +26,35 @@ struct Box {
     Sides size;
 };
 
+/// A pixel in memory.
+struct Pixel {
+    Texture::Format format;
+    Texture::Type type;
+};
+
+PixelUnpackParameters const kTight;
+
 struct TextureKind {
     char const *name;
     GLenum target;
     GLenum binding;
     std::size_t sides;
     std::size_t layers; ///< the side that counts layers, 3 for none
-    bool mipmaps;
-    std::unique_ptr<ORU::OGL::Texture> (*make)(ORU::OGL::Texture::InternalFormat format,
-                                               Sides const &size, bool mipmapped);
+    std::unique_ptr<Texture> (*make)(Texture::InternalFormat format, Sides const &size,
+                                     bool mipmapped);
+
+    bool mipmaps() const { return target != GL_TEXTURE_RECTANGLE; }
 
     /// Makes the sides 1 that the kind lacks.
     Sides cut(Sides size) const {
-        for (std::size_t i = sides; i < size.size(); ++i)
-            size[i] = 1;
+        std::fill(size.begin() + static_cast<int>(sides), size.end(), 1);
+        return size;
+    }
+
+    /// The size of the level below.
+    Sides halved(Sides size) const {
+        for (std::size_t side = 0; side < sides; ++side)
+            size[side] = side == layers ? size[side] : std::max(1, size[side] / 2);
         return size;
     }
 };
@@ -48,10 +66,9 @@ inline std::uint64_t Size(int side) {
 #define ORU_KIND(Class, gl, sides, layers, ...)                                                    \
     {                                                                                              \
 #Class, GL_TEXTURE_##gl, GL_TEXTURE_BINDING_##gl, sides, layers,                           \
-            GL_TEXTURE_##gl != GL_TEXTURE_RECTANGLE,                                               \
-            [](ORU::OGL::Texture::InternalFormat format, Sides const &size,                        \
-               [[maybe_unused]] bool mipmapped) -> std::unique_ptr < ORU::OGL::Texture>            \
-        { return std::make_unique<ORU::OGL::Class>(format, __VA_ARGS__); }                         \
+            [](Texture::InternalFormat format, Sides const &size,                                  \
+               [[maybe_unused]] bool mipmapped) -> std::unique_ptr < Texture>                      \
+        { return std::make_unique<Class>(format, __VA_ARGS__); }                                   \
     }
 inline TextureKind const kTextureKinds[] = {
     ORU_KIND(Texture1D, 1D, 1, 3, Size(size[0]), mipmapped),
@@ -64,13 +81,23 @@ inline TextureKind const kTextureKinds[] = {
 };
 #undef ORU_KIND
 
+/// A texture that is bound while it lives.
+struct BoundTexture {
+    std::unique_ptr<Texture> const texture;
+
+    explicit BoundTexture(std::unique_ptr<Texture> t) : texture(std::move(t)) { bind(); }
+    ~BoundTexture() { ORU_GL(BindTexture, texture->target(), 0u); }
+    void bind() const { ORU_GL(BindTexture, texture->target(), texture->objectID()); }
+    Texture &operator*() const { return *texture; }
+    Texture *operator->() const { return texture.get(); }
+};
+
 /// `subImage` of whichever class, from memory or (with an offset behind it) from a buffer.
 template<class... Source>
-void Upload(ORU::OGL::Texture &texture, int level, Box const &box, ORU::OGL::Texture::Format format,
-            ORU::OGL::Texture::Type type, ORU::OGL::PixelUnpackParameters const &params,
-            Source... source) {
-    using namespace ORU::OGL;
+void Upload(Texture &texture, int level, Box const &box, Pixel pixel,
+            PixelUnpackParameters const &params, Source... source) {
     auto const [x, y, z] = box.at;
+    auto const [format, type] = pixel;
     std::uint64_t const w = Size(box.size[0]), h = Size(box.size[1]), d = Size(box.size[2]);
     if (auto *const one = dynamic_cast<Texture1 *>(&texture))
         one->subImage(level, x, w, format, type, source..., params);
@@ -81,51 +108,33 @@ void Upload(ORU::OGL::Texture &texture, int level, Box const &box, ORU::OGL::Tex
                                                    params);
 }
 
-/// `getPixelData` into memory of whichever class.
-inline void Download(ORU::OGL::Texture const &texture, void *dst, int level,
-                     ORU::OGL::Texture::Format format, ORU::OGL::Texture::Type type,
-                     unsigned int alignment) {
-    using namespace ORU::OGL;
+/// `copyTexSubImage` of whichever class, from (1, 3) in the framebuffer.
+inline void Copy(Texture &texture, int level, Sides const &at, std::uint64_t w, std::uint64_t h) {
+    auto const [x, y, z] = at;
+    if (auto *const one = dynamic_cast<Texture1 *>(&texture))
+        one->copyTexSubImage(level, x, 1, 3, w);
+    else if (auto *const two = dynamic_cast<Texture2 *>(&texture))
+        two->copyTexSubImage(level, x, y, 1, 3, w, h);
+    else
+        dynamic_cast<Texture3 &>(texture).copyTexSubImage(level, x, y, z, 1, 3, w, h);
+}
+
+/// `getPixelData` of whichever class, into memory or (with an offset behind it) into a buffer.
+template<class... Offset, class Destination>
+void Download(Texture const &texture, int level, Pixel pixel, unsigned int alignment,
+              Destination *destination, Offset... offset) {
+    auto const [format, type] = pixel;
     if (auto *const one = dynamic_cast<Texture1 const *>(&texture)) {
         ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, static_cast<GLint>(alignment));
-        one->getPixelData(dst, level, Texture::Format2GL(format), Texture::Type2GL(type));
-    } else if (auto *const two = dynamic_cast<Texture2 const *>(&texture)) {
-        two->getPixelData(dst, level, format, type, alignment);
-    } else {
-        dynamic_cast<Texture3 const &>(texture).getPixelData(dst, level, format, type, alignment);
-    }
-}
-
-/// The same into a buffer.
-inline void Download(ORU::OGL::Texture const &texture, ORU::OGL::Buffer &buffer, int offset,
-                     int level, ORU::OGL::Texture::Format format, ORU::OGL::Texture::Type type) {
-    using namespace ORU::OGL;
-    if (auto *const one = dynamic_cast<Texture1 const *>(&texture))
-        one->getPixelData(&buffer, offset, level, Texture::Format2GL(format),
+        one->getPixelData(destination, offset..., level, Texture::Format2GL(format),
                           Texture::Type2GL(type));
-    else if (auto *const two = dynamic_cast<Texture2 const *>(&texture))
-        two->getPixelData(&buffer, static_cast<std::size_t>(offset), level, format, type, 1);
-    else
-        dynamic_cast<Texture3 const &>(texture).getPixelData(&buffer, offset, level, format, type,
-                                                             1);
-}
-
-inline std::size_t PixelDataSize(ORU::OGL::Texture const &texture, ORU::OGL::Texture::Format format,
-                                 ORU::OGL::Texture::Type type) {
-    using namespace ORU::OGL;
-    if (auto *const one = dynamic_cast<Texture1 const *>(&texture))
-        return one->pixelDataSize(3, format, type);
-    if (auto *const two = dynamic_cast<Texture2 const *>(&texture))
-        return two->pixelDataSize(3, format, type);
-    return dynamic_cast<Texture3 const &>(texture).pixelDataSize(3, format, type);
-}
-
-inline void Bind(ORU::OGL::Texture const &texture) {
-    ORU_GL(BindTexture, texture.target(), texture.objectID());
-}
-
-inline void Unbind(ORU::OGL::Texture const &texture) {
-    ORU_GL(BindTexture, texture.target(), 0);
+    } else if (auto *const two = dynamic_cast<Texture2 const *>(&texture)) {
+        two->getPixelData(destination, static_cast<std::size_t>(offset)..., level, format, type,
+                          alignment);
+    } else {
+        dynamic_cast<Texture3 const &>(texture).getPixelData(destination, offset..., level, format,
+                                                             type, alignment);
+    }
 }
 
 /// The texels of an image, a few components each, x fastest.
@@ -143,20 +152,25 @@ struct Image {
                        Size(x) * channels];
     }
 
-    /// Runs `visit(x, y, z)` for every texel of a box.
+    /// Runs `visit(x, y, z)` for every texel of an image of a size.
     template<class Visit>
-    static void ForEach(Box const &box, Visit visit) {
-        for (int z = box.at[2]; z < box.at[2] + box.size[2]; ++z)
-            for (int y = box.at[1]; y < box.at[1] + box.size[1]; ++y)
-                for (int x = box.at[0]; x < box.at[0] + box.size[0]; ++x)
+    static void ForEach(Sides const &size, Visit visit) {
+        for (int z = 0; z < size[2]; ++z)
+            for (int y = 0; y < size[1]; ++y)
+                for (int x = 0; x < size[0]; ++x)
                     visit(x, y, z);
     }
 
-    /// Writes another image at a place of this one.
-    void paste(Sides const &at, Image &part) {
-        ForEach({{0, 0, 0}, part.size}, [&](int x, int y, int z) {
-            std::copy_n(part.at(x, y, z), channels, this->at(at[0] + x, at[1] + y, at[2] + z));
-        });
+    void upload(Texture &texture, Pixel pixel, int level = 0, Sides const &at = {}) const {
+        void const *const data = texels.data();
+        Upload(texture, level, {at, size}, pixel, kTight, data);
+    }
+
+    /// A level of a texture, in an image of the same size and components.
+    std::vector<T> read(Texture const &texture, Pixel pixel, int level = 0) const {
+        std::vector<T> result(texels.size());
+        Download(texture, level, pixel, 1, static_cast<void *>(result.data()));
+        return result;
     }
 };
 

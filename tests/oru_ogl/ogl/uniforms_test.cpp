@@ -8,9 +8,7 @@
 #include <numeric>
 
 using namespace ORU::OGL;
-using oru_test::CountingForwarder;
-using oru_test::MessageOf;
-using oru_test::Pushed;
+using namespace oru_test;
 
 namespace {
 
@@ -29,10 +27,12 @@ struct Case {
 
 // Values of no two alike, so that an exchanged pair shows.
 int const kInts[] = {2, 3, 5, 7, 11, 13, 17, 19, 23, 29, 31, 37};
-float const kFloats[] = {1.5f,  2.5f,  3.5f,  4.5f,  5.5f,  6.5f,  7.5f,  8.5f,
-                         9.5f,  10.5f, 11.5f, 12.5f, 13.5f, 14.5f, 15.5f, 16.5f,
-                         17.5f, 18.5f, 19.5f, 20.5f, 21.5f, 22.5f, 23.5f, 24.5f,
-                         25.5f, 26.5f, 27.5f, 28.5f, 29.5f, 30.5f, 31.5f, 32.5f};
+auto const kValues = [] {
+    std::vector<float> values(32);
+    std::iota(values.begin(), values.end(), 1.5f);
+    return values;
+}();
+float const *const kFloats = kValues.data();
 
 /// The n × n matrix at `data`, turned over.
 std::vector<float> Transposed(float const *data, int n) {
@@ -113,26 +113,34 @@ std::string NameOf(std::size_t i) {
     return "u" + std::to_string(i);
 }
 
+/// The element that a case looks at.
+template<class Case>
+std::string LastOf(Case const &c, std::string const &name) {
+    return c.elements ? name + "[" + std::to_string(c.elements - 1) + "]" : name;
+}
+
 /// A fragment shader in which every case has a uniform of its own, and none is left out as unused.
 template<class Cases>
 std::string Source(Cases const &cases) {
     std::string uniforms = "#version 120\n#extension GL_ARB_texture_rectangle : enable\n", use;
     for (std::size_t i = 0; i < cases.size(); ++i) {
-        auto const &c = cases[i];
-        std::string const type = c.type, name = NameOf(i);
-        bool const array = c.elements != 0;
+        std::string const type = cases[i].type, name = NameOf(i), value = LastOf(cases[i], name);
+        int const elements = cases[i].elements;
         uniforms += "uniform " + type + " " + name +
-                    (array ? "[" + std::to_string(c.elements) + "]" : "") + ";\n";
-        std::string const value = array ? name + "[" + std::to_string(c.elements - 1) + "]" : name;
+                    (elements ? "[" + std::to_string(elements) + "];\n" : ";\n");
         if (type.find("sampler") == 0) {
             std::string const kind = type.substr(7);
-            std::string const where = kind == "1D" ? "0.0" : kind == "3D" ? "vec3(0)" : "vec2(0)";
-            use += "sum += texture" + kind + "(" + value + ", " + where + ").r;\n";
+            use += "sum += texture" + kind + "(" + value + ", " +
+                   (kind == "1D"   ? "0.0"
+                    : kind == "3D" ? "vec3(0)"
+                                   : "vec2(0)") +
+                   ").r;\n";
         } else {
-            std::string const first = type.find("mat") == 0 ? value + "[0][0]"
-                                      : type.back() <= '9'  ? value + ".x"
-                                                            : value;
-            use += "sum += float(" + first + ");\n";
+            use += "sum += float(" + value +
+                   (type.find("mat") == 0 ? "[0][0]"
+                    : type.back() <= '9'  ? ".x"
+                                          : "") +
+                   ");\n";
         }
     }
     return uniforms + "void main() { float sum = 0.0;\n" + use + "gl_FragColor = vec4(sum); }";
@@ -147,87 +155,43 @@ void Build(AnyProgram &program, Cases const &cases) {
 }
 
 std::vector<float> Read(Program const &program, std::string const &name, std::size_t size) {
-    GLint current = 0;
-    ::glGetIntegerv(GL_CURRENT_PROGRAM, &current);
     std::vector<float> values(16);
-    ORU_GL(GetUniformfv, static_cast<GLuint>(current), program.getUniformLocation(name.c_str()),
-           values.data());
+    ORU_GL(GetUniformfv, static_cast<GLuint>(Get(GL_CURRENT_PROGRAM)),
+           program.getUniformLocation(name.c_str()), values.data());
     values.resize(size);
     return values;
 }
 
-class UniformsTest : public oru_test::ObjectTest {
-protected:
-    std::vector<Case<Program>> const cases_ = Cases<Program>();
-};
-
 } // namespace
 
+class UniformsTest : public ObjectTest {};
+
 TEST_F(UniformsTest, EverySetterInEveryForm) {
+    auto const cases = Cases<Program>();
     for (int form = 0; form < FORMS; ++form) {
-        Program program;
-        Build(program, cases_);
-        program.enable();
-        for (std::size_t i = 0; i < cases_.size(); ++i) {
-            auto const &c = cases_[i];
+        Program program, other;
+        Build(program, cases);
+        Build(other, cases);
+        for (std::size_t i = 0; i < cases.size(); ++i) {
+            auto const &c = cases[i];
             SCOPED_TRACE(std::string(c.name) + " form " + std::to_string(form));
-            std::string const name = NameOf(i);
-            std::string const last =
-                c.elements ? name + "[" + std::to_string(c.elements - 1) + "]" : name;
+            std::string const name = NameOf(i), last = LastOf(c, name);
+            int const location = program.getUniformLocation(name.c_str());
+            auto const set = [&] { c.set[form](program, location, name.c_str()); };
+            program.enable();
             EXPECT_EQ(std::vector<float>(c.element.size()), Read(program, last, c.element.size()));
-            EXPECT_EQ("", MessageOf([&] {
-                          c.set[form](program, program.getUniformLocation(name.c_str()),
-                                      name.c_str());
-                      }));
+            EXPECT_FAILURE("", set());
             EXPECT_EQ(c.element, Read(program, last, c.element.size()));
+            // An array set by name goes to the program that is current, as what is set unsafely.
+            other.enable();
+            bool const asks = form == LOCATION || (form == NAME && c.asserted != 0);
+            EXPECT_FAILURE(asks ? "Program must be enabled to set uniform parameter" : "", set());
         }
-        program.disable();
+        other.disable();
     }
 }
 
-TEST_F(UniformsTest, GuardedSettersNeedTheProgramCurrent) {
-    Program program, other;
-    Build(program, cases_);
-    Build(other, cases_);
-    other.enable();
-    for (std::size_t i = 0; i < cases_.size(); ++i) {
-        auto const &c = cases_[i];
-        SCOPED_TRACE(c.name);
-        std::string const name = NameOf(i);
-        int const location = program.getUniformLocation(name.c_str());
-        char const needed[] = "Program must be enabled to set uniform parameter";
-        EXPECT_EQ(needed, MessageOf([&] { c.set[LOCATION](program, location, nullptr); }));
-        bool const asksByName = c.asserted != 0;
-        EXPECT_EQ(asksByName ? needed : "",
-                  MessageOf([&] { c.set[NAME](program, 0, name.c_str()); }))
-            << "an array set by name goes to the program that is current";
-        EXPECT_EQ("", MessageOf([&] { c.set[LOCATION_UNSAFE](program, location, nullptr); }));
-    }
-    other.disable();
-}
-
-TEST_F(UniformsTest, CallsOfEachForm) {
-    Program program;
-    Build(program, cases_);
-    program.enable();
-    for (std::size_t i = 0; i < cases_.size(); ++i) {
-        auto const &c = cases_[i];
-        SCOPED_TRACE(c.name);
-        Pushed<CountingForwarder> calls;
-        c.set[LOCATION_UNSAFE](program, -1, nullptr);
-        EXPECT_EQ(0, calls->total());
-        c.set[NAME_UNSAFE](program, 0, NameOf(i).c_str());
-        EXPECT_EQ(2, calls->total()) << "a look-up and an upload";
-        EXPECT_EQ(1, calls->count("GetUniformLocation"));
-        calls->reset();
-        c.set[LOCATION](program, -1, nullptr);
-        EXPECT_EQ(2, calls->total()) << "-1 is left to OpenGL";
-        EXPECT_EQ(1, calls->count("GetIntegerv"));
-    }
-    program.disable();
-}
-
-TEST_F(UniformsTest, GuardedSettersAssertTheType) {
+TEST_F(UniformsTest, CallsAndAssertionsOfEachForm) {
     /// Notes what it is asked to assert.
     class Body : public ProgramImplCore {
     public:
@@ -235,7 +199,7 @@ TEST_F(UniformsTest, GuardedSettersAssertTheType) {
         mutable std::vector<unsigned int> asserted;
         void assertActiveUniformType(int location, unsigned int type,
                                      unsigned int count) const override {
-            asserted.insert(asserted.end(), {static_cast<unsigned int>(location), type, count});
+            asserted = {static_cast<unsigned int>(location), type, count};
         }
     };
     auto const cases = Cases<Body>();
@@ -248,16 +212,27 @@ TEST_F(UniformsTest, GuardedSettersAssertTheType) {
         std::string const name = NameOf(i);
         int const location = body.getUniformLocation(name.c_str());
         unsigned int const count = c.elements ? static_cast<unsigned int>(c.elements) : 1;
-        std::vector<unsigned int> expected;
+        std::vector<unsigned int> asserted;
         if (c.asserted)
-            expected = {static_cast<unsigned int>(location), c.asserted, count};
-        for (Form const form : {LOCATION, NAME}) {
+            asserted = {static_cast<unsigned int>(location), c.asserted, count};
+        Pushed<CountingForwarder> calls;
+        auto const expect = [&](Form form, int at, std::vector<unsigned int> const &assertion,
+                                int lookUps, int queries, int total) {
             body.asserted.clear();
-            c.set[form](body, location, name.c_str());
-            EXPECT_EQ(expected, body.asserted);
-        }
-        c.set[LOCATION_UNSAFE](body, location, nullptr);
-        EXPECT_EQ(expected, body.asserted) << "an unsafe setter asserts nothing";
+            calls->reset();
+            c.set[form](body, at, name.c_str());
+            EXPECT_EQ(assertion, body.asserted) << form;
+            EXPECT_EQ(lookUps, calls->count("GetUniformLocation")) << form;
+            EXPECT_EQ(queries, calls->count("GetIntegerv")) << form;
+            EXPECT_EQ(total, calls->total()) << form;
+        };
+        expect(LOCATION, location, asserted, 0, 1, 2);
+        bool const matrix = std::string(c.type).find("mat") == 0; // asks by location only
+        int const queries = !c.asserted ? 0 : matrix ? 1 : 2;
+        expect(NAME, location, asserted, 1, queries, queries + 2);
+        expect(LOCATION_UNSAFE, location, {}, 0, 0, 1);
+        expect(LOCATION_UNSAFE, -1, {}, 0, 0, 0);
+        expect(NAME_UNSAFE, location, {}, 1, 0, 2);
     }
     body.disable();
 }

@@ -6,11 +6,11 @@
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 
-#include <cstring>
+#include <algorithm>
 #include <numeric>
 
 using namespace ORU::OGL;
-using oru_test::MessageOf;
+using namespace oru_test;
 
 namespace {
 
@@ -35,41 +35,8 @@ VertexBuffer::AttributeType Type(unsigned int components) {
     return static_cast<VertexBuffer::AttributeType>(components);
 }
 
-/// A program that writes an attribute into the pixels it is drawn at, exactly.
-void Build(Program &program) {
-    char const *const vertex = "attribute float place; attribute vec4 value; varying vec4 colour;"
-                               "void main() { colour = value;"
-                               " gl_Position = vec4(place, 0, 0, 1); }";
-    char const *const fragment = "varying vec4 colour; void main() { gl_FragColor = colour; }";
-    program.loadVertexShader(1, &vertex, nullptr);
-    program.loadFragmentShader(1, &fragment, nullptr);
-    program.link(true);
-}
-
-class VertexBufferTest : public oru_test::ObjectTest {
-protected:
-    /// Runs `draw` with the program current and gives the row of pixels, four floats each.
-    template<class Draw>
-    Pixels drawn(Program &program, Draw draw) {
-        Renderbuffer row(GL_RGBA32F, kCount, 1);
-        Framebuffer framebuffer;
-        framebuffer.bind();
-        framebuffer.attach(&row, 0);
-        ORU_GL(Viewport, 0, 0, static_cast<GLsizei>(kCount), 1);
-        ORU_GL(ClearColor, -1.f, -1.f, -1.f, -1.f);
-        ORU_GL(Clear, GL_COLOR_BUFFER_BIT);
-        program.enable();
-        draw();
-        program.disable();
-        Pixels pixels(4 * kCount);
-        ORU_GL(ReadPixels, 0, 0, static_cast<GLsizei>(kCount), 1, GL_RGBA, GL_FLOAT, pixels.data());
-        framebuffer.unbind();
-        return pixels;
-    }
-};
-
 /// What OpenGL gives the shader for an attribute of fewer components, and the untouched rest.
-Pixels Expected(Pixels const &values, unsigned int components, unsigned int vertices) {
+Pixels Expected(Pixels const &values, unsigned int components, unsigned int vertices = kCount) {
     Pixels pixels(4 * kCount, -1.f);
     for (unsigned int i = 0; i < 4 * vertices; ++i) {
         unsigned int const component = i % 4;
@@ -80,9 +47,9 @@ Pixels Expected(Pixels const &values, unsigned int components, unsigned int vert
     return pixels;
 }
 
-Pixels Values(unsigned int components) {
+Pixels Values(unsigned int components, float first = 100.25f) {
     Pixels values(kCount * components);
-    std::iota(values.begin(), values.end(), 100.25f);
+    std::iota(values.begin(), values.end(), first);
     return values;
 }
 
@@ -97,120 +64,129 @@ VertexBuffer Points(unsigned int components) {
 
 } // namespace
 
+class VertexBufferTest : public ObjectTest {
+protected:
+    void TearDown() override {
+        program_.reset();
+        ObjectTest::TearDown();
+    }
+
+    /// By default a program that writes an attribute into the pixels it is drawn at, exactly.
+    void build(char const *vertex = "attribute float place; attribute vec4 value;"
+                                    "varying vec4 colour; void main() { colour = value;"
+                                    " gl_Position = vec4(place, 0, 0, 1); }",
+               char const *fragment = "varying vec4 colour;"
+                                      "void main() { gl_FragColor = colour; }") {
+        program_.emplace();
+        program_->loadVertexShader(1, &vertex, nullptr);
+        program_->loadFragmentShader(1, &fragment, nullptr);
+        program_->link(true);
+    }
+
+    unsigned int programID() {
+        program_->enable();
+        auto const name = static_cast<unsigned int>(Get(GL_CURRENT_PROGRAM));
+        program_->disable();
+        return name;
+    }
+
+    /// Draws with the program into a row of pixels and gives them, four floats each.
+    Pixels drawn(VertexBuffer &buffer, std::size_t count = kCount) {
+        Renderbuffer row(GL_RGBA32F, kCount, 1);
+        Framebuffer framebuffer;
+        framebuffer.bind();
+        framebuffer.attach(&row, 0);
+        ORU_GL(Viewport, 0, 0, static_cast<GLsizei>(kCount), 1);
+        ORU_GL(ClearColor, -1.f, -1.f, -1.f, -1.f);
+        ORU_GL(Clear, GL_COLOR_BUFFER_BIT);
+        program_->enable();
+        buffer.drawPrimitives(count);
+        program_->disable();
+        EXPECT_EQ(0, Get(GL_VERTEX_ARRAY_BINDING));
+        Pixels pixels(4 * kCount);
+        ORU_GL(ReadPixels, 0, 0, static_cast<GLsizei>(kCount), 1, GL_RGBA, GL_FLOAT, pixels.data());
+        framebuffer.unbind();
+        return pixels;
+    }
+
+    std::optional<Program> program_;
+};
+
 TEST_F(VertexBufferTest, DrawsFieldsOfEveryType) {
-    Program program;
-    Build(program);
+    build();
     for (unsigned int components = 1; components <= 4; ++components) {
         SCOPED_TRACE(components);
         Pixels const values = Values(components);
         VertexBuffer buffer = Points(components);
         EXPECT_EQ(4 * components, Field("", Type(components), {}).byteSize());
-        EXPECT_EQ(Expected(Pixels(values.size()), components, kCount),
-                  drawn(program,
-                        [&] {
-                            buffer.setupWithProgram(&program);
-                            buffer.marshallData();
-                            buffer.drawPrimitives();
-                        }))
-            << "zeros until set";
+        buffer.setupWithProgram(&*program_);
+        buffer.marshallData();
+        EXPECT_EQ(Expected(Pixels(values.size()), components), drawn(buffer)) << "zeros until set";
         buffer.setField("value", Bytes(values), false, 0, 0);
-        EXPECT_EQ(Expected(values, components, kCount), drawn(program, [&] {
-                      buffer.marshallData();
-                      buffer.drawPrimitives();
-                  }));
-        EXPECT_EQ(Expected(values, components, 2), drawn(program, [&] {
-                      buffer.marshallData(3);
-                      buffer.drawPrimitives(2);
-                  }));
-        EXPECT_EQ(Pixels(4 * kCount, -1.f), drawn(program, [&] { buffer.drawPrimitives(0); }));
+        buffer.marshallData();
+        EXPECT_EQ(Expected(values, components), drawn(buffer));
+        buffer.marshallData(3);
+        EXPECT_EQ(Expected(values, components, 2), drawn(buffer, 2));
+        EXPECT_EQ(Pixels(4 * kCount, -1.f), drawn(buffer, 0));
     }
-    GLint bound = -1;
-    ::glGetIntegerv(GL_VERTEX_ARRAY_BINDING, &bound);
-    EXPECT_EQ(0, bound);
 }
 
 TEST_F(VertexBufferTest, GathersFromPaddedVertices) {
-    Program program;
-    Build(program);
-    GLint current = 0;
-    program.enable();
-    ::glGetIntegerv(GL_CURRENT_PROGRAM, &current);
+    build();
     for (unsigned int components = 1; components <= 4; ++components) {
         SCOPED_TRACE(components);
-        Pixels const values = Values(components);
+        Pixels values = Values(components);
         std::size_t const step = 5;
         Pixels padded(step * kCount, 77.f);
         for (std::size_t i = 0; i < values.size(); ++i)
             padded[i / components * step + i % components] = values[i];
         VertexBuffer buffer = Points(components);
-        unsigned int const size = 4 * components;
-        auto const draw = [&] {
-            buffer.setupWithProgram(static_cast<unsigned int>(current));
-            buffer.marshallData();
-            buffer.drawPrimitives();
-        };
         buffer.setField(0, Bytes(padded), step * 4, 0);
-        EXPECT_EQ(Expected(values, components, kCount), drawn(program, draw));
-        Pixels doubled = values;
-        for (float &value : doubled)
-            value *= 2;
-        buffer.setField(0, Bytes(doubled), size, 3); // the first three lie together
-        std::copy(values.begin() + 3 * components, values.end(), doubled.begin() + 3 * components);
-        EXPECT_EQ(Expected(doubled, components, kCount), drawn(program, draw));
+        buffer.setupWithProgram(programID());
+        buffer.marshallData();
+        EXPECT_EQ(Expected(values, components), drawn(buffer));
+        Pixels const others = Values(components, 7); // the first three lie together
+        buffer.setField(0, Bytes(others), 4 * components, 3);
+        buffer.marshallData();
+        std::copy_n(others.begin(), 3 * components, values.begin());
+        EXPECT_EQ(Expected(values, components), drawn(buffer));
     }
 }
 
 TEST_F(VertexBufferTest, CopiesHaveNoOpenGLObjects) {
-    Program program;
-    Build(program);
+    build();
     VertexBuffer buffer = Points(1);
     Pixels const values = Values(1);
     buffer.setField("value", Bytes(values), false, 0, 0);
-    buffer.setupWithProgram(&program);
+    buffer.setupWithProgram(&*program_);
     buffer.marshallData();
     VertexBuffer copy(buffer), assigned;
+    EXPECT_EQ(0u, assigned.vertexCount());
     assigned = buffer;
-    EXPECT_EQ("vertexBuffer_ != 0", MessageOf([&] { copy.marshallData(); }));
-    EXPECT_EQ("vertexBuffer_ != 0", MessageOf([&] { assigned.marshallData(); }));
+    EXPECT_FAILURE("vertexBuffer_ != 0", copy.marshallData());
+    EXPECT_FAILURE("vertexBuffer_ != 0", assigned.marshallData());
     EXPECT_EQ(kCount, assigned.vertexCount());
     EXPECT_EQ(VertexBuffer::PRIMITIVETYPE_POINTS, assigned.primitiveType());
-    copy.setupWithProgram(&program);
-    EXPECT_EQ(Expected(values, 1, kCount), drawn(program, [&] {
-                  copy.marshallData();
-                  copy.drawPrimitives();
-              }));
-    VertexBuffer const &same = copy;
-    copy = same;
+    copy.setupWithProgram(&*program_);
+    copy.marshallData();
+    EXPECT_EQ(Expected(values, 1), drawn(copy));
     VertexBuffer taken(std::move(buffer)); // with its objects
-    EXPECT_EQ(Expected(values, 1, kCount), drawn(program, [&] { taken.drawPrimitives(); }));
-    taken = std::move(copy); // the self-assigned copy was one without objects again
-    EXPECT_EQ("vertexBuffer_ != 0", MessageOf([&] { taken.marshallData(); }));
-    VertexBuffer const empty;
-    EXPECT_EQ(0u, empty.vertexCount());
+    EXPECT_EQ(Expected(values, 1), drawn(taken));
+    taken = std::move(assigned);
+    EXPECT_FAILURE("vertexBuffer_ != 0", taken.marshallData());
 }
 
 TEST_F(VertexBufferTest, RefusesWhatItCannotDraw) {
     for (unsigned int const type : {0u, 5u})
-        EXPECT_EQ("Unexpected field type", MessageOf([&] { Field("p", Type(type), {}); }));
-
+        EXPECT_FAILURE("Unexpected field type", Field("p", Type(type), {}));
     VertexBuffer buffer = Points(2);
     unsigned char const data[8] = {};
-    EXPECT_EQ("ignoreMissingFields",
-              MessageOf([&] { buffer.setField("missing", data, false, 0, 1); }));
-    buffer.setField("missing", data, true, 0, 1);
-    EXPECT_EQ("vertexBuffer_ != 0", MessageOf([&] { buffer.marshallData(); }));
-    EXPECT_EQ("Enforce oglProgram != NULL",
-              MessageOf([&] { buffer.setupWithProgram(static_cast<Program *>(nullptr)); }));
-
-    Program unrelated;
-    char const *const source = "void main() { gl_Position = vec4(0); }";
-    unrelated.loadVertexShader(1, &source, nullptr);
-    unrelated.link(true);
-    EXPECT_EQ("f.resolvedSlot_ >= 0", MessageOf([&] { buffer.setupWithProgram(&unrelated); }));
-    unrelated.enable();
-    GLint current = 0;
-    ::glGetIntegerv(GL_CURRENT_PROGRAM, &current);
-    EXPECT_EQ("f.resolvedSlot_ >= 0",
-              MessageOf([&] { buffer.setupWithProgram(static_cast<unsigned int>(current)); }));
-    unrelated.disable();
+    EXPECT_FAILURE("ignoreMissingFields", buffer.setField("missing", data, false, 0, 1));
+    EXPECT_FAILURE("", buffer.setField("missing", data, true, 0, 1));
+    EXPECT_FAILURE("vertexBuffer_ != 0", buffer.marshallData());
+    EXPECT_FAILURE("Enforce oglProgram != NULL",
+                   buffer.setupWithProgram(static_cast<Program *>(nullptr)));
+    build("void main() { gl_Position = vec4(0); }", "void main() {}");
+    EXPECT_FAILURE("f.resolvedSlot_ >= 0", buffer.setupWithProgram(&*program_));
+    EXPECT_FAILURE("f.resolvedSlot_ >= 0", buffer.setupWithProgram(programID()));
 }

@@ -1,0 +1,73 @@
+// Objects and scopes whose context has gone: their ends find none, or another one.
+#include "texturekinds.h"
+
+#include "oru/oru_ogl/ogl/blendscope.h"
+#include "oru/oru_ogl/ogl/framebuffer.h"
+#include "oru/oru_ogl/ogl/linescope.h"
+#include "oru/oru_ogl/ogl/oruopengl.h"
+#include "oru/oru_ogl/ogl/programenabledscope.h"
+#include "oru/oru_ogl/ogl/programogl.h"
+#include "oru/oru_ogl/ogl/renderbuffer.h"
+#include "oru/oru_ogl/ogl/shader.h"
+#include "oru/oru_ogl/ogl/texturebindscope.h"
+#include "oru/oru_ogl/ogl/vertexbufferogl.h"
+
+using namespace oru_test;
+
+namespace {
+
+struct Everything {
+    Texture2D texture{Texture::INTERNALFORMAT_RGBA8, 4, 4, false};
+    Buffer buffer{4, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr};
+    Framebuffer framebuffer;
+    Renderbuffer renderbuffer{GL_RGBA8, 1, 1};
+    VertexShader shader;
+    Program program;
+    VertexBuffer vertices{{VertexBuffer::Field("", VertexBuffer::ATTRIBUTETYPE_FLOAT, {})},
+                          1,
+                          VertexBuffer::PRIMITIVETYPE_POINTS};
+    TemporaryAlphaBlendScope blend;
+    TemporaryLineWidthScope width{3};
+    TemporaryLineSmoothScope smooth;
+    TemporaryLineStippleScope stipple{1, 2, 0xAAAA};
+    Texture2DBindScope bound{&texture, 0, true};
+    ProgramEnabledScope enabled;
+
+    Everything() {
+        shader.load("void main() { gl_Position = vec4(0); }");
+        shader.compile(true);
+        program.attach(&shader);
+        program.link(true);
+        enabled.enable(&program);
+        EXPECT_NE("", MessageOf([&] { vertices.setupWithProgram(&program); })) << "but has names";
+    }
+};
+
+} // namespace
+
+using LostContextTest = OffscreenTest;
+
+TEST_F(LostContextTest, EndsWithoutAContextMakeNoCall) {
+    auto other = std::make_unique<ContextOffscreen>();
+    other->makeCurrent();
+    auto everything = std::make_unique<Everything>();
+    other.reset();
+    ReleaseOGLContext();
+    Pushed<CountingForwarder> calls;
+    everything.reset();
+    EXPECT_EQ(0, calls->total());
+    EXPECT_EQ("", GetGLString(GL_VENDOR));
+    EXPECT_NE("", MessageOf([] { Texture2D(Texture::INTERNALFORMAT_RGBA8, 4, 4, false); }));
+    context().makeCurrent();
+    EXPECT_NE("", GetGLString(GL_VENDOR));
+}
+
+TEST_F(LostContextTest, EndsInAnotherContextThrowNothing) {
+    auto other = std::make_unique<ContextOffscreen>();
+    other->makeCurrent();
+    auto everything = std::make_unique<Everything>();
+    context().makeCurrent();
+    other.reset();
+    EXPECT_NO_THROW(everything.reset());
+    ::glGetError();
+}
