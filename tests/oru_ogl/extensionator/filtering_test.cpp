@@ -94,7 +94,8 @@ TEST_F(FilteringTest, KeepsANo) {
     EXPECT_FALSE(Record().supportsFloatFiltering());
     obstacle->fails = true;
     EXPECT_FALSE(Record().supportsHalfFiltering());
-    *obstacle = Obstacle();
+    obstacle->filters = true;
+    obstacle->fails = false;
     EXPECT_FALSE(Record().supportsFloatFiltering());
     EXPECT_FALSE(Record().supportsHalfFiltering());
 }
