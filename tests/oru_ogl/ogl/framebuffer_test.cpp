@@ -59,24 +59,41 @@ TEST_F(FramebufferTest, BindsAndUnbinds) {
                    second.statusOkay(nullptr));
 }
 
-TEST_F(FramebufferTest, AttachesAndDetachesEveryKind) {
+TEST_F(FramebufferTest, IsIncompleteByEveryCause) {
     Framebuffer framebuffer;
     framebuffer.bind();
     EXPECT_EQ(GL_FRAMEBUFFER_INCOMPLETE_MISSING_ATTACHMENT_EXT, StatusOf(framebuffer));
+    Texture2D texture(Texture::INTERNALFORMAT_RGBA8, 8, 4, false);
+    framebuffer.attach(&texture, 1, 0); // a level without an image
+    EXPECT_EQ(GL_FRAMEBUFFER_INCOMPLETE_ATTACHMENT_EXT, StatusOf(framebuffer));
+
+    framebuffer.attach(&texture, 0, 0);
+    Renderbuffer depth(GL_DEPTH_COMPONENT24, 8, 4);
+    framebuffer.attach(&depth, 0);
+    EXPECT_EQ(GL_FRAMEBUFFER_COMPLETE_EXT, StatusOf(framebuffer));
+    depth.bind();
+    ORU_GL(RenderbufferStorageMultisample, GL_RENDERBUFFER_EXT, 4, GL_DEPTH_COMPONENT24, 8, 4);
+    EXPECT_EQ(GL_FRAMEBUFFER_INCOMPLETE_MULTISAMPLE_EXT, StatusOf(framebuffer));
+    framebuffer.detach(&depth, 0);
+
+    ORU_GL(BindTexture, GL_TEXTURE_2D, texture.objectID()); // a format that is not drawn into
+    ORU_GL(TexImage2D, GL_TEXTURE_2D, 0, GL_RGB9_E5, 8, 4, 0, GL_RGB, GL_FLOAT, nullptr);
+    EXPECT_NE(GL_FRAMEBUFFER_COMPLETE_EXT, StatusOf(framebuffer));
+}
+
+TEST_F(FramebufferTest, AttachesAndDetachesEveryKind) {
+    Framebuffer framebuffer;
+    framebuffer.bind();
     Texture2D texture(Texture::INTERNALFORMAT_RGBA8, 8, 4, false);
     unsigned int const last = Framebuffer::MaxColorAttachments() - 1;
     framebuffer.attach(&texture, 0, last);
     ExpectAttached(&texture, GL_COLOR_ATTACHMENT0_EXT + last);
     framebuffer.attach(texture.objectID(), GL_TEXTURE_2D, 0, 2);
     ExpectAttached(&texture, GL_COLOR_ATTACHMENT0_EXT + 2);
-    EXPECT_EQ(GL_FRAMEBUFFER_COMPLETE_EXT, StatusOf(framebuffer));
     framebuffer.detach(&texture, last);
     ExpectAttached(nullptr, GL_COLOR_ATTACHMENT0_EXT + last);
     framebuffer.detach(GL_TEXTURE_2D, GL_FRAMEBUFFER_EXT, 2);
     ExpectAttached(nullptr, GL_COLOR_ATTACHMENT0_EXT + 2);
-    framebuffer.attach(&texture, 1, 0); // a level without an image
-    EXPECT_EQ(GL_FRAMEBUFFER_INCOMPLETE_ATTACHMENT_EXT, StatusOf(framebuffer));
-    framebuffer.detach(&texture, 0);
 
     Texture2DArray layers(Texture::INTERNALFORMAT_RGBA8, 8, 4, 3, true);
     framebuffer.attach(&layers, 2, 1, 1);
