@@ -7,6 +7,7 @@
 #include <cfenv>
 #include <cmath>
 #include <cstdlib>
+#include <cstring>
 #include <iomanip>
 #include <random>
 #include <sstream>
@@ -22,13 +23,13 @@ half Half(unsigned bits) {
     return h;
 }
 
-std::uint32_t Bits(float f) {
+// Bits travel in floats only by memcpy: a signalling NaN passed by value may turn quiet.
+std::uint32_t Bits(float const &f) {
     std::uint32_t bits;
     std::memcpy(&bits, &f, sizeof bits);
     return bits;
 }
 
-// Bits travel in vectors of floats only by memcpy: a signalling NaN passed by value may turn quiet.
 void SetBits(float &f, std::uint32_t bits) {
     std::memcpy(&f, &bits, sizeof bits);
 }
@@ -75,8 +76,8 @@ TEST(Half, WidensAllValuesExactly) {
                                        ? (bits & 0x8000) << 16 | 0x7F800000 | (bits & 0x3FF) << 13
                                        : Bits(static_cast<float>(ValueOf(bits)));
         float const f[1] = {h};
-        ASSERT_EQ(std::memcmp(f, &wide, sizeof wide), 0) << bits;
-        ASSERT_EQ(std::memcmp(&row[bits], &wide, sizeof wide), 0) << bits;
+        ASSERT_EQ(Bits(f[0]), wide) << bits;
+        ASSERT_EQ(Bits(row[bits]), wide) << bits;
 
         double const size = special ? 0 : std::fabs(ValueOf(bits));
         bool const isNormal = size >= std::ldexp(1, -14);
@@ -183,7 +184,7 @@ TEST(HalfRow, TouchesNothingButTheRow) {
             bool const inside = i >= offset && i < offset + count;
             ASSERT_EQ(halves[i].bits(), inside ? half(floats[i]).bits() : 0x1234);
             float const expected = inside ? float(halves[i]) : 17.0f;
-            ASSERT_EQ(std::memcmp(&back[i], &expected, sizeof expected), 0);
+            ASSERT_EQ(Bits(back[i]), Bits(expected));
         }
     }
 }
