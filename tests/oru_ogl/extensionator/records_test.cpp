@@ -91,9 +91,9 @@ TEST(LibraryStart, HandsOptionsToNewContexts) {
 TEST(DeviceRecord, IsBuiltOnceForAllContextsOfADevice) {
     AutoInitializer library;
     oru_test::ContextCounter const created;
-    int const before = created.Made();
+    int const before = oru_test::ContextCounter::Made();
     ContextOffscreen first, second, third(&first);
-    EXPECT_EQ(4, created.Made() - before) << "one of them to build the record";
+    EXPECT_EQ(4, oru_test::ContextCounter::Made() - before) << "one of them to build the record";
     EXPECT_EQ(nullptr, ::wglGetCurrentContext());
 
     ExtensionManager *const record = ExtensionManager::Instance(first.displayDeviceKey());

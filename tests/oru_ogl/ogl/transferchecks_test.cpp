@@ -122,7 +122,7 @@ TEST_F(TransferChecksTest, PixelDataIsSizedByItsType) {
     char const bytes[] = "110220040000000000002";
     for (unsigned int i = 0; i <= Texture::TYPE_HALF_FLOAT; ++i) {
         auto const type = static_cast<Texture::Type>(i);
-        std::size_t const row = 16 * 4 * static_cast<std::size_t>(bytes[i] - '0');
+        std::size_t const row = 64 * static_cast<std::size_t>(bytes[i] - '0');
         if (row == 0) {
             EXPECT_FAILURE("pixelDataSize: Unknown type " +
                                std::string(ORUOGLTokenName(Texture::Type2GL(type))),

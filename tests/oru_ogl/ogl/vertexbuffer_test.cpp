@@ -37,7 +37,7 @@ VertexBuffer::AttributeType Type(unsigned int components) {
 
 /// What OpenGL gives the shader for an attribute of fewer components, and the untouched rest.
 Pixels Expected(Pixels const &values, unsigned int components, unsigned int vertices = kCount) {
-    Pixels pixels(4 * kCount, -1.f);
+    Pixels pixels(std::size_t{4} * kCount, -1.f);
     for (unsigned int i = 0; i < 4 * vertices; ++i) {
         unsigned int const component = i % 4;
         pixels[i] = component < components ? values[i / 4 * components + component]
@@ -48,7 +48,7 @@ Pixels Expected(Pixels const &values, unsigned int components, unsigned int vert
 }
 
 Pixels Values(unsigned int components, float first = 100.25f) {
-    Pixels values(kCount * components);
+    Pixels values(std::size_t{kCount} * components);
     std::iota(values.begin(), values.end(), first);
     return values;
 }
@@ -103,7 +103,7 @@ protected:
         buffer.drawPrimitives(count);
         program_->disable();
         EXPECT_EQ(0, Get(GL_VERTEX_ARRAY_BINDING));
-        Pixels pixels(4 * kCount);
+        Pixels pixels(std::size_t{4} * kCount);
         ORU_GL(ReadPixels, 0, 0, static_cast<GLsizei>(kCount), 1, GL_RGBA, GL_FLOAT, pixels.data());
         framebuffer.unbind();
         return pixels;
@@ -127,7 +127,7 @@ TEST_F(VertexBufferTest, DrawsFieldsOfEveryType) {
         EXPECT_EQ(Expected(values, components), drawn(buffer));
         buffer.marshallData(3);
         EXPECT_EQ(Expected(values, components, 2), drawn(buffer, 2));
-        EXPECT_EQ(Pixels(4 * kCount, -1.f), drawn(buffer, 0));
+        EXPECT_EQ(Pixels(std::size_t{4} * kCount, -1.f), drawn(buffer, 0));
     }
 }
 
