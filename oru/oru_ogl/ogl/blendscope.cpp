@@ -55,9 +55,10 @@ TemporaryBlendScope::~TemporaryBlendScope() {
 
 TemporaryAlphaBlendScope::TemporaryAlphaBlendScope() {
     // What the calls will set: when one of them fails, the base puts it back.
-    current_ = {true,         GL_ONE_MINUS_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA,
-                GL_SRC_ALPHA, GL_SRC_ALPHA,           GL_FUNC_ADD,
-                GL_FUNC_ADD};
+    current_.enabled = true;
+    current_.srcRGB = current_.srcAlpha = GL_SRC_ALPHA;
+    current_.dstRGB = current_.dstAlpha = GL_ONE_MINUS_SRC_ALPHA;
+    current_.equationRGB = current_.equationAlpha = GL_FUNC_ADD;
     ORU_GL(Enable, GL_BLEND);
     ORU_GL(BlendFunc, GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
     ORU_GL(BlendEquation, GL_FUNC_ADD);
