@@ -10,6 +10,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <atomic>
 #include <cstring>
 #include <stdexcept>
 #include <thread>
@@ -170,7 +171,7 @@ TEST_F(LibraryTest, CanBeTriedAgainAfterAFailure) {
 TEST_F(LibraryTest, OpensAndClosesAgainAndAgain) {
     CountingHooks hooks;
     EXPECT_EQ("bInitialized_", MessageOf([] { Library::Terminate(); }));
-    for (int i = 0; i < 50; ++i) {
+    for (int i = 0; i < 100; ++i) {
         AutoInitializer layer;
         EXPECT_EQ("!bInitialized_", Failure());
         EXPECT_FALSE(platforms().empty());
@@ -187,19 +188,38 @@ TEST_F(LibraryTest, OpensAndClosesAgainAndAgain) {
 }
 
 TEST_F(LibraryTest, OpensAndClosesFromManyThreads) {
-    // Every thread opens or finds it open, and closes or finds it closed.
-    auto const work = [] {
+    CountingHooks hooks;
+    auto const inThreads = [](auto work) {
+        std::vector<std::thread> threads;
+        for (int i = 0; i < 8; ++i)
+            threads.emplace_back(work);
+        for (std::thread &thread : threads)
+            thread.join();
+    };
+    auto const close = [] {
+        std::string const message = MessageOf([] { Library::Terminate(); });
+        EXPECT_TRUE(message.empty() || message == "bInitialized_") << message;
+        return message.empty();
+    };
+    // Every thread opens or finds it open; of those that close, one does.
+    std::atomic<int> closed{0};
+    for (int round = 1; round <= 10; ++round) {
+        inThreads([] {
+            Library::InitializeIfNecessary();
+            EXPECT_TRUE(Library::IsInitialized());
+        });
+        inThreads([&] { closed += close(); });
+        EXPECT_EQ(round, closed);
+    }
+    // Both at once.
+    inThreads([&] {
         for (int i = 0; i < 20; ++i) {
             Library::InitializeIfNecessary();
-            std::string const message = MessageOf([] { Library::Terminate(); });
-            EXPECT_TRUE(message.empty() || message == "bInitialized_") << message;
+            close();
         }
-    };
-    std::vector<std::thread> threads;
-    for (int i = 0; i < 8; ++i)
-        threads.emplace_back(work);
-    for (std::thread &thread : threads)
-        thread.join();
+    });
+    EXPECT_TRUE(hooks.outstanding().empty());
+    EXPECT_EQ(0, hooks.wrongReleases());
     EXPECT_FALSE(Library::IsInitialized());
     EXPECT_EQ(nullptr, ExtensionManager::instance());
 }
