@@ -30,7 +30,7 @@ def emit(folder, writer):
     write("extensions.inc", extension_rows(extensions), EXTENSIONS)
     write("devicepropertyenum.h", property_enum(properties), PROPERTIES)
     write("deviceproperty_rows.inc", property_rows(properties), PROPERTIES)
-    writer.write("tests/oru_ocl/runtime/entrypoints.inc", entry_points(entries),
+    writer.write("tests/support/oclruntime/entrypoints.inc", entry_points(entries),
                  f"catalogue/{ENTRY_POINTS} by emit_cl.py")
 
 

@@ -114,7 +114,7 @@ def loaders(catalogue):
     strings = "\n".join(f'    "{x.string}",' for x in catalogue.extensions)
     return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 
-#include "oru/oru_ogl/extensionator/catalogueogl.h"
+#include "oru/oru_ogl/extensionator/internal/catalogueogl.h"
 
 namespace ORU::OGL {{
 
@@ -184,7 +184,7 @@ def error_checker(entries):
         bodies.append(f"{entry.result} OpenGLErrorChecker::{entry.operation}({entry.full_declarations}) {{\n"
                       f"{lines}\n}}")
     return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
-#include "oru/oru_ogl/extensionator/openglerrorcheck.h"
+#include "oru/oru_ogl/extensionator/internal/openglerrorcheck.h"
 
 namespace ORU::OGL {{
 

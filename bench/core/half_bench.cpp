@@ -1,6 +1,6 @@
 // Conversion of half floats: rows by the library against the processor's bare loop, the class,
 // copying.
-#include "../comparison.h"
+#include "bench/comparison.h"
 
 #include "oru/core/math/halfrow.h"
 

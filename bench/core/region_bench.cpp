@@ -1,5 +1,5 @@
 // The cost of the operations of bounding regions, and what they allocate.
-#include "tests/allocationcount.h"
+#include "tests/support/allocationcount.h"
 
 #include "oru/core/math/region_2d/boundingrect.h"
 #include "oru/core/math/region_2d/boundingregion.h"

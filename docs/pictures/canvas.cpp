@@ -1,5 +1,5 @@
 // A picture in memory to draw the guide's pictures on, and its PNG files.
-#include "canvas.h"
+#include "docs/pictures/canvas.h"
 
 #include <png.h>
 

@@ -2,7 +2,7 @@
 //
 // region_pictures PHOTO FOLDER [--check]: writes them to FOLDER, or compares them with what is
 // there.
-#include "canvas.h"
+#include "docs/pictures/canvas.h"
 
 #include "oru/core/math/region_2d/boundingregion.h"
 

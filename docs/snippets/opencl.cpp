@@ -12,7 +12,7 @@
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/textureunit.h"
 #include "oru/oru_ogl/platformgl.h"
-#include "tests/oru_ocl/testruntime.h"
+#include "tests/support/testruntime.h"
 
 #include <gtest/gtest.h>
 

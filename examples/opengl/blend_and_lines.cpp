@@ -1,5 +1,5 @@
 // Blend and line scopes: state changed for a stretch of drawing, and put back by itself.
-#include "example.h"
+#include "examples/opengl/example.h"
 
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/blendscope.h"

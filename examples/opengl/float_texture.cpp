@@ -1,5 +1,5 @@
 // Computes light in a floating-point texture, reads the numbers back and exposes them like a photo.
-#include "example.h"
+#include "examples/opengl/example.h"
 
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"

@@ -1,5 +1,5 @@
 // Hello, offscreen: a triangle from a VertexBuffer, drawn without a window and saved as PNG.
-#include "example.h"
+#include "examples/opengl/example.h"
 
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"

@@ -1,5 +1,5 @@
 // Streams frames into a texture through two pixel buffers, and saves a contact sheet of them.
-#include "example.h"
+#include "examples/opengl/example.h"
 
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"

@@ -1,5 +1,5 @@
 // Shows a photo in a window: the mouse wheel zooms, Escape closes.
-#include "example.h"
+#include "examples/opengl/example.h"
 
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"

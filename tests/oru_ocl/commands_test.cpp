@@ -1,7 +1,7 @@
 // Programs, kernels, command queues and events.
 #include "oru/core/math/tvec2.h"
 #include "oru/core/math/tvec4.h"
-#include "tests/oru_ocl/computetest.h"
+#include "tests/support/computetest.h"
 
 #include <chrono>
 #include <set>

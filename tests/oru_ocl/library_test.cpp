@@ -3,9 +3,9 @@
 // runtime's folder.
 #include "oru/oru_ocl/contextocl.h"
 #include "oru/oru_ocl/extensionmanagerocl.h"
-#include "tests/countinghooks.h"
-#include "tests/messageof.h"
-#include "tests/oru_ocl/testruntime.h"
+#include "tests/support/countinghooks.h"
+#include "tests/support/failure.h"
+#include "tests/support/testruntime.h"
 
 #include <gtest/gtest.h>
 

@@ -2,7 +2,7 @@
 #include "oru/core/utility/integerrect.h"
 #include "oru/core/utility/scopedptr.h"
 #include "oru/oru_ocl/sampler.h"
-#include "tests/oru_ocl/computetest.h"
+#include "tests/support/computetest.h"
 
 #include <algorithm>
 #include <cstdint>

@@ -3,7 +3,7 @@
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"
-#include "tests/oru_ocl/computetest.h"
+#include "tests/support/computetest.h"
 
 using namespace ORU::OCL;
 using namespace oru_test;

@@ -34,6 +34,14 @@ namespace ORU_private {
     ((__VA_ARGS__) ? void(0)                                                                       \
                    : ::ORU_private::ThrowInternal(__FILE__, __LINE__, "Enforce " #__VA_ARGS__))
 
+/// As `ORU_ASSERT`, with the given text instead of the expression's: for a text that hosts know and
+/// that the code would no longer spell so. `text` is a literal.
+#define ORU_ASSERT_TEXT(text, ...)                                                                 \
+    ((__VA_ARGS__) ? void(0) : ::ORU_private::ThrowInternal(__FILE__, __LINE__, text))
+
+/// As `ORU_ENFORCE`, with the given text behind "Enforce ".
+#define ORU_ENFORCE_TEXT(text, ...) ORU_ASSERT_TEXT("Enforce " text, __VA_ARGS__)
+
 /// Throws `InternalException` with the call's source text when its HRESULT is negative.
 #define ORU_ASSERT_SUCCEEDED(...)                                                                  \
     ((__VA_ARGS__) >= 0 ? void(0) : ::ORU_private::ThrowInternal(__FILE__, __LINE__, #__VA_ARGS__))

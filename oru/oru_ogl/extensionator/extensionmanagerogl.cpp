@@ -3,8 +3,8 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/versionstring.h"
-#include "oru/oru_ogl/extensionator/catalogueogl.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/catalogueogl.h"
 #include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"

@@ -1,10 +1,10 @@
 // Finds out by drawing whether an implementation filters floating-point textures linearly.
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
-#include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -33,7 +33,7 @@ void DrawRectangle(GLfloat right, bool textured) {
         }
     } catch (...) {
         // The error checker is one for all contexts: left inside, it would check no call any more.
-        internal::DropExceptions([] { ORU_GL0(End); });
+        DropExceptions([] { ORU_GL0(End); });
         throw;
     }
     ORU_GL0(End);

@@ -2,7 +2,7 @@
 #include "oru/oru_ogl/extensionator/openglerrorchecker.h"
 
 #include "oru/oru_ogl/exceptionogl.h"
-#include "oru/oru_ogl/extensionator/openglerrorcheck.h"
+#include "oru/oru_ogl/extensionator/internal/openglerrorcheck.h"
 
 namespace ORU::OGL {
 

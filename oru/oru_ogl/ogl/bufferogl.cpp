@@ -3,10 +3,10 @@
 
 #include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/ending.h"
-#include "oru/oru_ogl/ogl/internal/release.h"
-#include "oru/oru_ogl/ogl/internal/supported.h"
-#include "oru/oru_ogl/ogl/internal/translation.h"
+#include "oru/oru_ogl/ogl/internal/objects/ending.h"
+#include "oru/oru_ogl/ogl/internal/objects/release.h"
+#include "oru/oru_ogl/ogl/internal/objects/supported.h"
+#include "oru/oru_ogl/ogl/internal/objects/translation.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {

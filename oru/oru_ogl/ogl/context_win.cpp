@@ -6,7 +6,7 @@
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/internalwindow.h"
 #include "oru/oru_ogl/ogl/context.h"
-#include "oru/oru_ogl/ogl/internal/temporarycontext_win.h"
+#include "oru/oru_ogl/ogl/internal/contexts/temporarycontext_win.h"
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 #include "oru/oru_ogl/platformgl.h"
 

@@ -2,8 +2,8 @@
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/internalwindow.h"
-#include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {
@@ -35,9 +35,9 @@ void ContextOffscreen::create(Context const *share) {
 }
 
 ContextOffscreen::~ContextOffscreen() {
-    internal::DropExceptions([this] { unregisterSharedContext(); });
-    internal::DropExceptions([this] { unregisterWithExtensionMgr(); });
-    internal::DropExceptions([this] { destroyContext(); });
+    DropExceptions([this] { unregisterSharedContext(); });
+    DropExceptions([this] { unregisterWithExtensionMgr(); });
+    DropExceptions([this] { destroyContext(); });
 }
 
 } // namespace ORU::OGL

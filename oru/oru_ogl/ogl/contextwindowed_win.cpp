@@ -2,8 +2,8 @@
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
-#include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {
@@ -16,9 +16,9 @@ ContextWindowed::ContextWindowed(HWND window, BufferFormat const &format, Buffer
 }
 
 ContextWindowed::~ContextWindowed() {
-    internal::DropExceptions([this] { unregisterSharedContext(); });
-    internal::DropExceptions([this] { unregisterWithExtensionMgr(); });
-    internal::DropExceptions([this] { destroyContext(); });
+    DropExceptions([this] { unregisterSharedContext(); });
+    DropExceptions([this] { unregisterWithExtensionMgr(); });
+    DropExceptions([this] { destroyContext(); });
 }
 
 void ContextWindowed::enableSyncToVerticalRetrace(bool enable) {

@@ -2,8 +2,8 @@
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
-#include "oru/oru_ogl/ogl/internal/dropexceptions.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {
@@ -38,7 +38,7 @@ DisplayDeviceKey ContextWrapped::DeviceOfCurrentContext() {
 }
 
 ContextWrapped::~ContextWrapped() {
-    internal::DropExceptions([this] { UnregisterShareContext(this); });
+    DropExceptions([this] { UnregisterShareContext(this); });
 }
 
 void ContextWrapped::makeCurrent() const {

@@ -2,7 +2,7 @@
 #include "oru/oru_ogl/ogl/pixelunpackparameters.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/supported.h"
+#include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {

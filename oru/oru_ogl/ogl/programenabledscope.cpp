@@ -2,7 +2,7 @@
 #include "oru/oru_ogl/ogl/programenabledscope.h"
 
 #include "oru/core/exceptions/checks.h"
-#include "oru/oru_ogl/ogl/internal/release.h"
+#include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/programogl.h"
 
 namespace ORU::OGL {

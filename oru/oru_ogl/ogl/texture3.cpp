@@ -2,9 +2,9 @@
 #include "oru/oru_ogl/ogl/texture3.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/imagetransfer.h"
-#include "oru/oru_ogl/ogl/internal/supported.h"
-#include "oru/oru_ogl/ogl/internal/texturestorage.h"
+#include "oru/oru_ogl/ogl/internal/objects/supported.h"
+#include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
+#include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {

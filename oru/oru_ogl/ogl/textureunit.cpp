@@ -2,7 +2,7 @@
 #include "oru/oru_ogl/ogl/textureunit.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/translation.h"
+#include "oru/oru_ogl/ogl/internal/objects/translation.h"
 #include "oru/oru_ogl/ogl/texture1.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"

@@ -1,5 +1,5 @@
 // The exceptions across the border of the library, their copies, and the texts of the checks.
-#include "tests/countinghooks.h"
+#include "tests/support/countinghooks.h"
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/math/region_2d/boundingrect.h"

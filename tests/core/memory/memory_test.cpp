@@ -1,6 +1,6 @@
 // The memory hooks, the owners that use them, and aligned memory.
-#include "tests/countinghooks.h"
-#include "tests/messageof.h"
+#include "tests/support/countinghooks.h"
+#include "tests/support/failure.h"
 
 #include "oru/core/memory/orumemoryprivate.h"
 #include "oru/core/utility/scopedptr.h"

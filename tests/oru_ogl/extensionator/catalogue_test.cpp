@@ -1,5 +1,5 @@
 // The catalogue: its order, its names, and the group loaders against what the driver exports.
-#include "../glfixture.h"
+#include "tests/support/glfixture.h"
 
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 

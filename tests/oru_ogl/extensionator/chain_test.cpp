@@ -1,6 +1,6 @@
 // The interceptor chain and the error checker at its end.
-#include "../glfixture.h"
-#include "tests/messageof.h"
+#include "tests/support/failure.h"
+#include "tests/support/glfixture.h"
 
 #include "oru/oru_ogl/exceptionogl.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"

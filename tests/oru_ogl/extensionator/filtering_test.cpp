@@ -1,6 +1,6 @@
 // The test by drawing of whether floating-point textures are filtered.
-#include "../contexts/testwindow.h"
-#include "../glfixture.h"
+#include "tests/support/glfixture.h"
+#include "tests/support/testwindow.h"
 
 #include "oru/core/exceptions/internalexception.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"

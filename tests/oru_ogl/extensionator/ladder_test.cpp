@@ -1,7 +1,7 @@
 // What a record reads from implementations that differ: the build runs this program under Mesa's
 // overrides. ORU_TEST_VERSION and ORU_TEST_VENDOR say what the record must find.
-#include "../glfixture.h"
-#include "tests/messageof.h"
+#include "tests/support/failure.h"
+#include "tests/support/glfixture.h"
 
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 

@@ -1,7 +1,7 @@
 // Where records come from: one per device, one per foreign context, none before the library is
 // open.
-#include "../contexts/testwindow.h"
-#include "../glfixture.h"
+#include "tests/support/glfixture.h"
+#include "tests/support/testwindow.h"
 
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"

@@ -1,7 +1,7 @@
 // The tracer's text and what it forwards, for every operation and many stream formats.
 #include "oru/oru_ogl/extensionator/opengltracer.h"
 
-#include "tests/allocationcount.h"
+#include "tests/support/allocationcount.h"
 
 #include "oru/oru_ogl/extensionator/openglforwarder.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"

@@ -1,5 +1,5 @@
 // Buffer objects: contents, targets, mapping, and what each operation refuses.
-#include "objecttest.h"
+#include "tests/support/objecttest.h"
 
 #include "oru/oru_ogl/ogl/bufferogl.h"
 

@@ -1,5 +1,5 @@
 // What the object classes say they support and refuse to make, under what Mesa is told to claim.
-#include "objecttest.h"
+#include "tests/support/objecttest.h"
 
 #include "oru/core/utility/versionstring.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"

@@ -1,5 +1,5 @@
 // Framebuffers and renderbuffers: attachments, completeness, bindings, and what they refuse.
-#include "objecttest.h"
+#include "tests/support/objecttest.h"
 
 #include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"

@@ -1,5 +1,5 @@
 // Objects and scopes whose context has gone: their ends find none, or another one.
-#include "texturekinds.h"
+#include "tests/support/texturekinds.h"
 
 #include "oru/oru_ogl/ogl/blendscope.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"

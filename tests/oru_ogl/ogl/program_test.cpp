@@ -1,5 +1,5 @@
 // Shaders and programs: their states, their logs, what they refuse.
-#include "objecttest.h"
+#include "tests/support/objecttest.h"
 
 #include "oru/oru_ogl/ogl/oruopengl.h"
 #include "oru/oru_ogl/ogl/programenabledscope.h"

@@ -1,5 +1,5 @@
 // The scopes of blend and line state: what they set, what they put back, and the calls they spare.
-#include "objecttest.h"
+#include "tests/support/objecttest.h"
 
 #include "oru/core/exceptions/internalexception.h"
 #include "oru/oru_ogl/exceptionogl.h"

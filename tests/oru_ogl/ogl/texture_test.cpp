@@ -1,5 +1,5 @@
 // Texture objects: construction of every kind, sizes, parameters and translations.
-#include "texturekinds.h"
+#include "tests/support/texturekinds.h"
 
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
 

@@ -1,6 +1,6 @@
 // What textures do on implementations that lack something; the build runs this program under
 // Mesa's overrides. What to expect is worked out from the texts that the implementation reports.
-#include "texturekinds.h"
+#include "tests/support/texturekinds.h"
 
 #include "oru/oru_ogl/ogl/texturestate.h"
 

@@ -1,5 +1,5 @@
 // Texture units, their state, and the scope that draws with one texture.
-#include "texturekinds.h"
+#include "tests/support/texturekinds.h"
 
 #include "oru/oru_ogl/ogl/texturebindscope.h"
 #include "oru/oru_ogl/ogl/texturestate.h"

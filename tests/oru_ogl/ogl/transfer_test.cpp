@@ -1,6 +1,6 @@
 // Image transfer: what goes into a texture comes out again, the whole image, for every client
 // layout and kind of texture.
-#include "texturekinds.h"
+#include "tests/support/texturekinds.h"
 
 #include "oru/core/utility/boundary.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"

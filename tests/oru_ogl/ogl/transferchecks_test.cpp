@@ -1,5 +1,5 @@
 // What the image transfers refuse, in which order and with which words.
-#include "texturekinds.h"
+#include "tests/support/texturekinds.h"
 
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
 

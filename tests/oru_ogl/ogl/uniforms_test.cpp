@@ -1,5 +1,5 @@
 // The uniform setters: every one in its four forms, read back from the program.
-#include "objecttest.h"
+#include "tests/support/objecttest.h"
 
 #include "oru/oru_ogl/ogl/internal/programimplcore.h"
 #include "oru/oru_ogl/ogl/programogl.h"

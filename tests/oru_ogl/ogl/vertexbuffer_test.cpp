@@ -1,5 +1,5 @@
 // Vertex buffers: fields of every type drawn and read back, copies, and what they refuse.
-#include "objecttest.h"
+#include "tests/support/objecttest.h"
 
 #include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/programogl.h"

@@ -1,7 +1,7 @@
 // The shader body that drives the entry points of OpenGL 2.0.
 #pragma once
 
-#include "oru/oru_ogl/ogl/internal/shaderimpl.h"
+#include "oru/oru_ogl/ogl/internal/programs/shaderimpl.h"
 #include "oru/oru_ogl/ogl/shader.h"
 
 namespace ORU::OGL {

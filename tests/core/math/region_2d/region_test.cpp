@@ -1,8 +1,8 @@
 // Bounding regions: special regions, infinities, NaNs, what the handle owns, laws over random
 // cases.
-#include "tests/allocationcount.h"
-#include "tests/countinghooks.h"
-#include "tests/messageof.h"
+#include "tests/support/allocationcount.h"
+#include "tests/support/countinghooks.h"
+#include "tests/support/failure.h"
 
 #include "oru/core/math/region_2d/boundingrect.h"
 #include "oru/core/math/region_2d/boundingregion.h"

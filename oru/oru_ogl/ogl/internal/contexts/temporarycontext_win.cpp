@@ -1,0 +1,42 @@
+// The short-lived context on which a pixel format is searched while no context is current.
+#include "oru/oru_ogl/ogl/internal/contexts/temporarycontext_win.h"
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/composetext.h"
+#include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/platformgl.h"
+
+namespace ORU::OGL::internal {
+
+TemporaryContext::~TemporaryContext() {
+    try {
+        release();
+    } catch (...) {
+        // A destructor has nobody to report to.
+    }
+}
+
+HDC TemporaryContext::makeWindow() {
+    window_ = MakeScoped(ORU_NEW InternalWindow(0, 0));
+    return deviceContext_ = ::GetDC(window_->hWnd());
+}
+
+void TemporaryContext::adopt(HGLRC context) {
+    renderContext_ = context;
+    if (!ORU_WGL(MakeCurrent, deviceContext_, renderContext_))
+        ORU_THROW_INTERNAL(
+            ComposeText("Context::can't make this context current", ::GetLastError()));
+}
+
+bool TemporaryContext::release() {
+    bool isDeleted = true;
+    if (renderContext_) {
+        ORU_WGL(MakeCurrent, nullptr, nullptr);
+        isDeleted = ORU_WGL(DeleteContext, renderContext_) != FALSE;
+        renderContext_ = nullptr;
+    }
+    window_.reset();
+    return isDeleted;
+}
+
+} // namespace ORU::OGL::internal

@@ -1,0 +1,43 @@
+// What the image transfers of all textures share: checks, bindings and client state.
+#include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
+
+#include "oru/core/utility/composetext.h"
+
+namespace ORU::OGL::internal {
+
+void ThrowPart(char const *operation, int level, std::initializer_list<Side> sides) {
+    for (Side const &side : sides) {
+        if (side.size == 0)
+            ORU_THROW_INTERNAL(
+                ComposeText("error ", operation, " ", side.padded, " of zero supplied"));
+    }
+    if (level < 0)
+        ORU_THROW_INTERNAL("a negative texture image mip-map level supplied");
+    for (Side const &side : sides) {
+        if (side.size > side.limit)
+            ORU_THROW_INTERNAL(ComposeText(side.name, "(", side.size, ") is greater than ",
+                                           side.padded, " of image (", side.limit, ") "));
+    }
+    ORU_ASSERT(!"A part that breaks no rule.");
+}
+
+void CheckBuffer(Buffer const *buffer) {
+    ORU_ENFORCE(buffer != NULL);
+    if (buffer->isMapped())
+        ORU_THROW_INTERNAL("Pixel Buffer Object cannot be memory mapped during data transfer");
+}
+
+void CheckUnpackBuffer(Buffer const *buffer, std::uint64_t offset) {
+    ORU_ENFORCE(buffer != NULL);
+    if (offset >= buffer->size())
+        ORU_THROW_INTERNAL(ComposeText(
+            "offset(", offset, ") is greater than pixel buffer object size", buffer->size()));
+    CheckBuffer(buffer);
+}
+
+void CheckByteAlignment(unsigned int bytes) {
+    if (bytes != 1 && bytes != 2 && bytes != 4 && bytes != 8)
+        ORU_THROW_INTERNAL("Invalid row byte alignment (must be of 1, 2, 4, or 8).");
+}
+
+} // namespace ORU::OGL::internal

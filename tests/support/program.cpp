@@ -1,0 +1,112 @@
+// Running a program from a test, and a folder for its files.
+#include "tests/support/program.h"
+
+#include "apps/common/unicode.h"
+
+#include <windows.h>
+
+#include <algorithm>
+#include <fstream>
+#include <iterator>
+#include <sstream>
+#include <system_error>
+
+namespace apps_test {
+
+namespace {
+
+namespace fs = std::filesystem;
+
+/// One argument as the C run-time of the program takes it apart again. (None here ends in a
+/// backslash or holds a quote.)
+std::wstring Quoted(fs::path const &argument) {
+    return L"\"" + argument.wstring() + L"\"";
+}
+
+/// A file that a child process may write to.
+class CaptureFile {
+public:
+    explicit CaptureFile(fs::path const &path) : path_(path) {
+        SECURITY_ATTRIBUTES inheritable = {sizeof inheritable, nullptr, TRUE};
+        handle_ = ::CreateFileW(path_.c_str(), GENERIC_WRITE, FILE_SHARE_READ, &inheritable,
+                                CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
+    }
+    ~CaptureFile() { ::CloseHandle(handle_); }
+    CaptureFile(CaptureFile const &) = delete;
+    CaptureFile &operator=(CaptureFile const &) = delete;
+
+    HANDLE handle() const { return handle_; }
+    std::string text() const {
+        std::ifstream file(path_, std::ios::binary);
+        return std::string(std::istreambuf_iterator<char>(file), {});
+    }
+
+private:
+    fs::path path_;
+    HANDLE handle_;
+};
+
+} // namespace
+
+std::vector<std::string> Outcome::errorLines() const {
+    std::vector<std::string> lines;
+    std::istringstream text(errors);
+    for (std::string line; std::getline(text, line);)
+        lines.push_back(line);
+    return lines;
+}
+
+fs::path ProgramFolder() {
+    wchar_t path[MAX_PATH];
+    ::GetModuleFileNameW(nullptr, path, MAX_PATH);
+    return fs::path(path).parent_path();
+}
+
+Outcome RunProgram(std::string const &name, std::vector<std::string> const &arguments,
+                   fs::path const &folder) {
+    TemporaryFolder const captures;
+    CaptureFile const output(captures.path() / "output");
+    CaptureFile const errors(captures.path() / "errors");
+
+    std::wstring command = Quoted(ProgramFolder() / name);
+    for (std::string const &argument : arguments)
+        command += L" " + Quoted(App::ToPath(argument));
+
+    STARTUPINFOW startup = {};
+    startup.cb = sizeof startup;
+    startup.dwFlags = STARTF_USESTDHANDLES;
+    startup.hStdOutput = output.handle();
+    startup.hStdError = errors.handle();
+    PROCESS_INFORMATION process = {};
+    if (!::CreateProcessW(nullptr, command.data(), nullptr, nullptr, TRUE, 0, nullptr,
+                          folder.c_str(), &startup, &process))
+        return Outcome();
+    ::WaitForSingleObject(process.hProcess, INFINITE);
+    DWORD exitCode = 0;
+    ::GetExitCodeProcess(process.hProcess, &exitCode);
+    ::CloseHandle(process.hThread);
+    ::CloseHandle(process.hProcess);
+    return {static_cast<int>(exitCode), output.text(), errors.text()};
+}
+
+TemporaryFolder::TemporaryFolder() {
+    static int sCount = 0;
+    path_ = fs::temp_directory_path() / ("oru_apps_" + std::to_string(::GetCurrentProcessId()) +
+                                         "_" + std::to_string(sCount++));
+    fs::create_directories(path_);
+}
+
+TemporaryFolder::~TemporaryFolder() {
+    std::error_code ignored;
+    fs::remove_all(path_, ignored);
+}
+
+std::vector<std::string> TemporaryFolder::list(std::string const &subfolder) const {
+    std::vector<std::string> names;
+    for (fs::directory_entry const &entry : fs::directory_iterator(path_ / subfolder))
+        names.push_back(App::ToText(entry.path().filename()));
+    std::sort(names.begin(), names.end());
+    return names;
+}
+
+} // namespace apps_test

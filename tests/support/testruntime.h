@@ -1,0 +1,40 @@
+// Loads the tests' own OpenCL runtime.
+#pragma once
+
+#include "oru/oru_ocl/ocllibrary.h"
+#include "tests/support/oclruntime/control.h"
+
+#include <string>
+
+#include <windows.h>
+
+namespace oru_test {
+
+/// One of the runtimes beside the test program, loaded for the rest of the process.
+class TestRuntime {
+public:
+    /// @param name the runtime's folder
+    explicit TestRuntime(std::string const &name) {
+        char program[MAX_PATH];
+        ::GetModuleFileNameA(nullptr, program, MAX_PATH);
+        std::string const path = program;
+        folder_ = path.substr(0, path.find_last_of('\\') + 1) + name + '\\';
+        HMODULE const module = ::LoadLibraryA((folder_ + "OpenCL.dll").c_str());
+        if (!module)
+            return;
+        auto const control = reinterpret_cast<RuntimeControlFunction>(
+            reinterpret_cast<void *>(::GetProcAddress(module, "OruTestRuntimeControl")));
+        control_ = control();
+    }
+
+    /// What `Library::IsOpenCLAvailable` takes.
+    std::string const &folder() const { return folder_; }
+
+    RuntimeControl const *operator->() const { return control_; }
+
+private:
+    std::string folder_;
+    RuntimeControl const *control_ = nullptr;
+};
+
+} // namespace oru_test
