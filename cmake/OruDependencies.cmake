@@ -14,6 +14,7 @@ function(oru_find_headers target file)
     target_include_directories(${target} SYSTEM INTERFACE "${${variable}}")
 endfunction()
 
+# Boost.Format composes the class names of the library's windows, which hosts see.
 oru_find_headers(deps::boost boost/format.hpp)
 oru_find_headers(deps::opencl CL/cl.h)
 

@@ -65,7 +65,5 @@ function(oru_add_benchmark name)
         target_link_libraries(${name} PRIVATE oru)
     endif()
     target_link_libraries(${name} PRIVATE ${arg_LIBRARIES} benchmark::benchmark_main)
-    set_target_properties(${name} PROPERTIES
-        RUNTIME_OUTPUT_DIRECTORY "${CMAKE_RUNTIME_OUTPUT_DIRECTORY}")
     set_property(GLOBAL APPEND PROPERTY ORU_BENCHMARKS ${name})
 endfunction()

@@ -14,8 +14,8 @@ std::string Measures(std::size_t width, std::size_t height) {
 } // namespace
 
 std::string Shape::description() const {
-    static char const *const sKinds[] = {"no channels", "grey", "grey and alpha", "RGB", "RGBA"};
-    return Measures(width, height) + ", " + sKinds[channels] + ", " +
+    static char const *const kKinds[] = {"no channels", "grey", "grey and alpha", "RGB", "RGBA"};
+    return Measures(width, height) + ", " + kKinds[channels] + ", " +
            std::to_string(bitsPerChannel) + " bit";
 }
 

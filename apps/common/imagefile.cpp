@@ -18,8 +18,6 @@ namespace {
 
 namespace fs = std::filesystem;
 
-constexpr std::size_t cSignatureBytes = 8;
-
 std::string ErrnoText() {
     return std::generic_category().message(errno);
 }
@@ -94,7 +92,7 @@ Image ReadImage(fs::path const &path, SizeLimit limit) {
     std::ifstream file = Open(path);
     std::vector<unsigned char> bytes;
     // The first bytes tell whether to read the rest, which may be long.
-    Append(file, bytes, cSignatureBytes);
+    Append(file, bytes, kPngSignatureBytes);
     if (bytes.empty())
         throw Failure("is empty");
     bool const png = IsPng(bytes);

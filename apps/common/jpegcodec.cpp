@@ -31,9 +31,9 @@ struct ErrorManager {
 
 /// Damage that the library fills with grey; its other warnings are about things that do no harm.
 bool IsDamage(int message) {
-    static constexpr int sDamage[] = {JWRN_ARITH_BAD_CODE, JWRN_HIT_MARKER, JWRN_HUFF_BAD_CODE,
+    static constexpr int kDamage[] = {JWRN_ARITH_BAD_CODE, JWRN_HIT_MARKER, JWRN_HUFF_BAD_CODE,
                                       JWRN_JPEG_EOF, JWRN_MUST_RESYNC};
-    return std::find(std::begin(sDamage), std::end(sDamage), message) != std::end(sDamage);
+    return std::find(std::begin(kDamage), std::end(kDamage), message) != std::end(kDamage);
 }
 
 void OnMessage(j_common_ptr codec, int level) {
@@ -83,8 +83,8 @@ private:
     }
 
     Orientation orientation() const {
-        Orientation found = cUpright;
-        for (auto const *marker = codec_.marker_list; marker && found == cUpright;
+        Orientation found = kUpright;
+        for (auto const *marker = codec_.marker_list; marker && found == kUpright;
              marker = marker->next)
             found = ReadOrientation(marker->data, marker->data_length);
         return found;

@@ -32,25 +32,25 @@ private:
 } // namespace
 
 Orientation ReadOrientation(unsigned char const *segment, std::size_t size) {
-    constexpr std::size_t cPrefix = 6; // "Exif" and two zeros
-    constexpr unsigned int cTag = 0x0112;
-    constexpr std::size_t cEntryBytes = 12;
-    if (size < cPrefix || std::memcmp(segment, "Exif\0", cPrefix) != 0)
-        return cUpright;
-    TiffReader const tiff(segment + cPrefix, size - cPrefix);
+    constexpr std::size_t kPrefix = 6; // "Exif" and two zeros
+    constexpr unsigned int kTag = 0x0112;
+    constexpr std::size_t kEntryBytes = 12;
+    if (size < kPrefix || std::memcmp(segment, "Exif\0", kPrefix) != 0)
+        return kUpright;
+    TiffReader const tiff(segment + kPrefix, size - kPrefix);
     std::size_t const directory = tiff.number(4, 4);
     std::size_t const entries = tiff.number(directory, 2);
     for (std::size_t i = 0; i < entries; ++i) {
-        std::size_t const entry = directory + 2 + i * cEntryBytes;
+        std::size_t const entry = directory + 2 + i * kEntryBytes;
         Orientation const orientation = tiff.number(entry + 8, 2);
-        if (tiff.number(entry, 2) == cTag && orientation >= 1 && orientation <= 8)
+        if (tiff.number(entry, 2) == kTag && orientation >= 1 && orientation <= 8)
             return orientation;
     }
-    return cUpright;
+    return kUpright;
 }
 
 Image Upright(Image const &image, Orientation orientation) {
-    if (orientation == cUpright)
+    if (orientation == kUpright)
         return image;
     auto const isOneOf = [orientation](std::initializer_list<Orientation> set) {
         return std::find(set.begin(), set.end(), orientation) != set.end();

@@ -10,7 +10,7 @@ namespace App {
 /// How a camera held a picture, by the numbers of the Exif tag Orientation (0x0112): 1 is upright,
 /// 2 to 4 are mirrored or upside down, 5 to 8 lie on a side.
 using Orientation = unsigned int;
-constexpr Orientation cUpright = 1;
+constexpr Orientation kUpright = 1;
 
 /// Reads the orientation from a JPEG's Exif segment (APP1, from "Exif" on).
 /// @return upright when the segment is of another kind, damaged or does not say

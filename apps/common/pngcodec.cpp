@@ -15,11 +15,9 @@ namespace App {
 
 namespace {
 
-constexpr std::size_t cSignatureBytes = 8;
-
 // Filtered photos have runs but hardly anything that repeats: the sample photos come out within 0.6
 // per cent of the size that zlib's default search gives, in a sixth of its time.
-constexpr int cCompressionStrategy = Z_RLE;
+constexpr int kCompressionStrategy = Z_RLE;
 
 void OnError(png_structp png, png_const_charp message) {
     static_cast<JumpGuard *>(png_get_error_ptr(png))->leave(message);
@@ -101,14 +99,14 @@ std::size_t BigEndian32(unsigned char const *bytes) {
 /// Checks the size in the header, where it has a fixed place, before libpng judges it in its own
 /// words and before memory is taken.
 void RequireUsableSize(std::vector<unsigned char> const &bytes, SizeLimit limit) {
-    constexpr std::size_t cWidthOffset = 16;
-    constexpr std::size_t cHeightOffset = 20;
-    constexpr std::size_t cHeaderEnd = 33;
-    if (bytes.size() < cHeaderEnd)
+    constexpr std::size_t kWidthOffset = 16;
+    constexpr std::size_t kHeightOffset = 20;
+    constexpr std::size_t kHeaderEnd = 33;
+    if (bytes.size() < kHeaderEnd)
         throw Failure("damaged PNG: the file is cut off");
     if (std::memcmp(bytes.data() + 12, "IHDR", 4) == 0)
-        limit.require(BigEndian32(bytes.data() + cWidthOffset),
-                      BigEndian32(bytes.data() + cHeightOffset));
+        limit.require(BigEndian32(bytes.data() + kWidthOffset),
+                      BigEndian32(bytes.data() + kHeightOffset));
 }
 
 std::vector<png_bytep> Rows(Image &image) {
@@ -121,7 +119,8 @@ std::vector<png_bytep> Rows(Image &image) {
 } // namespace
 
 bool IsPng(std::vector<unsigned char> const &bytes) {
-    return bytes.size() >= cSignatureBytes && png_sig_cmp(bytes.data(), 0, cSignatureBytes) == 0;
+    return bytes.size() >= kPngSignatureBytes &&
+           png_sig_cmp(bytes.data(), 0, kPngSignatureBytes) == 0;
 }
 
 Image DecodePng(std::vector<unsigned char> const &bytes, SizeLimit limit) {
@@ -148,17 +147,17 @@ Image DecodePng(std::vector<unsigned char> const &bytes, SizeLimit limit) {
 }
 
 std::vector<unsigned char> EncodePng(Image const &image) {
-    static constexpr int sColourTypes[] = {PNG_COLOR_TYPE_GRAY, PNG_COLOR_TYPE_GRAY_ALPHA,
+    static constexpr int kColourTypes[] = {PNG_COLOR_TYPE_GRAY, PNG_COLOR_TYPE_GRAY_ALPHA,
                                            PNG_COLOR_TYPE_RGB, PNG_COLOR_TYPE_RGB_ALPHA};
     Writer writer;
     png_structp const png = writer.png;
     png_infop const info = writer.info;
     bool const written = Guarded(writer.guard, [&] {
         png_set_write_fn(png, &writer, Writer::Write, nullptr);
-        png_set_compression_strategy(png, cCompressionStrategy);
+        png_set_compression_strategy(png, kCompressionStrategy);
         png_set_IHDR(png, info, static_cast<png_uint_32>(image.width),
                      static_cast<png_uint_32>(image.height), static_cast<int>(image.bitsPerChannel),
-                     sColourTypes[image.channels - 1], PNG_INTERLACE_NONE,
+                     kColourTypes[image.channels - 1], PNG_INTERLACE_NONE,
                      PNG_COMPRESSION_TYPE_DEFAULT, PNG_FILTER_TYPE_DEFAULT);
         png_write_info(png, info);
         if (image.bitsPerChannel == 16)

@@ -3,9 +3,13 @@
 
 #include "apps/common/image.h"
 
+#include <cstddef>
 #include <vector>
 
 namespace App {
+
+/// Bytes that tell a PNG, which is more than a JPEG needs.
+constexpr std::size_t kPngSignatureBytes = 8;
 
 /// Whether the bytes begin as a PNG does.
 bool IsPng(std::vector<unsigned char> const &bytes);

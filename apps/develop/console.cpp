@@ -13,8 +13,8 @@ namespace Develop {
 
 namespace {
 
-constexpr std::size_t cBarCells = 24;
-constexpr std::size_t cNameBytes = 40;
+constexpr std::size_t kBarCells = 24;
+constexpr std::size_t kNameBytes = 40;
 
 /// ORU_TERMINAL tells of a terminal behind the pipe that a script put between.
 bool HasTerminal() {
@@ -40,9 +40,9 @@ void Write(std::FILE *file, std::string const &text) {
 
 /// The end of a name that is too long for a line, cut between characters of UTF-8.
 std::string Shortened(std::string const &name) {
-    if (name.size() <= cNameBytes)
+    if (name.size() <= kNameBytes)
         return name;
-    std::size_t begin = name.size() - cNameBytes;
+    std::size_t begin = name.size() - kNameBytes;
     while (begin < name.size() && (static_cast<unsigned char>(name[begin]) & 0xC0u) == 0x80u)
         ++begin;
     return "..." + name.substr(begin);
@@ -77,8 +77,8 @@ void Console::progress(std::size_t done, std::size_t total, std::string const &c
     if (!hasBar_ || total < 2)
         return;
     clearBar();
-    std::size_t const filled = cBarCells * done / total;
-    bar_ = "[" + std::string(filled, '#') + std::string(cBarCells - filled, '.') + "] " +
+    std::size_t const filled = kBarCells * done / total;
+    bar_ = "[" + std::string(filled, '#') + std::string(kBarCells - filled, '.') + "] " +
            std::to_string(done) + "/" + std::to_string(total) + " " + Shortened(current);
     drawBar();
 }

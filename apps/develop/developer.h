@@ -2,6 +2,7 @@
 #pragma once
 
 #include "apps/common/image.h"
+#include "apps/develop/areas.h"
 #include "apps/develop/pass.h"
 #include "apps/develop/sharpener.h"
 #include "apps/develop/spotpainter.h"
@@ -23,7 +24,7 @@ struct Recipe {
 /// Takes a picture, or the part of it that is to be developed, through the stages, one after the
 /// other:
 ///
-///     developer.upload(photo, Frame(photo.width, photo.height), recipe);
+///     developer.upload(photo, WholePicture(photo));
 ///     developer.sharpen(recipe);
 ///     developer.develop(recipe);
 ///     Image const result = developer.readBack();
@@ -35,17 +36,17 @@ public:
     /// @param sharpener how to sharpen; null when no recipe will ask for it
     explicit Developer(std::unique_ptr<Sharpener> sharpener);
 
-    /// Takes as much of a picture to the GPU as developing an area needs.
-    /// @param area not empty, within the picture
-    void upload(App::Image const &photo, ORU::IntegerRect const &area, Recipe const &recipe);
+    /// Takes the source area of a picture to the GPU.
+    /// @param areas not empty, within the picture
+    void upload(App::Image const &photo, Areas const &areas);
 
     /// Decodes to linear light and sharpens, if the recipe asks for it.
     void sharpen(Recipe const &recipe);
 
-    /// Computes the area's developed pixels.
+    /// Computes the developed pixels of the target area.
     void develop(Recipe const &recipe);
 
-    /// The developed area, of the same kind as the picture.
+    /// The developed target area, of the same kind as the picture.
     App::Image readBack();
 
 private:
@@ -55,9 +56,8 @@ private:
     CoverPass decodeAndEncode_;
     SpotPainter spotPainter_;
 
-    App::Shape shape_;        ///< of the area
-    ORU::IntegerRect area_;   ///< in the picture
-    ORU::IntegerRect source_; ///< the uploaded part of the picture
+    App::Shape shape_; ///< of the target area
+    Areas areas_;
     std::unique_ptr<ORU::OGL::Texture2D> photo_;
     std::unique_ptr<ORU::OGL::Texture2D> light_; ///< sharpened; null without sharpening
     std::unique_ptr<ORU::OGL::Texture2D> developed_;

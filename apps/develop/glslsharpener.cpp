@@ -1,10 +1,10 @@
 // Sharpening by OpenGL itself.
 #include "apps/develop/glslsharpener.h"
 
-#include "apps/develop/boundtexture.h"
 #include "apps/develop/gaussian.h"
 #include "apps/develop/pixelformat.h"
 #include "apps/develop/shaders.h"
+#include "apps/develop/texturescope.h"
 
 #include "oru/oru_ogl/ogl/programenabledscope.h"
 
@@ -28,7 +28,7 @@ void SetBlur(Program &program, std::vector<float> const &weights) {
 } // namespace
 
 GlslSharpener::GlslSharpener(std::string const &reason)
-    : reason_(reason), blurRows_(cBlurRowsShader), sharpenColumns_(cSharpenColumnsShader) {}
+    : reason_(reason), blurRows_(kBlurRowsShader), sharpenColumns_(kSharpenColumnsShader) {}
 
 void GlslSharpener::sharpen(std::unique_ptr<Texture2D> &light, std::size_t channels,
                             Sharpening const &sharpening) {
@@ -37,7 +37,7 @@ void GlslSharpener::sharpen(std::unique_ptr<Texture2D> &light, std::size_t chann
     {
         ProgramEnabledScope const enabled(&blurRows_.program());
         SetBlur(blurRows_.program(), weights);
-        BoundTexture const source(*light);
+        TextureScope const source(*light);
         blurRows_.draw(*rows);
     }
     auto sharpened = TextureLike(*light);
@@ -49,8 +49,8 @@ void GlslSharpener::sharpen(std::unique_ptr<Texture2D> &light, std::size_t chann
         program.setUniform("amount", static_cast<float>(sharpening.amount));
         program.setUniformSampler2D("light", 0);
         program.setUniformSampler2D("rows", 1);
-        BoundTexture const original(*light, 0);
-        BoundTexture const blurred(*rows, 1);
+        TextureScope const original(*light, 0);
+        TextureScope const blurred(*rows, 1);
         sharpenColumns_.draw(*sharpened);
     }
     light = std::move(sharpened); // a pass cannot write what it reads

@@ -4,14 +4,14 @@
 namespace Develop {
 
 // The sums are those of the GLSL passes, tap by tap.
-char const *const cSharpenKernels = R"(
-constant sampler_t cTexel = CLK_NORMALIZED_COORDS_FALSE | CLK_ADDRESS_CLAMP_TO_EDGE |
+char const *const kSharpenKernels = R"(
+constant sampler_t kTexel = CLK_NORMALIZED_COORDS_FALSE | CLK_ADDRESS_CLAMP_TO_EDGE |
                             CLK_FILTER_NEAREST;
 
 kernel void loadTexture(read_only image2d_t texture, global float4 *light, int2 size) {
     int2 p = (int2)(get_global_id(0), get_global_id(1));
     if (p.x < size.x && p.y < size.y)
-        light[p.y * size.x + p.x] = read_imagef(texture, cTexel, p);
+        light[p.y * size.x + p.x] = read_imagef(texture, kTexel, p);
 }
 
 kernel void storeTexture(write_only image2d_t texture, global float4 const *light, int2 size) {

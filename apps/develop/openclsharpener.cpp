@@ -2,11 +2,11 @@
 #include "apps/develop/openclsharpener.h"
 
 #include "apps/common/failure.h"
-#include "apps/develop/boundtexture.h"
 #include "apps/develop/gaussian.h"
 #include "apps/develop/openclkernels.h"
 #include "apps/develop/pixelformat.h"
 #include "apps/develop/shaders.h"
+#include "apps/develop/texturescope.h"
 
 #include "oru/core/math/tvec2.h"
 #include "oru/oru_ocl/exceptionocl.h"
@@ -33,7 +33,7 @@ OCL::ContextProperties PropertiesFor(OpenCLDevice const &device, ORU::OGL::Conte
 
 /// The program with all kernels, built for a device.
 OCL::Program BuildKernels(OCL::Context const &context, OCL::Device const &device) {
-    OCL::Program program(context, cSharpenKernels);
+    OCL::Program program(context, kSharpenKernels);
     try {
         program.build(std::string());
     } catch (OCL::ExceptionOCL const &) {
@@ -45,14 +45,14 @@ OCL::Program BuildKernels(OCL::Context const &context, OCL::Device const &device
 }
 
 // Work items of a group.
-constexpr std::size_t cGroup[2] = {16, 4};
+constexpr std::size_t kGroup[2] = {16, 4};
 
 } // namespace
 
 struct OpenCLSharpener::Work {
     Work(OCL::Context const &context, Texture2D const &texture, std::size_t channels,
          Sharpening const &sharpening)
-        : width(texture.width(0)), height(texture.height(0)), bytes(width * height * cLightBytes),
+        : width(texture.width(0)), height(texture.height(0)), bytes(width * height * kLightBytes),
           amount(static_cast<float>(sharpening.amount)), colours(ColourMask(channels)),
           hostWeights(GaussianWeights(sharpening.sigma)),
           light(context, OCL::Memory::MEMORY_READ_WRITE, false, bytes),
@@ -106,12 +106,12 @@ void OpenCLSharpener::sharpenShared(Texture2D &light, Work &work) {
 
 void OpenCLSharpener::sharpenCopy(Texture2D &light, Work &work) {
     host_.resize(work.bytes / sizeof(float));
-    BoundTexture const bound(light);
-    light.getPixelData(host_.data(), 0, cLightFormat.layout, cLightFormat.type, 1);
+    TextureScope const bound(light);
+    light.getPixelData(host_.data(), 0, kLightFormat.layout, kLightFormat.type, 1);
     queue_.enqueueBlockingWrite(work.light, 0, work.bytes, host_.data());
     sharpenBuffer(work);
     queue_.enqueueBlockingRead(work.light, 0, work.bytes, host_.data());
-    light.subImage(0, 0, 0, work.width, work.height, cLightFormat.layout, cLightFormat.type,
+    light.subImage(0, 0, 0, work.width, work.height, kLightFormat.layout, kLightFormat.type,
                    host_.data(), ORU::OGL::PixelUnpackParameters());
 }
 
@@ -138,8 +138,8 @@ void OpenCLSharpener::launch(OCL::Kernel &kernel, Work const &work, First const 
         return (size + group - 1) / group * group;
     };
     queue_.enqueueKernel(kernel,
-                         OCL::Range<2>(whole(work.width, cGroup[0]), whole(work.height, cGroup[1])),
-                         OCL::Range<2>(cGroup[0], cGroup[1]), 0);
+                         OCL::Range<2>(whole(work.width, kGroup[0]), whole(work.height, kGroup[1])),
+                         OCL::Range<2>(kGroup[0], kGroup[1]), 0);
 }
 
 } // namespace Develop

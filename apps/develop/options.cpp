@@ -1,6 +1,8 @@
 // What the command line of develop asks for.
 #include "apps/develop/options.h"
 
+#include "apps/common/number.h"
+
 #include <CLI/CLI.hpp>
 
 #include <sstream>
@@ -9,17 +11,15 @@ namespace Develop {
 
 namespace {
 
-constexpr int cUsageError = 2;
+constexpr int kUsageError = 2;
 
 /// A check that a number lies between two others. (CLI::Range lets through what is no number.)
 CLI::Validator Between(double least, double most) {
     return CLI::Validator(
         [=](std::string const &text) {
-            double value = 0;
-            bool const good =
-                CLI::detail::lexical_cast(text, value) && value >= least && value <= most;
+            std::optional<double> const value = App::ParseNumber(text);
             std::ostringstream complaint;
-            if (!good)
+            if (!value || *value < least || *value > most)
                 complaint << "'" << text << "' is not a number from " << least << " to " << most;
             return complaint.str();
         },
@@ -86,7 +86,7 @@ std::optional<Options> ParseOptions(std::vector<std::string> const &arguments, i
         exitCode = app.exit(helpOrVersion);
     } catch (CLI::ParseError const &mistake) {
         std::cerr << "develop: " << mistake.what() << " (--help shows what there is)\n";
-        exitCode = cUsageError;
+        exitCode = kUsageError;
     }
     return std::nullopt;
 }

@@ -16,11 +16,11 @@ namespace {
 
 /// One triangle that covers everything.
 VertexBuffer MakeCover() {
-    static constexpr float sCorners[3][2] = {{-1, -1}, {3, -1}, {-1, 3}};
+    static constexpr float kCorners[3][2] = {{-1, -1}, {3, -1}, {-1, 3}};
     VertexBuffer cover(
         {{"position", VertexBuffer::ATTRIBUTETYPE_FLOAT2, VertexBuffer::EXPECTEDUSAGE_STATIC_DRAW}},
         3, VertexBuffer::PRIMITIVETYPE_TRIANGLES);
-    cover.setField("position", reinterpret_cast<unsigned char const *>(sCorners), false, 0, 0);
+    cover.setField("position", reinterpret_cast<unsigned char const *>(kCorners), false, 0, 0);
     return cover;
 }
 
@@ -50,7 +50,7 @@ void Pass::draw(Texture2D &target, VertexBuffer &vertices, bool cleared) {
 }
 
 CoverPass::CoverPass(std::string const &fragmentShader)
-    : Pass(cCoverVertexShader, fragmentShader), cover_(MakeCover()) {
+    : Pass(kCoverVertexShader, fragmentShader), cover_(MakeCover()) {
     cover_.setupWithProgram(&program());
     cover_.marshallData();
 }

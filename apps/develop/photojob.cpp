@@ -15,9 +15,9 @@ using ORU::IntegerRect;
 
 namespace {
 
-App::Image DevelopArea(Developer &developer, App::Image const &photo, IntegerRect const &area,
-                       Recipe const &recipe, StageTimes &times) {
-    times.measure("upload", [&] { developer.upload(photo, area, recipe); });
+App::Image DevelopAreas(Developer &developer, App::Image const &photo, Areas const &areas,
+                        Recipe const &recipe, StageTimes &times) {
+    times.measure("upload", [&] { developer.upload(photo, areas); });
     if (recipe.sharpening.isOn())
         times.measure("sharpen", [&] { developer.sharpen(recipe); });
     times.measure("develop", [&] { developer.develop(recipe); });
@@ -52,8 +52,7 @@ ReportLines PhotoJob::run(std::filesystem::path const &input, std::filesystem::p
     App::Image const photo = times.measure("decode", [&] { return App::ReadImage(input, limit_); });
     App::Image developed;
     if (base_.empty()) {
-        developed =
-            DevelopArea(developer_, photo, Frame(photo.width, photo.height), recipe_, times);
+        developed = DevelopAreas(developer_, photo, WholePicture(photo), recipe_, times);
     } else {
         App::Image base = times.measure("read base", [&] { return readBase(photo); });
         developed = times.measure("local edit",
@@ -78,16 +77,15 @@ App::Image PhotoJob::readBase(App::Shape const &photo) const {
 }
 
 App::Image PhotoJob::developLocally(App::Image const &photo, App::Image base, ReportLines &report) {
-    IntegerRect const frame = Frame(photo.width, photo.height);
-    IntegerRect const area = PixelsAround(RegionOf(recipe_.spots), 0, frame);
+    Areas const areas = AreasOfSpots(recipe_.spots, recipe_.sharpening, photo);
     StageTimes local(withReport_);
-    if (!area.isEmpty())
-        Paste(DevelopArea(developer_, photo, area, recipe_, local), area, base);
+    if (!areas.target.isEmpty())
+        Paste(DevelopAreas(developer_, photo, areas, recipe_, local), areas.target, base);
     if (withReport_) {
         // The full frame is developed for the comparison's sake alone.
         StageTimes full(true);
-        DevelopArea(developer_, photo, frame, recipe_, full);
-        report.push_back("pixels processed: " + Percent(area, photo) + ", in " +
+        DevelopAreas(developer_, photo, WholePicture(photo), recipe_, full);
+        report.push_back("pixels processed: " + Percent(areas.target, photo) + ", in " +
                          Milliseconds(local.total()) + "; the full frame takes " +
                          Milliseconds(full.total()));
     }

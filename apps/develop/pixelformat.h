@@ -19,11 +19,11 @@ struct PixelFormat {
 
 /// Linear light of every kind of picture. Four channels of floats are what every OpenGL draws into
 /// and every OpenCL shares.
-constexpr PixelFormat cLightFormat = {ORU::OGL::Texture::INTERNALFORMAT_RGBA32F_ARB,
+constexpr PixelFormat kLightFormat = {ORU::OGL::Texture::INTERNALFORMAT_RGBA32F_ARB,
                                       ORU::OGL::Texture::FORMAT_RGBA,
                                       ORU::OGL::Texture::TYPE_FLOAT};
 
 /// Bytes of a pixel of linear light.
-constexpr std::size_t cLightBytes = 4 * sizeof(float);
+constexpr std::size_t kLightBytes = 4 * sizeof(float);
 
 } // namespace Develop

@@ -6,7 +6,7 @@
 
 namespace Develop {
 
-char const *const cCoverVertexShader = R"(
+char const *const kCoverVertexShader = R"(
 in vec2 position;
 
 void main() {
@@ -19,7 +19,7 @@ namespace {
 // The transfer functions are those of IEC 61966-2-1. Drivers compute pow by approximations of
 // different quality, so one step of Newton's method follows it: on z^5 = t^12, and on y^12 = x^5.
 // The value is rounded here, not by the driver's conversion to the texture's format.
-char const *const cDevelopSource = R"(
+char const *const kDevelopSource = R"(
 uniform sampler2D source;
 uniform ivec2 offset; // of the target's first pixel in the source
 uniform vec4 colours; // 1 for channels that hold colours, 0 for alpha
@@ -89,10 +89,10 @@ void main() {
 std::string DevelopShader(Steps steps) {
     std::string const decode = steps != Steps::Encode ? "#define DECODE\n" : "";
     std::string const encode = steps != Steps::Decode ? "#define ENCODE\n" : "";
-    return decode + encode + cDevelopSource;
+    return decode + encode + kDevelopSource;
 }
 
-char const *const cBlurRowsShader = R"(
+char const *const kBlurRowsShader = R"(
 uniform sampler2D source;
 uniform int taps;
 uniform float weights[61];
@@ -110,7 +110,7 @@ void main() {
 }
 )";
 
-char const *const cSharpenColumnsShader = R"(
+char const *const kSharpenColumnsShader = R"(
 uniform sampler2D light;
 uniform sampler2D rows; // light, its rows blurred
 uniform int taps;
@@ -134,7 +134,7 @@ void main() {
 
 // Attributes as whole pixels and a rest: differences from pixel centres then stay exact far from
 // the origin. Flat, since interpolation would not keep even equal values exact.
-char const *const cSpotVertexShader = R"(
+char const *const kSpotVertexShader = R"(
 in vec2 position;
 in vec4 centre; // whole pixels, and the rest
 in vec2 spot;   // radius in pixels, stops
@@ -149,7 +149,7 @@ void main() {
 }
 )";
 
-char const *const cSpotShader = R"(
+char const *const kSpotShader = R"(
 uniform ivec2 offset; // of the target's first pixel in the picture
 
 flat in vec4 spotCentre;

@@ -12,7 +12,7 @@ class Program;
 namespace Develop {
 
 /// Vertices whose attribute `position` is in clip coordinates.
-extern char const *const cCoverVertexShader;
+extern char const *const kCoverVertexShader;
 
 /// What a developing pass does.
 enum class Steps { Decode, Encode, DecodeAndEncode };
@@ -21,12 +21,12 @@ enum class Steps { Decode, Encode, DecodeAndEncode };
 std::string DevelopShader(Steps steps);
 
 /// Unsharp mask, first and second pass.
-extern char const *const cBlurRowsShader;
-extern char const *const cSharpenColumnsShader;
+extern char const *const kBlurRowsShader;
+extern char const *const kSharpenColumnsShader;
 
 /// The exposure that a spot adds at each pixel.
-extern char const *const cSpotVertexShader;
-extern char const *const cSpotShader;
+extern char const *const kSpotVertexShader;
+extern char const *const kSpotShader;
 
 /// The first line of a shader for the current context.
 std::string ShadingLanguageLine();

@@ -26,7 +26,7 @@ public:
     Sharpener &operator=(Sharpener const &) = delete;
 
     /// Sharpens a texture of linear light, or puts a sharpened one in its place.
-    /// @param light of the format cLightFormat, not bound
+    /// @param light of the format kLightFormat, not bound
     /// @param channels of the picture that it holds, which tells where alpha is
     virtual void sharpen(std::unique_ptr<ORU::OGL::Texture2D> &light, std::size_t channels,
                          Sharpening const &sharpening) = 0;

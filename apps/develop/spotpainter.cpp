@@ -31,7 +31,7 @@ public:
     }
 };
 
-constexpr std::size_t cCorners = 6; // two triangles
+constexpr std::size_t kCorners = 6; // two triangles
 
 /// The vertices of all spots, field by field.
 struct SpotVertices {
@@ -44,7 +44,7 @@ struct SpotVertices {
 };
 
 void SpotVertices::append(Spot const &s, ORU::IntegerRect const &area) {
-    static constexpr int sSides[cCorners][2] = {{-1, -1}, {1, -1}, {1, 1},
+    static constexpr int kSides[kCorners][2] = {{-1, -1}, {1, -1}, {1, 1},
                                                 {-1, -1}, {1, 1},  {-1, 1}};
     // One pixel more, where the spot adds nothing, so that rounding loses none at the edge.
     double const reach = s.radius + 1;
@@ -53,7 +53,7 @@ void SpotVertices::append(Spot const &s, ORU::IntegerRect const &area) {
     auto const clip = [](double coordinate, int first, std::size_t size) {
         return static_cast<float>(2 * (coordinate - first) / static_cast<double>(size) - 1);
     };
-    for (auto const &side : sSides) {
+    for (auto const &side : kSides) {
         position.push_back({clip(s.x + side[0] * reach, area.offset().x, area.width()),
                             clip(s.y + side[1] * reach, area.offset().y, area.height())});
         centre.push_back({static_cast<float>(wholeX), static_cast<float>(wholeY),
@@ -63,10 +63,10 @@ void SpotVertices::append(Spot const &s, ORU::IntegerRect const &area) {
 }
 
 VertexBuffer SpotVertices::makeBuffer() const {
-    auto const usage = VertexBuffer::EXPECTEDUSAGE_STREAM_DRAW;
-    VertexBuffer buffer({{"position", VertexBuffer::ATTRIBUTETYPE_FLOAT2, usage},
-                         {"centre", VertexBuffer::ATTRIBUTETYPE_FLOAT4, usage},
-                         {"spot", VertexBuffer::ATTRIBUTETYPE_FLOAT2, usage}},
+    constexpr auto kUsage = VertexBuffer::EXPECTEDUSAGE_STREAM_DRAW;
+    VertexBuffer buffer({{"position", VertexBuffer::ATTRIBUTETYPE_FLOAT2, kUsage},
+                         {"centre", VertexBuffer::ATTRIBUTETYPE_FLOAT4, kUsage},
+                         {"spot", VertexBuffer::ATTRIBUTETYPE_FLOAT2, kUsage}},
                         static_cast<unsigned int>(position.size()),
                         VertexBuffer::PRIMITIVETYPE_TRIANGLES);
     auto const set = [&buffer](char const *name, auto const &values) {
@@ -80,7 +80,7 @@ VertexBuffer SpotVertices::makeBuffer() const {
 
 } // namespace
 
-SpotPainter::SpotPainter() : pass_(cSpotVertexShader, cSpotShader) {}
+SpotPainter::SpotPainter() : pass_(kSpotVertexShader, kSpotShader) {}
 
 std::unique_ptr<Texture2D> SpotPainter::paint(std::vector<Spot> const &spots,
                                               ORU::IntegerRect const &area) {
@@ -88,6 +88,8 @@ std::unique_ptr<Texture2D> SpotPainter::paint(std::vector<Spot> const &spots,
     for (Spot const &spot : spots)
         if (spot.changesSomething())
             vertices.append(spot, area);
+    if (vertices.position.empty())
+        return nullptr;
     VertexBuffer buffer = vertices.makeBuffer();
     buffer.setupWithProgram(&pass_.program());
     buffer.marshallData();

@@ -4,6 +4,7 @@
 #include "apps/develop/pass.h"
 #include "apps/develop/spots.h"
 
+#include "oru/core/utility/integerrect.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 
 #include <memory>
@@ -16,7 +17,8 @@ class SpotPainter {
 public:
     SpotPainter();
 
-    /// Makes a texture of the stops that spots add to the pixels of an area of the picture.
+    /// Makes a texture of the stops that spots add to the pixels of an area of the picture; null
+    /// when none of them changes anything.
     std::unique_ptr<ORU::OGL::Texture2D> paint(std::vector<Spot> const &spots,
                                                ORU::IntegerRect const &area);
 

@@ -2,9 +2,7 @@
 #pragma once
 
 #include "oru/core/math/region_2d/boundingregion.h"
-#include "oru/core/utility/integerrect.h"
 
-#include <cstddef>
 #include <filesystem>
 #include <vector>
 
@@ -28,12 +26,5 @@ std::vector<Spot> ReadSpots(std::filesystem::path const &path);
 
 /// Where spots can change a picture.
 ORU::BoundingRegion RegionOf(std::vector<Spot> const &spots);
-
-/// The whole of a picture.
-ORU::IntegerRect Frame(std::size_t width, std::size_t height);
-
-/// The pixels of a frame within `reach` pixels of a region.
-ORU::IntegerRect PixelsAround(ORU::BoundingRegion region, std::size_t reach,
-                              ORU::IntegerRect const &frame);
 
 } // namespace Develop

@@ -57,7 +57,7 @@ struct Named {
     void (*apply)(BoundingRegionBase &region, BoundingRegionBase const &other);
 };
 
-Named const operations[] = {
+Named const kOperations[] = {
     {"IncludePoint", [](auto &region, auto const &) { region.include(Vec(9, 9)); }},
     {"Include", [](auto &region, auto const &other) { region.include(other); }},
     {"Contains",
@@ -88,14 +88,14 @@ BENCHMARK_TEMPLATE(Copy, BoundingRegion);
 
 template<class Region, class Other>
 void Register(std::string const &kinds) {
-    for (Named const &operation : operations)
+    for (Named const &operation : kOperations)
         benchmark::RegisterBenchmark((kinds + "/" + operation.name).c_str(),
                                      [&operation](benchmark::State &state) {
                                          Measure<Region, Other>(state, operation.apply);
                                      });
 }
 
-[[maybe_unused]] bool const registered = [] {
+[[maybe_unused]] bool const gRegistered = [] {
     Register<BoundingRect, BoundingRect>("RectRect");
     Register<BoundingRect, BoundingRegion>("RectHandle");
     Register<BoundingRegion, BoundingRegion>("HandleHandle");

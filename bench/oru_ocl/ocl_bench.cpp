@@ -21,8 +21,8 @@ using oru_bench::Seconds;
 
 namespace {
 
-char const *const source = "kernel void nothing(global int *data, float4 v) { data[0] = 1; }";
-std::size_t const largest = std::size_t(64) << 20;
+char const *const kSource = "kernel void nothing(global int *data, float4 v) { data[0] = 1; }";
+std::size_t const kLargest = std::size_t(64) << 20;
 
 /// The same objects three times over: the layer's, which own them, the bindings', and handles.
 struct World {
@@ -30,9 +30,9 @@ struct World {
     OCL::Device device = OCL::platforms().front().devices(OCL::Device::TYPE_ALL).front();
     OCL::Context context{OCL::ContextProperties(OCL::platforms().front()), device};
     OCL::CommandQueue queue{context, device, false, false};
-    OCL::Buffer buffer{context, OCL::Memory::MEMORY_READ_WRITE, false, largest};
+    OCL::Buffer buffer{context, OCL::Memory::MEMORY_READ_WRITE, false, kLargest};
     OCL::Kernel kernel = Build(context);
-    std::vector<char> host = std::vector<char>(largest);
+    std::vector<char> host = std::vector<char>(kLargest);
 
     cl::CommandQueue hppQueue{queue.id(), true};
     cl::Buffer hppBuffer{buffer.id(), true};
@@ -44,7 +44,7 @@ struct World {
     }
 
     static OCL::Kernel Build(OCL::Context const &context) {
-        OCL::Program program(context, source);
+        OCL::Program program(context, kSource);
         program.build("");
         return program.kernel("nothing");
     }
@@ -115,43 +115,32 @@ struct SetArguments {
     World &world = TheWorld();
 };
 
-template<std::size_t Size>
-struct Write {
-    void raw() const {
-        cl_event event;
-        if (clEnqueueWriteBuffer(world.queue.id(), world.buffer.id(), CL_TRUE, 0, Size,
-                                 world.host.data(), 0, nullptr, &event) != CL_SUCCESS)
-            std::abort();
-        clReleaseEvent(event);
-    }
-    void bindings() const {
-        cl::Event event;
-        world.hppQueue.enqueueWriteBuffer(world.hppBuffer, CL_TRUE, 0, Size, world.host.data(),
-                                          nullptr, &event);
-    }
-    void oru() const { world.queue.enqueueBlockingWrite(world.buffer, 0, Size, world.host.data()); }
-
-    World &world = TheWorld();
-};
-
-template<std::size_t Size>
-struct Read {
-    void raw() const {
-        cl_event event;
-        if (clEnqueueReadBuffer(world.queue.id(), world.buffer.id(), CL_TRUE, 0, Size,
-                                world.host.data(), 0, nullptr, &event) != CL_SUCCESS)
-            std::abort();
-        clReleaseEvent(event);
-    }
-    void bindings() const {
-        cl::Event event;
-        world.hppQueue.enqueueReadBuffer(world.hppBuffer, CL_TRUE, 0, Size, world.host.data(),
-                                         nullptr, &event);
-    }
-    void oru() const { world.queue.enqueueBlockingRead(world.buffer, 0, Size, world.host.data()); }
-
-    World &world = TheWorld();
-};
+/// A blocking transfer of `Size` bytes in one direction.
+#define ORU_TRANSFER(Direction)                                                                    \
+    template<std::size_t Size>                                                                     \
+    struct Direction {                                                                             \
+        void raw() const {                                                                         \
+            cl_event event;                                                                        \
+            if (clEnqueue##Direction##Buffer(world.queue.id(), world.buffer.id(), CL_TRUE, 0,      \
+                                             Size, world.host.data(), 0, nullptr,                  \
+                                             &event) != CL_SUCCESS)                                \
+                std::abort();                                                                      \
+            clReleaseEvent(event);                                                                 \
+        }                                                                                          \
+        void bindings() const {                                                                    \
+            cl::Event event;                                                                       \
+            world.hppQueue.enqueue##Direction##Buffer(world.hppBuffer, CL_TRUE, 0, Size,           \
+                                                      world.host.data(), nullptr, &event);         \
+        }                                                                                          \
+        void oru() const {                                                                         \
+            world.queue.enqueueBlocking##Direction(world.buffer, 0, Size, world.host.data());      \
+        }                                                                                          \
+                                                                                                   \
+        World &world = TheWorld();                                                                 \
+    };
+ORU_TRANSFER(Write)
+ORU_TRANSFER(Read)
+#undef ORU_TRANSFER
 
 template<class Command>
 void OverCalls(benchmark::State &state) {
@@ -177,7 +166,7 @@ ORU_OCL_BENCHMARK(100, 400, Launch);
 ORU_OCL_BENCHMARK(1000, 400, SetArguments);
 ORU_OCL_BENCHMARK(200, 300, Write<4096>);
 ORU_OCL_BENCHMARK(200, 300, Read<4096>);
-ORU_OCL_BENCHMARK(1, 60, Write<largest>);
-ORU_OCL_BENCHMARK(1, 60, Read<largest>);
+ORU_OCL_BENCHMARK(1, 60, Write<kLargest>);
+ORU_OCL_BENCHMARK(1, 60, Read<kLargest>);
 
 } // namespace

@@ -1,7 +1,8 @@
 // A picture in memory to draw the guide's pictures on, and its PNG files.
 #include "docs/pictures/canvas.h"
 
-#include <png.h>
+#include "apps/common/failure.h"
+#include "apps/common/imagefile.h"
 
 #include <cmath>
 #include <cstring>
@@ -11,11 +12,16 @@ namespace guide {
 
 namespace {
 
-png_image NewImage() {
-    png_image image;
-    std::memset(&image, 0, sizeof image);
-    image.version = PNG_IMAGE_VERSION;
-    return image;
+constexpr std::size_t kMaxSide = 10000; ///< of a picture that is read
+
+/// Runs a piece of work on a file; what fails is told with the file's name.
+template<class Work>
+void WithFile(std::string const &path, Work work) {
+    try {
+        work();
+    } catch (App::Failure const &failure) {
+        throw std::runtime_error(path + ": " + failure.what());
+    }
 }
 
 } // namespace
@@ -25,23 +31,21 @@ Canvas::Canvas(int width, int height, Colour const &colour)
       pixels_(static_cast<std::size_t>(width) * static_cast<std::size_t>(height), colour) {}
 
 Canvas Canvas::Read(std::string const &path) {
-    png_image image = NewImage();
-    if (!png_image_begin_read_from_file(&image, path.c_str()))
-        throw std::runtime_error(path + ": " + image.message);
-    image.format = PNG_FORMAT_RGB;
+    App::Image image;
+    WithFile(path, [&] {
+        image = App::ReadImage(path, {kMaxSide});
+        if (image.channels != 3 || image.bitsPerChannel != 8)
+            throw App::Failure("is " + image.description() + ", not RGB, 8 bit");
+    });
     Canvas canvas(static_cast<int>(image.width), static_cast<int>(image.height), Colour{});
-    if (!png_image_finish_read(&image, nullptr, canvas.pixels_.data(), 0, nullptr))
-        throw std::runtime_error(path + ": " + image.message);
+    std::memcpy(canvas.pixels_.data(), image.pixels.data(), image.pixels.size());
     return canvas;
 }
 
 void Canvas::write(std::string const &path) const {
-    png_image image = NewImage();
-    image.width = static_cast<png_uint_32>(width_);
-    image.height = static_cast<png_uint_32>(height_);
-    image.format = PNG_FORMAT_RGB;
-    if (!png_image_write_to_file(&image, path.c_str(), 0, pixels_.data(), 0, nullptr))
-        throw std::runtime_error(path + ": " + image.message);
+    App::Image image({static_cast<std::size_t>(width_), static_cast<std::size_t>(height_), 3, 8});
+    std::memcpy(image.pixels.data(), pixels_.data(), image.pixels.size());
+    WithFile(path, [&] { App::WriteImage(path, image); });
 }
 
 Canvas Canvas::part(int x, int y, int width, int height) const {
@@ -61,7 +65,7 @@ void Canvas::paste(Canvas const &source, int x, int y) {
 void Canvas::fill(ORU::BoundingRegionBase const &region, Colour const &colour, float share) {
     for (int y = 0; y < height_; ++y)
         for (int x = 0; x < width_; ++x)
-            if (region.contains(Point(static_cast<float>(x) + 0.5f, static_cast<float>(y) + 0.5f)))
+            if (region.contains(PixelCentre(x, y)))
                 at(x, y) = Mixed(at(x, y), colour, share);
 }
 
@@ -73,7 +77,7 @@ void Canvas::outline(ORU::BoundingRect const &rect, Colour const &colour, int th
     fill(rect, colour, 1);
     for (int y = 0; y < height_; ++y)
         for (int x = 0; x < width_; ++x)
-            if (inside.contains(Point(static_cast<float>(x) + 0.5f, static_cast<float>(y) + 0.5f)))
+            if (inside.contains(PixelCentre(x, y)))
                 at(x, y) = before.at(x, y);
 }
 

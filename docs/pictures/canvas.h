@@ -19,12 +19,17 @@ inline std::size_t Index(int x, int y, int width) {
            static_cast<std::size_t>(x);
 }
 
+/// The centre of pixel (x, y).
+inline Point PixelCentre(int x, int y) {
+    return Point(static_cast<float>(x) + 0.5f, static_cast<float>(y) + 0.5f);
+}
+
 /// An 8-bit RGB picture.
 class Canvas {
 public:
     Canvas(int width, int height, Colour const &colour);
 
-    /// @throws std::runtime_error when the file is no readable PNG
+    /// @throws std::runtime_error when the file is no readable picture of this kind
     static Canvas Read(std::string const &path);
 
     /// @throws std::runtime_error when the file cannot be written

@@ -19,15 +19,17 @@ using ORU::BoundingRect;
 
 namespace {
 
-Colour const white{255, 255, 255};
-Colour const blue{40, 110, 230};
-Colour const orange{240, 140, 20};
-Colour const green{20, 160, 70};
-Colour const magenta{220, 40, 160};
+Colour const kWhite{255, 255, 255};
+Colour const kBlue{40, 110, 230};
+Colour const kOrange{240, 140, 20};
+Colour const kGreen{20, 160, 70};
+Colour const kMagenta{220, 40, 160};
 
-int const blurRadius = 24;
+constexpr int kBlurRadius = 24;
+constexpr int kGap = 12; ///< between the panels of a picture
 
-/// The sums of the (2 * blurRadius + 1)^2 pixels around each pixel, border pixels repeated outside.
+/// The sums of the (2 * kBlurRadius + 1)^2 pixels around each pixel, border pixels repeated
+/// outside.
 class BlurSums {
 public:
     explicit BlurSums(Canvas const &source) : width_(source.width()) {
@@ -49,7 +51,7 @@ public:
     Sum const &at(int x, int y) const { return sums_[guide::Index(x, y, width_)]; }
 
     Colour colour(int x, int y) const {
-        int const count = (2 * blurRadius + 1) * (2 * blurRadius + 1);
+        int const count = (2 * kBlurRadius + 1) * (2 * kBlurRadius + 1);
         Colour result;
         for (std::size_t i = 0; i < 3; ++i)
             result[i] = static_cast<std::uint8_t>((at(x, y)[i] + count / 2) / count);
@@ -69,12 +71,12 @@ private:
                 for (std::size_t i = 0; i < 3; ++i)
                     sum[i] += sign * v[i];
             };
-            for (int position = -blurRadius; position < blurRadius; ++position)
+            for (int position = -kBlurRadius; position < kBlurRadius; ++position)
                 add(position, 1);
             for (int position = 0; position < length; ++position) {
-                add(position + blurRadius, 1);
+                add(position + kBlurRadius, 1);
                 result.push_back(sum);
-                add(position - blurRadius, -1);
+                add(position - kBlurRadius, -1);
             }
         }
         return result;
@@ -84,65 +86,78 @@ private:
     std::vector<Sum> sums_;
 };
 
-/// A photo with a disc made brighter, blurred: what the edit changes, and what must be read.
-Canvas FilterPicture(Canvas const &photo) {
-    Canvas const before = photo.part(100, 0, 300, 300);
-    Point const centre(226, 104);
-    float const radius = 52;
-    BoundingRect changed(centre, centre);
-    changed.outset(Point(radius, radius));
-
-    Canvas edited = before;
-    for (int y = 0; y < edited.height(); ++y)
-        for (int x = 0; x < edited.width(); ++x) {
-            float const dx = static_cast<float>(x) + 0.5f - centre.x;
-            float const dy = static_cast<float>(y) + 0.5f - centre.y;
+/// A picture with a disc made brighter.
+Canvas Brightened(Canvas picture, Point const &centre, float radius) {
+    for (int y = 0; y < picture.height(); ++y)
+        for (int x = 0; x < picture.width(); ++x) {
+            Point const p = guide::PixelCentre(x, y);
+            float const dx = p.x - centre.x;
+            float const dy = p.y - centre.y;
             if (dx * dx + dy * dy < radius * radius)
-                edited.at(x, y) = Mixed(edited.at(x, y), white, 0.4f);
+                picture.at(x, y) = Mixed(picture.at(x, y), kWhite, 0.4f);
         }
+    return picture;
+}
 
-    BoundingRect const frame(Point(0, 0), Point(300, 300));
-    Point const reach(blurRadius, blurRadius);
-    BoundingRect compute = changed;
-    compute.outset(reach);
-    compute.intersect(frame);
-    BoundingRect read = compute;
-    read.outset(reach);
-    read.intersect(frame);
-
+/// The blur of a picture, in magenta where it is not that of the picture before the edit.
+/// @param changed receives the pixels that are not
+Canvas Blurred(Canvas const &before, Canvas const &edited, BoundingRect &changed) {
     BlurSums const sumsBefore(before);
     BlurSums const sumsAfter(edited);
-    Canvas blurred = before;
-    BoundingRect exact;
+    Canvas blurred = edited;
     for (int y = 0; y < blurred.height(); ++y)
         for (int x = 0; x < blurred.width(); ++x) {
             blurred.at(x, y) = sumsAfter.colour(x, y);
             if (sumsBefore.at(x, y) == sumsAfter.at(x, y))
                 continue;
-            blurred.at(x, y) = Mixed(blurred.at(x, y), magenta, 0.35f);
+            blurred.at(x, y) = Mixed(blurred.at(x, y), kMagenta, 0.35f);
             auto const left = static_cast<float>(x);
             auto const top = static_cast<float>(y);
-            exact.include(BoundingRect(Point(left, top), Point(left + 1, top + 1)));
+            changed.include(BoundingRect(Point(left, top), Point(left + 1, top + 1)));
         }
+    return blurred;
+}
+
+/// A picture faded outside a rectangle.
+Canvas FadedAround(BoundingRect const &rect, Canvas picture) {
+    for (int y = 0; y < picture.height(); ++y)
+        for (int x = 0; x < picture.width(); ++x)
+            if (!rect.contains(guide::PixelCentre(x, y)))
+                picture.at(x, y) = Mixed(picture.at(x, y), kWhite, 0.7f);
+    return picture;
+}
+
+/// A photo with a disc made brighter, blurred: what the edit changes, and what must be read.
+Canvas FilterPicture(Canvas const &photo) {
+    constexpr int kSide = 300;
+    BoundingRect const frame(Point(0, 0), Point(kSide, kSide));
+    auto const widened = [&frame](BoundingRect rect) {
+        rect.outset(Point(kBlurRadius, kBlurRadius));
+        rect.intersect(frame);
+        return rect;
+    };
+    Point const centre(226, 104);
+    float const radius = 52;
+    BoundingRect changed(centre, centre);
+    changed.outset(Point(radius, radius));
+    BoundingRect const compute = widened(changed);
+    BoundingRect const read = widened(compute);
+
+    Canvas const before = photo.part(100, 0, kSide, kSide);
+    Canvas const edited = Brightened(before, centre, radius);
+    BoundingRect exact;
+    Canvas panels[] = {edited, Blurred(before, edited, exact), FadedAround(read, edited)};
     if (exact != compute)
         throw std::runtime_error("the blur changed " + exact.toString() + "instead of " +
                                  compute.toString());
-
-    Canvas reading = edited;
-    for (int y = 0; y < reading.height(); ++y)
-        for (int x = 0; x < reading.width(); ++x)
-            if (!read.contains(Point(static_cast<float>(x) + 0.5f, static_cast<float>(y) + 0.5f)))
-                reading.at(x, y) = Mixed(reading.at(x, y), white, 0.7f);
-
-    Canvas panels[] = {edited, blurred, reading};
-    panels[0].outline(changed, blue, 2);
-    panels[1].outline(changed, blue, 2);
-    panels[1].outline(compute, orange, 2);
-    panels[2].outline(compute, orange, 2);
-    panels[2].outline(read, green, 2);
-    Canvas picture(3 * 300 + 2 * 12, 300, white);
+    panels[0].outline(changed, kBlue, 2);
+    panels[1].outline(changed, kBlue, 2);
+    panels[1].outline(compute, kOrange, 2);
+    panels[2].outline(compute, kOrange, 2);
+    panels[2].outline(read, kGreen, 2);
+    Canvas picture(3 * kSide + 2 * kGap, kSide, kWhite);
     for (int i = 0; i < 3; ++i)
-        picture.paste(panels[i], i * 312, 0);
+        picture.paste(panels[i], i * (kSide + kGap), 0);
     return picture;
 }
 
@@ -178,20 +193,20 @@ Canvas OperationsPicture() {
         {small, footprint, drawn(180, 115), [](auto &a, auto const &b) { a.dilate(b); }},
         {large, footprint, drawn(190, 113), [](auto &a, auto const &b) { a.erode(b); }},
     };
-    int const panelWidth = 250;
-    int const panelHeight = 160;
-    Canvas picture(3 * panelWidth + 2 * 12, 2 * panelHeight + 12, white);
+    constexpr int kPanelWidth = 250;
+    constexpr int kPanelHeight = 160;
+    Canvas picture(3 * kPanelWidth + 2 * kGap, 2 * kPanelHeight + kGap, kWhite);
     int i = 0;
     for (Operation const &operation : operations) {
-        Canvas panel(panelWidth, panelHeight, Colour{244, 244, 246});
+        Canvas panel(kPanelWidth, kPanelHeight, Colour{244, 244, 246});
         BoundingRect result = operation.a;
         operation.apply(result, operation.b);
-        panel.fill(operation.a, blue, 0.3f);
-        panel.fill(operation.drawnB, orange, 0.3f);
-        panel.outline(operation.a, blue, 2);
-        panel.outline(operation.drawnB, orange, 2);
-        panel.outline(result, green, 4);
-        picture.paste(panel, i % 3 * (panelWidth + 12), i / 3 * (panelHeight + 12));
+        panel.fill(operation.a, kBlue, 0.3f);
+        panel.fill(operation.drawnB, kOrange, 0.3f);
+        panel.outline(operation.a, kBlue, 2);
+        panel.outline(operation.drawnB, kOrange, 2);
+        panel.outline(result, kGreen, 4);
+        picture.paste(panel, i % 3 * (kPanelWidth + kGap), i / 3 * (kPanelHeight + kGap));
         ++i;
     }
     return picture;
@@ -207,13 +222,13 @@ void WriteOrCheck(Canvas const &picture, std::string const &path, bool checks) {
 } // namespace
 
 int main(int argc, char **argv) {
-    if (argc < 3) {
+    bool const checks = argc == 4 && argv[3] == std::string("--check");
+    if (argc != 3 && !checks) {
         std::cerr << "usage: region_pictures PHOTO FOLDER [--check]\n";
         return 2;
     }
     try {
         std::string const folder = argv[2];
-        bool const checks = argc > 3;
         WriteOrCheck(FilterPicture(Canvas::Read(argv[1])), folder + "/regions-filter.png", checks);
         WriteOrCheck(OperationsPicture(), folder + "/regions-operations.png", checks);
     } catch (std::exception const &failure) {

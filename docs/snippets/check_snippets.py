@@ -1,12 +1,11 @@
 #!/usr/bin/env python3
 """Checks that the code of the guide is the code that the tests compile and run.
 
-Usage: check_snippets.py [--update] CHAPTER.md...
-
 A comment <!-- snippet: FILE#NAME --> in a chapter stands before a block of code. FILE lies beside this
 script and holds the same text between two lines "// [NAME]". A block of C++ without such a comment is an
-error, so is a snippet that no chapter shows. --update writes the blocks anew.
+error, so is a snippet that no chapter shows.
 """
+import argparse
 import pathlib
 import re
 import sys
@@ -35,11 +34,13 @@ def snippets(file):
     return found
 
 
-def main(arguments):
-    update = "--update" in arguments
+def main():
+    parser = argparse.ArgumentParser(description=__doc__, formatter_class=argparse.RawDescriptionHelpFormatter)
+    parser.add_argument("--update", action="store_true", help="write the blocks of the chapters anew")
+    parser.add_argument("chapters", nargs="+", type=pathlib.Path, metavar="CHAPTER.md")
+    arguments = parser.parse_args()
     sources, shown, problems = {}, set(), []
-    chapters = [pathlib.Path(a) for a in arguments if a != "--update"]
-    for chapter in chapters:
+    for chapter in arguments.chapters:
         text = chapter.read_text(encoding="utf-8")
 
         def checked(block):
@@ -53,12 +54,12 @@ def main(arguments):
                 problems.append(f"{chapter.name}: {file} has no [{name}]")
                 return block[0]
             shown.add((file, name))
-            if code != sources[file][name] and not update:
+            if code != sources[file][name] and not arguments.update:
                 problems.append(f"{chapter.name}: {name} differs from {file}; --update mends that")
             return f"<!-- snippet: {file}#{name} -->\n```cpp\n{sources[file][name]}```"
 
         new = BLOCK.sub(checked, text)
-        if update and new != text:
+        if arguments.update and new != text:
             chapter.write_text(new, encoding="utf-8")
     for file, found in sources.items():
         problems += [f"{file}: no chapter shows [{n}]" for n in found if (file, n) not in shown]
@@ -67,4 +68,4 @@ def main(arguments):
     sys.exit("\n".join(problems) or None)
 
 
-main(sys.argv[1:])
+main()

@@ -124,7 +124,7 @@ TEST_F(OpenCLGuide, ShowsTheBuildLog) {
     try {
         program.build("");
     } catch (ExceptionOCL const &failure) {
-        // OCL Exception: CL_BUILD_PROGRAM_FAILURE oru/oru_ocl/programocl.cpp:60 ()
+        // OCL Exception: CL_BUILD_PROGRAM_FAILURE oru/oru_ocl/programocl.cpp:LINE ()
         std::cerr << failure << '\n' << program.buildLog(device);
     }
     // [log]

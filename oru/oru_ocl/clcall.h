@@ -13,9 +13,9 @@ namespace ORU::OCL {
 /// The function table.
 /// @throws InternalException "table_ != 0" when the layer is not initialised
 inline FunctionTable const &Table() {
-    FunctionTable const *const table_ = ExtensionManager::currentTable();
-    ORU_ASSERT(table_ != 0);
-    return *table_;
+    FunctionTable const *const table = ExtensionManager::currentTable();
+    ORU_ASSERT_TEXT("table_ != 0", table);
+    return *table;
 }
 
 /// Throws `ExceptionOCL` with an empty message.
@@ -63,9 +63,9 @@ private:
 template<class Result, class... Parameters>
 auto MakeCheckedCall(Result(CL_API_CALL *function)(Parameters...), char const *file,
                      unsigned int line) {
-    constexpr std::size_t count =
+    constexpr std::size_t kCount =
         sizeof...(Parameters) - (ReportsByArgument<Result, Parameters...> ? 1 : 0);
-    return CheckedCall<decltype(function), std::make_index_sequence<count>>{function, file, line};
+    return CheckedCall<decltype(function), std::make_index_sequence<kCount>>{function, file, line};
 }
 
 } // namespace ORU::OCL

@@ -18,9 +18,8 @@ void Device::getInfoImpl(Enum::DeviceProperty property, std::size_t size, void *
 }
 
 std::string Device::getStringInfo(Enum::DeviceProperty property) const {
-    // clang-format off
-    ORU_ASSERT(GetPropertyTypeName(property) == Enum::GetTypeName<char*>());
-    // clang-format on
+    ORU_ASSERT_TEXT("GetPropertyTypeName(property) == Enum::GetTypeName<char*>()",
+                    Enum::GetPropertyTypeName(property) == Enum::GetTypeName<char *>());
     std::string text =
         QueryCharacters([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
             getInfoImpl(property, bytes, value, bytesReturned);

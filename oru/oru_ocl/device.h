@@ -56,9 +56,8 @@ public:
         if constexpr (std::is_same_v<T, std::string>) {
             return getStringInfo(property);
         } else {
-            std::string const &property_typename = Enum::GetPropertyTypeName(property);
-            std::string const &type_name = Enum::GetTypeName<T>();
-            ORU_ASSERT(property_typename == type_name);
+            ORU_ASSERT_TEXT("property_typename == type_name",
+                            Enum::GetPropertyTypeName(property) == Enum::GetTypeName<T>());
             T value;
             getInfoImpl(property, sizeof(T), &value, nullptr);
             return value;

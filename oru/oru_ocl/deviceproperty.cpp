@@ -17,16 +17,16 @@ struct Slot {
     std::string type;
 };
 
-constexpr std::size_t firstProperty = Enum::DEVICEPROPERTY_TYPE;
-constexpr std::size_t table_size = Enum::DEVICEPROPERTY_OPENCL_C_VERSION - firstProperty + 1;
+constexpr std::size_t kFirstProperty = Enum::DEVICEPROPERTY_TYPE;
+constexpr std::size_t kTableSize = Enum::DEVICEPROPERTY_OPENCL_C_VERSION - kFirstProperty + 1;
 
-Slot sTable_[table_size];
+Slot gTable[kTableSize];
 
 Slot &SlotOf(Enum::DeviceProperty property) {
     // A value below the first wraps to a large index.
-    std::size_t const property_index = static_cast<std::size_t>(property) - firstProperty;
-    ORU_ASSERT(property_index < table_size);
-    return sTable_[property_index];
+    std::size_t const index = static_cast<std::size_t>(property) - kFirstProperty;
+    ORU_ASSERT_TEXT("property_index < table_size", index < kTableSize);
+    return gTable[index];
 }
 
 #define ORU_CL_DEVICE_PROPERTY(Property, Constant, Type)                                           \

@@ -39,7 +39,7 @@ private:
     /// Takes over the caller's reference.
     explicit Event(cl_event event) : OpenCLObjectWrapper(event) {}
 
-    /// Adds a reference of its own.
+    /// Adds a reference of its own; has its place in the binary interface.
     Event(cl_event event, add_ref_tag const &tag) : OpenCLObjectWrapper(event, tag) {}
 };
 

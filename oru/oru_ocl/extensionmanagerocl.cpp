@@ -7,6 +7,7 @@
 #include "oru/oru_ocl/extensionmanagerocl.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/tokenize.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -31,32 +32,33 @@ struct Slot {
     std::size_t offset;
 };
 
-constexpr Slot slots[] = {
+constexpr Slot kSlots[] = {
 #define ORU_CL_SLOT(Extension, Name) {Enum::Extension, #Name, offsetof(FunctionTable, Name)},
 #include "oru/oru_ocl/functiontable_slots.inc"
 };
 
-static_assert(sizeof(FunctionTable) == std::size(slots) * sizeof(FARPROC));
+static_assert(sizeof(FunctionTable) == std::size(kSlots) * sizeof(FARPROC));
 
 /// The extensions' names; an extension's value is its index.
-constexpr char const *extensionNames[] = {
+constexpr char const *kExtensionNames[] = {
 #define ORU_CL_EXTENSION(Extension, Name) #Name,
 #include "oru/oru_ocl/extensions.inc"
 };
 
 #define ORU_CL_EXTENSION(Extension, Name)                                                          \
-    static_assert(std::string_view(extensionNames[Enum::Extension]) == #Name);
+    static_assert(std::string_view(kExtensionNames[Enum::Extension]) == #Name);
 #include "oru/oru_ocl/extensions.inc"
 
 bool IsExtension(Enum::Extension extension) {
-    return static_cast<std::size_t>(extension) < std::size(extensionNames);
+    return static_cast<std::size_t>(extension) < std::size(kExtensionNames);
 }
 
 Enum::Extension ExtensionOf(std::string_view name) {
-    auto const *const found = std::find(std::begin(extensionNames), std::end(extensionNames), name);
-    return found == std::end(extensionNames)
+    auto const *const found =
+        std::find(std::begin(kExtensionNames), std::end(kExtensionNames), name);
+    return found == std::end(kExtensionNames)
                ? Enum::EXTENSION_UNKNOWN
-               : static_cast<Enum::Extension>(found - std::begin(extensionNames));
+               : static_cast<Enum::Extension>(found - std::begin(kExtensionNames));
 }
 
 struct Version {
@@ -121,11 +123,11 @@ ExtensionManager *ExtensionManager::create(HINSTANCE library) {
     extMgrInstance_ = ORU_NEW ExtensionManager(library);
     ORU_ASSERT(extMgrInstance_);
     sTable_ = extMgrInstance_->table_.get();
-    std::vector<Version> const platformVersions = PlatformVersions(extMgrInstance_->table());
-    ORU_ASSERT(platformVersions.size() > 0); // NOLINT(readability-container-size-empty): the text
+    std::vector<Version> const versions = PlatformVersions(extMgrInstance_->table());
+    ORU_ASSERT_TEXT("platformVersions.size() > 0", !versions.empty());
     // The loader exports one set of entry points for all platforms; the first platform decides, so
     // that a caller finds the same slots however many runtimes are installed beside it.
-    Version const version = platformVersions.front();
+    Version const version = versions.front();
     if (version.major > 1 || (version.major == 1 && version.minor > 0))
         extMgrInstance_->init_CL_VERSION_1_1();
     return extMgrInstance_;
@@ -139,7 +141,7 @@ void ExtensionManager::destroy() noexcept {
 
 bool ExtensionManager::resolve(Enum::Extension extension) {
     bool complete = true;
-    for (Slot const &slot : slots) {
+    for (Slot const &slot : kSlots) {
         if (slot.extension != extension)
             continue;
         FARPROC const function = GetProcAddress(library_, slot.name);
@@ -178,17 +180,11 @@ Enum::Extension ExtensionManager::nameToExtensionEnum(std::string const &name) {
 }
 
 std::string ExtensionManager::ExtensionEnumToString(Enum::Extension extension) {
-    return IsExtension(extension) ? extensionNames[extension] : std::string();
+    return IsExtension(extension) ? kExtensionNames[extension] : std::string();
 }
 
 void TokenizeExtensionString(std::string const &text, std::vector<std::string> &tokens) {
-    char const separators[] = " \t";
-    std::size_t begin = text.find_first_not_of(separators);
-    while (begin != std::string::npos) {
-        std::size_t const end = text.find_first_of(separators, begin);
-        tokens.push_back(text.substr(begin, end - begin));
-        begin = text.find_first_not_of(separators, end);
-    }
+    Tokenize(text, " \t", tokens);
 }
 
 } // namespace ORU::OCL

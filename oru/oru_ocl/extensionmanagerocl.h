@@ -37,7 +37,7 @@ public:
     /// The function table.
     /// @throws InternalException "table_ != 0"
     FunctionTable const &table() const {
-        ORU_ASSERT(table_ != 0);
+        ORU_ASSERT_TEXT("table_ != 0", table_);
         return *table_;
     }
 

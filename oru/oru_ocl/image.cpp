@@ -1,8 +1,8 @@
 // OpenCL images: two- and three-dimensional device memory with a pixel format.
 #include "oru/oru_ocl/image.h"
 
+#include "oru/core/utility/enumtable.h"
 #include "oru/oru_ocl/clcall.h"
-#include "oru/oru_ocl/internal/enumtable.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"
@@ -11,10 +11,15 @@ namespace ORU::OCL {
 
 namespace {
 
-constexpr unsigned int imageInfos[] = {
-    CL_IMAGE_FORMAT, CL_IMAGE_ELEMENT_SIZE, CL_IMAGE_ROW_PITCH, CL_IMAGE_SLICE_PITCH,
-    CL_IMAGE_WIDTH,  CL_IMAGE_HEIGHT,       CL_IMAGE_DEPTH,
-};
+constexpr EnumTable<Image::ImageInfo, cl_image_info, 7> kImageInfos = {
+    {{Image::IMAGEINFO_FORMAT, CL_IMAGE_FORMAT},
+     {Image::IMAGEINFO_ELEMENT_SIZE, CL_IMAGE_ELEMENT_SIZE},
+     {Image::IMAGEINFO_ROW_PITCH, CL_IMAGE_ROW_PITCH},
+     {Image::IMAGEINFO_SLICE_PITCH, CL_IMAGE_SLICE_PITCH},
+     {Image::IMAGEINFO_WIDTH, CL_IMAGE_WIDTH},
+     {Image::IMAGEINFO_HEIGHT, CL_IMAGE_HEIGHT},
+     {Image::IMAGEINFO_DEPTH, CL_IMAGE_DEPTH}}};
+static_assert(kImageInfos.isInOrder());
 
 void CheckHost(void const *host, char const *message) {
     if (!host)
@@ -27,8 +32,8 @@ cl_mem FromTexture2D(Context const &context, cl_mem_flags flags, OGL::Object con
                   static_cast<cl_GLint>(mipLevel), texture.objectID());
 }
 
-constexpr char const *noHost2D = "NULL host memory pointer passed to Image2D constructor.";
-constexpr char const *noHost3D = "NULL host memory pointer passed to Image3D constructor.";
+constexpr char const *kNoHost2D = "NULL host memory pointer passed to Image2D constructor.";
+constexpr char const *kNoHost3D = "NULL host memory pointer passed to Image3D constructor.";
 
 } // namespace
 
@@ -38,12 +43,12 @@ void Image::getInfo(ImageInfo info, std::size_t size, void *value,
 }
 
 unsigned int Image::ConvertImageInfo(ImageInfo info) {
-    return ConstantOr(imageInfos, info, 0u);
+    return kImageInfos.constantOr(info, 0);
 }
 
 Image2D::Image2D(Context const &context, MemoryAccessFlags access, cl_image_format format,
                  std::size_t width, std::size_t height, std::size_t rowPitch, void *host) {
-    CheckHost(host, noHost2D);
+    CheckHost(host, kNoHost2D);
     cl_mem_flags const flags = AccessFlags(access) | CL_MEM_USE_HOST_PTR;
     adopt(ORU_CL(CreateImage2D, context.id(), flags, &format, width, height, rowPitch, host));
 }
@@ -51,7 +56,7 @@ Image2D::Image2D(Context const &context, MemoryAccessFlags access, cl_image_form
 Image2D::Image2D(Context const &context, MemoryAccessFlags access, bool allocHost,
                  cl_image_format format, std::size_t width, std::size_t height,
                  std::size_t rowPitch, void *host) {
-    CheckHost(host, noHost2D);
+    CheckHost(host, kNoHost2D);
     cl_mem_flags const flags = AllocationFlags(access, allocHost) | CL_MEM_COPY_HOST_PTR;
     adopt(ORU_CL(CreateImage2D, context.id(), flags, &format, width, height, rowPitch, host));
 }
@@ -77,7 +82,7 @@ Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::Renderbu
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, cl_image_format format,
                  std::size_t width, std::size_t height, std::size_t depth, std::size_t rowPitch,
                  std::size_t slicePitch, void *host) {
-    CheckHost(host, noHost3D);
+    CheckHost(host, kNoHost3D);
     cl_mem_flags const flags = AccessFlags(access) | CL_MEM_USE_HOST_PTR;
     adopt(ORU_CL(CreateImage3D, context.id(), flags, &format, width, height, depth, rowPitch,
                  slicePitch, host));
@@ -86,7 +91,7 @@ Image3D::Image3D(Context const &context, MemoryAccessFlags access, cl_image_form
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, bool allocHost,
                  cl_image_format format, std::size_t width, std::size_t height, std::size_t depth,
                  std::size_t rowPitch, std::size_t slicePitch, void *host) {
-    CheckHost(host, noHost3D);
+    CheckHost(host, kNoHost3D);
     cl_mem_flags const flags = AllocationFlags(access, allocHost) | CL_MEM_COPY_HOST_PTR;
     adopt(ORU_CL(CreateImage3D, context.id(), flags, &format, width, height, depth, rowPitch,
                  slicePitch, host));

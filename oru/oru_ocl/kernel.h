@@ -50,7 +50,7 @@ private:
     /// Takes over the caller's reference.
     explicit Kernel(cl_kernel kernel) : OpenCLObjectWrapper(kernel) {}
 
-    /// Adds a reference of its own.
+    /// Adds a reference of its own; has its place in the binary interface.
     Kernel(cl_kernel kernel, add_ref_tag const &tag) : OpenCLObjectWrapper(kernel, tag) {}
 };
 

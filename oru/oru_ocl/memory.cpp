@@ -1,25 +1,34 @@
 // The base of OpenCL buffers and images.
 #include "oru/oru_ocl/memory.h"
 
+#include "oru/core/utility/enumtable.h"
 #include "oru/oru_ocl/clcall.h"
-#include "oru/oru_ocl/internal/enumtable.h"
 
 namespace ORU::OCL {
 
 namespace {
 
-constexpr cl_mem_flags accessFlags[] = {CL_MEM_READ_ONLY, CL_MEM_WRITE_ONLY, CL_MEM_READ_WRITE};
+constexpr EnumTable<Memory::MemoryAccessFlags, cl_mem_flags, 3> kAccessFlags = {
+    {{Memory::MEMORY_READ_ONLY, CL_MEM_READ_ONLY},
+     {Memory::MEMORY_WRITE_ONLY, CL_MEM_WRITE_ONLY},
+     {Memory::MEMORY_READ_WRITE, CL_MEM_READ_WRITE}}};
+static_assert(kAccessFlags.isInOrder());
 
-constexpr unsigned int memoryInfos[] = {
-    CL_MEM_TYPE,      CL_MEM_FLAGS,           CL_MEM_SIZE,    CL_MEM_HOST_PTR,
-    CL_MEM_MAP_COUNT, CL_MEM_REFERENCE_COUNT, CL_MEM_CONTEXT,
-};
+constexpr EnumTable<Memory::MemoryInfo, cl_mem_info, 7> kMemoryInfos = {
+    {{Memory::MEMORYINFO_TYPE, CL_MEM_TYPE},
+     {Memory::MEMORYINFO_FLAGS, CL_MEM_FLAGS},
+     {Memory::MEMORYINFO_SIZE, CL_MEM_SIZE},
+     {Memory::MEMORYINFO_HOST_PTR, CL_MEM_HOST_PTR},
+     {Memory::MEMORYINFO_MAP_COUNT, CL_MEM_MAP_COUNT},
+     {Memory::MEMORYINFO_REFERENCE_COUNT, CL_MEM_REFERENCE_COUNT},
+     {Memory::MEMORYINFO_CONTEXT, CL_MEM_CONTEXT}}};
+static_assert(kMemoryInfos.isInOrder());
 
-constexpr unsigned int objectTypes[] = {
-    CL_MEM_OBJECT_BUFFER,
-    CL_MEM_OBJECT_IMAGE2D,
-    CL_MEM_OBJECT_IMAGE3D,
-};
+constexpr EnumTable<Memory::MemoryObjectType, cl_mem_object_type, 3> kObjectTypes = {
+    {{Memory::MEMORYOBJECTTYPE_BUFFER, CL_MEM_OBJECT_BUFFER},
+     {Memory::MEMORYOBJECTTYPE_IMAGE2D, CL_MEM_OBJECT_IMAGE2D},
+     {Memory::MEMORYOBJECTTYPE_IMAGE3D, CL_MEM_OBJECT_IMAGE3D}}};
+static_assert(kObjectTypes.isInOrder());
 
 } // namespace
 
@@ -31,19 +40,19 @@ void Memory::getInfo(MemoryInfo info, std::size_t size, void *value,
 Memory::MemoryObjectType Memory::memType() const {
     cl_mem_object_type type = 0;
     getInfo(MEMORYINFO_TYPE, sizeof type, &type, nullptr);
-    return static_cast<MemoryObjectType>(IndexOf(objectTypes, type));
+    return kObjectTypes.valueOr(type, MEMORYOBJECTTYPE_OTHER);
 }
 
 cl_mem_flags Memory::AccessFlags(MemoryAccessFlags access) {
-    return ConstantOr(accessFlags, access, cl_mem_flags(0));
+    return kAccessFlags.constantOr(access, 0);
 }
 
 unsigned int Memory::ConvertMemoryInfo(MemoryInfo info) {
-    return ConstantOr(memoryInfos, info, 0u);
+    return kMemoryInfos.constantOr(info, 0);
 }
 
 unsigned int Memory::ConvertMemoryObjectType(MemoryObjectType type) {
-    return ConstantOr(objectTypes, type, 0u);
+    return kObjectTypes.constantOr(type, 0);
 }
 
 cl_mem_flags Memory::AllocationFlags(MemoryAccessFlags access, bool allocHost) {

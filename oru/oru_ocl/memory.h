@@ -55,6 +55,7 @@ protected:
     // Translations into OpenCL's constants; 0 for a value outside the enumeration.
     static cl_mem_flags AccessFlags(MemoryAccessFlags access);
     static unsigned int ConvertMemoryInfo(MemoryInfo info);
+    /// Called by nobody here; has its place in the binary interface.
     static unsigned int ConvertMemoryObjectType(MemoryObjectType type);
 
     /// The flags of memory that the runtime allocates, in host memory when `allocHost` is set.

@@ -2,6 +2,7 @@
 #include "oru/oru_ocl/ocllibrary.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ocl/extensionmanagerocl.h"
 #include "oru/oru_ocl/internal/devicepropertytable.h"
 
@@ -14,10 +15,10 @@ namespace ORU::OCL {
 
 namespace {
 
-tbb::spin_mutex mutex_;
+tbb::spin_mutex gMutex;
 
 /// The runtime that the extension manager's table points into.
-HMODULE runtime_ = nullptr;
+HMODULE gRuntime = nullptr;
 
 /// The system directory without a trailing separator; empty when Windows does not tell.
 std::wstring SystemDirectory() {
@@ -51,9 +52,9 @@ HMODULE LoadRuntime(std::string const &path) {
 
 /// Takes over the reference to `module`, giving up the one held before.
 void KeepRuntime(HMODULE module) {
-    if (runtime_)
-        FreeLibrary(runtime_);
-    runtime_ = module;
+    if (gRuntime)
+        FreeLibrary(gRuntime);
+    gRuntime = module;
 }
 
 bool HasPlatform(HMODULE module) {
@@ -72,38 +73,38 @@ std::atomic<bool> Library::bInitialized_ = false;
 std::string Library::libraryPath_;
 
 void Library::Initialize() {
-    std::lock_guard const lock(mutex_);
+    std::lock_guard const lock(gMutex);
     InitializeLocked();
 }
 
 void Library::InitializeIfNecessary() {
-    std::lock_guard const lock(mutex_);
+    std::lock_guard const lock(gMutex);
     if (!bInitialized_)
         InitializeLocked();
 }
 
 void Library::InitializeLocked() {
     ORU_ASSERT(!bInitialized_);
-    HMODULE const openCLLibraryHandle = LoadRuntime(libraryPath_);
-    ORU_ASSERT(openCLLibraryHandle);
+    HMODULE const runtime = LoadRuntime(libraryPath_);
+    ORU_ASSERT_TEXT("openCLLibraryHandle", runtime);
     ExtensionManager const *const leftOver = ExtensionManager::instance();
     try {
-        ExtensionManager::create(openCLLibraryHandle);
+        ExtensionManager::create(runtime);
         FillDevicePropertyTable();
     } catch (...) {
         // An instance that found no platform stays, and the runtime that it points into with it.
         if (ExtensionManager::instance() != leftOver)
-            KeepRuntime(openCLLibraryHandle);
+            KeepRuntime(runtime);
         else
-            FreeLibrary(openCLLibraryHandle);
+            FreeLibrary(runtime);
         throw;
     }
-    KeepRuntime(openCLLibraryHandle);
+    KeepRuntime(runtime);
     bInitialized_ = true;
 }
 
 void Library::Terminate() {
-    std::lock_guard const lock(mutex_);
+    std::lock_guard const lock(gMutex);
     ORU_ASSERT(bInitialized_);
     bInitialized_ = false;
     libraryPath_.clear();
@@ -118,7 +119,7 @@ bool Library::IsOpenCLAvailable(std::string const &path) {
             std::string copy = path;
             HMODULE const module = LoadRuntime(path);
             {
-                std::lock_guard const lock(mutex_);
+                std::lock_guard const lock(gMutex);
                 libraryPath_.swap(copy);
             }
             if (!module)
@@ -138,13 +139,9 @@ AutoInitializer::AutoInitializer() {
 }
 
 AutoInitializer::~AutoInitializer() {
-    if (!terminate_)
-        return;
-    try {
-        Library::Terminate();
-    } catch (...) {
-        // Somebody else terminated the layer: nothing is left to do.
-    }
+    // When somebody else has terminated the layer, nothing is left to do.
+    if (terminate_)
+        DropExceptions([] { Library::Terminate(); });
 }
 
 } // namespace ORU::OCL

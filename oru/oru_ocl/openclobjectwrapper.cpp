@@ -11,15 +11,15 @@ template<class T>
 using CountSlot = cl_int (CL_API_CALL *FunctionTable::*)(T);
 
 template<class T>
-constexpr CountSlot<T> retainSlot = nullptr;
+constexpr CountSlot<T> kRetainSlot = nullptr;
 template<class T>
-constexpr CountSlot<T> releaseSlot = nullptr;
+constexpr CountSlot<T> kReleaseSlot = nullptr;
 
 #define ORU_CL_COUNTED(Handle, Kind)                                                               \
     template<>                                                                                     \
-    constexpr CountSlot<Handle> retainSlot<Handle> = &FunctionTable::clRetain##Kind;               \
+    constexpr CountSlot<Handle> kRetainSlot<Handle> = &FunctionTable::clRetain##Kind;              \
     template<>                                                                                     \
-    constexpr CountSlot<Handle> releaseSlot<Handle> = &FunctionTable::clRelease##Kind;
+    constexpr CountSlot<Handle> kReleaseSlot<Handle> = &FunctionTable::clRelease##Kind;
 
 ORU_CL_COUNTED(cl_context, Context)
 ORU_CL_COUNTED(cl_command_queue, CommandQueue)
@@ -31,7 +31,7 @@ ORU_CL_COUNTED(cl_event, Event)
 
 template<class T>
 int Count([[maybe_unused]] CountSlot<T> slot, [[maybe_unused]] T handle) {
-    if constexpr (retainSlot<T> != nullptr)
+    if constexpr (kRetainSlot<T> != nullptr)
         if (handle)
             return (Table().*slot)(handle);
     return 0;
@@ -41,12 +41,12 @@ int Count([[maybe_unused]] CountSlot<T> slot, [[maybe_unused]] T handle) {
 
 template<class T>
 int RetainHandle(T handle) {
-    return Count<T>(retainSlot<T>, handle);
+    return Count<T>(kRetainSlot<T>, handle);
 }
 
 template<class T>
 int ReleaseHandle(T handle) {
-    return Count<T>(releaseSlot<T>, handle);
+    return Count<T>(kReleaseSlot<T>, handle);
 }
 
 #define ORU_CL_HANDLE(Handle)                                                                      \

@@ -1,6 +1,7 @@
 // The owner of one OpenCL handle.
 #pragma once
 
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/core/utility/export.h"
 #include "oru/oru_ocl/openclheaders.h"
 
@@ -47,11 +48,8 @@ protected:
 
     /// Releases the handle; lets no exception out.
     ~OpenCLObjectWrapper() {
-        try {
-            release();
-        } catch (...) {
-            // The layer was terminated before this object, and the handle went with the runtime.
-        }
+        // When the layer was terminated before this object, the handle went with the runtime.
+        DropExceptions([this] { release(); });
     }
 
     /// Takes over the caller's reference to `handle`, when none is held yet.

@@ -1,8 +1,8 @@
 // OpenCL programs: what is built for a device from source or binaries.
 #include "oru/oru_ocl/programocl.h"
 
+#include "oru/core/utility/enumtable.h"
 #include "oru/oru_ocl/clcall.h"
-#include "oru/oru_ocl/internal/enumtable.h"
 #include "oru/oru_ocl/internal/handlearray.h"
 #include "oru/oru_ocl/internal/infoquery.h"
 
@@ -12,12 +12,12 @@ namespace ORU::OCL {
 
 namespace {
 
-constexpr int buildStatuses[] = {
-    CL_BUILD_NONE,
-    CL_BUILD_ERROR,
-    CL_BUILD_SUCCESS,
-    CL_BUILD_IN_PROGRESS,
-};
+constexpr EnumTable<Program::BuildStatus, int, 4> kBuildStatuses = {
+    {{Program::BUILD_STATUS_NONE, CL_BUILD_NONE},
+     {Program::BUILD_STATUS_ERROR, CL_BUILD_ERROR},
+     {Program::BUILD_STATUS_SUCCESS, CL_BUILD_SUCCESS},
+     {Program::BUILD_STATUS_IN_PROGRESS, CL_BUILD_IN_PROGRESS}}};
+static_assert(kBuildStatuses.isInOrder());
 
 cl_program CreateWithSource(Context const &context, char const *source) {
     std::size_t const length = std::strlen(source);
@@ -95,30 +95,28 @@ std::vector<Kernel> Program::kernels() const {
 }
 
 Program::BuildStatus Program::OCLBuildStatus(int status) {
-    int const index = IndexOf(buildStatuses, status);
-    return index < static_cast<int>(std::size(buildStatuses)) ? static_cast<BuildStatus>(index)
-                                                              : BUILD_STATUS_NONE;
+    return kBuildStatuses.valueOr(status, BUILD_STATUS_NONE);
 }
 
 int Program::OpenCLBuildStatus(BuildStatus status) {
-    return ConstantOr(buildStatuses, status, int(CL_BUILD_NONE));
+    return kBuildStatuses.constantOr(status, CL_BUILD_NONE);
 }
 
-Program::BinaryArray::BinaryArray(std::vector<Device> const &devs,
+Program::BinaryArray::BinaryArray(std::vector<Device> const &devices,
                                   std::vector<std::size_t> const &sizes,
                                   std::vector<std::vector<unsigned char>> const &binaries)
     : sizes_(sizes), binaries_(binaries) {
-    devices_.reserve(devs.size());
-    for (Device const &device : devs)
+    devices_.reserve(devices.size());
+    for (Device const &device : devices)
         devices_.push_back(device.id());
-    ORU_ASSERT(devs.size() == sizes.size());
+    ORU_ASSERT_TEXT("devs.size() == sizes.size()", devices.size() == sizes.size());
     ORU_ASSERT(sizes.size() == binaries.size());
 }
 
-Program::BinaryArray::BinaryArray(std::vector<cl_device_id> const &devs, std::size_t const *sizes,
-                                  unsigned char const **binaries)
-    : devices_(devs), sizes_(sizes, sizes + devs.size()) {
-    for (std::size_t i = 0; i < devs.size(); ++i)
+Program::BinaryArray::BinaryArray(std::vector<cl_device_id> const &devices,
+                                  std::size_t const *sizes, unsigned char const **binaries)
+    : devices_(devices), sizes_(sizes, sizes + devices.size()) {
+    for (std::size_t i = 0; i < devices.size(); ++i)
         binaries_.emplace_back(binaries[i], binaries[i] + sizes[i]);
 }
 

@@ -63,7 +63,7 @@ private:
                NotifyCallback const &callback);
 
     static BuildStatus OCLBuildStatus(int status);
-    static int OpenCLBuildStatus(BuildStatus status);
+    static int OpenCLBuildStatus(BuildStatus status); ///< has its place in the binary interface
 
     Context context_;
     std::string source_;
@@ -76,11 +76,11 @@ public:
     /// Copies the three lists.
     /// @param sizes bytes of each binary
     /// @throws InternalException when the lists are not of one length
-    BinaryArray(std::vector<Device> const &devs, std::vector<std::size_t> const &sizes,
+    BinaryArray(std::vector<Device> const &devices, std::vector<std::size_t> const &sizes,
                 std::vector<std::vector<unsigned char>> const &binaries);
 
     /// Copies one size and that many bytes of a binary for each device.
-    BinaryArray(std::vector<cl_device_id> const &devs, std::size_t const *sizes,
+    BinaryArray(std::vector<cl_device_id> const &devices, std::size_t const *sizes,
                 unsigned char const **binaries);
 
     std::vector<cl_device_id> const &devices() const { return devices_; }

@@ -21,23 +21,19 @@ public:
     /// All sizes `v`; implicit, so that a launch takes a plain 0 for "no local size".
     Range(std::size_t v) { assign(v); }
 
-    // The checks keep the texts that callers see, hence their layout.
-    // clang-format off
-
     /// Two sizes.
     /// @throws InternalException "N==2" for another `N`
     Range(std::size_t x, std::size_t y) {
-        ORU_ASSERT(N==2);
+        ORU_ASSERT_TEXT("N==2", N == 2);
         set(x, y);
     }
 
     /// Three sizes.
     /// @throws InternalException "N==3" for another `N`
     Range(std::size_t x, std::size_t y, std::size_t z) {
-        ORU_ASSERT(N==3);
+        ORU_ASSERT_TEXT("N==3", N == 3);
         set(x, y, z);
     }
-    // clang-format on
 
     /// Size `i`.
     /// @throws InternalException "i < range_.size()"

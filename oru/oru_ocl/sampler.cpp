@@ -1,37 +1,23 @@
 // OpenCL samplers: how kernels read images.
 #include "oru/oru_ocl/sampler.h"
 
+#include "oru/core/utility/enumtable.h"
 #include "oru/oru_ocl/clcall.h"
-#include "oru/oru_ocl/internal/enumtable.h"
 
 namespace ORU::OCL {
 
 namespace {
 
-constexpr unsigned int addressingModes[] = {
-    CL_ADDRESS_NONE,
-    CL_ADDRESS_REPEAT,
-    CL_ADDRESS_CLAMP,
-    CL_ADDRESS_CLAMP_TO_EDGE,
-};
+constexpr EnumTable<Sampler::SamplerAddressingMode, cl_addressing_mode, 4> kAddressingModes = {
+    {{Sampler::ADDRESS_NONE, CL_ADDRESS_NONE},
+     {Sampler::ADDRESS_REPEAT, CL_ADDRESS_REPEAT},
+     {Sampler::ADDRESS_CLAMP, CL_ADDRESS_CLAMP},
+     {Sampler::ADDRESS_CLAMP_TO_EDGE, CL_ADDRESS_CLAMP_TO_EDGE}}};
+static_assert(kAddressingModes.isInOrder());
 
-constexpr unsigned int filterModes[] = {CL_FILTER_NEAREST, CL_FILTER_LINEAR};
-
-template<std::size_t Size>
-unsigned int ToOpenCL(unsigned int const (&modes)[Size], int mode, char const *failure) {
-    unsigned int const constant = ConstantOr(modes, mode, 0u);
-    if (constant == 0)
-        ORU_THROW_INTERNAL(failure);
-    return constant;
-}
-
-template<std::size_t Size>
-int FromOpenCL(unsigned int const (&modes)[Size], unsigned int constant, char const *failure) {
-    int const mode = IndexOf(modes, constant);
-    if (mode == static_cast<int>(Size))
-        ORU_THROW_INTERNAL(failure);
-    return mode;
-}
+constexpr EnumTable<Sampler::SamplerFilterMode, cl_filter_mode, 2> kFilterModes = {
+    {{Sampler::FILTER_NEAREST, CL_FILTER_NEAREST}, {Sampler::FILTER_LINEAR, CL_FILTER_LINEAR}}};
+static_assert(kFilterModes.isInOrder());
 
 } // namespace
 
@@ -65,21 +51,19 @@ Context Sampler::context() const {
 }
 
 unsigned int Sampler::OpenCLAddressingMode(SamplerAddressingMode mode) {
-    return ToOpenCL(addressingModes, mode, "Unknown OCL addressing mode.");
+    return kAddressingModes.constant(mode, ORU_ENUM_FAILURE("Unknown OCL addressing mode."));
 }
 
 unsigned int Sampler::OpenCLFilterMode(SamplerFilterMode mode) {
-    return ToOpenCL(filterModes, mode, "Unknown OCL filter mode.");
+    return kFilterModes.constant(mode, ORU_ENUM_FAILURE("Unknown OCL filter mode."));
 }
 
 Sampler::SamplerAddressingMode Sampler::OCLAddressingMode(unsigned int mode) {
-    return static_cast<SamplerAddressingMode>(
-        FromOpenCL(addressingModes, mode, "Unknown OpenCL addressing mode."));
+    return kAddressingModes.value(mode, ORU_ENUM_FAILURE("Unknown OpenCL addressing mode."));
 }
 
 Sampler::SamplerFilterMode Sampler::OCLFilterMode(unsigned int mode) {
-    return static_cast<SamplerFilterMode>(
-        FromOpenCL(filterModes, mode, "Unknown OpenCL filter mode."));
+    return kFilterModes.value(mode, ORU_ENUM_FAILURE("Unknown OpenCL filter mode."));
 }
 
 } // namespace ORU::OCL

@@ -18,10 +18,10 @@ using ORU::OGL::Texture2D;
 
 namespace {
 
-constexpr std::size_t cWidth = 2400;
-constexpr std::size_t cHeight = 1600;
-constexpr double cMegapixels = cWidth * cHeight / 1e6;
-constexpr Sharpening cSharpening = {0.8, 1.5};
+constexpr std::size_t kWidth = 2400;
+constexpr std::size_t kHeight = 1600;
+constexpr double kMegapixels = kWidth * kHeight / 1e6;
+constexpr Sharpening kSharpening = {0.8, 1.5};
 
 void Check(cl_int code) {
     if (code != CL_SUCCESS)
@@ -29,7 +29,7 @@ void Check(cl_int code) {
 }
 
 std::unique_ptr<Texture2D> MakeLight() {
-    return std::make_unique<Texture2D>(cLightFormat.storage, cWidth, cHeight, false);
+    return std::make_unique<Texture2D>(kLightFormat.storage, kWidth, kHeight, false);
 }
 
 /// The stage without the library: C functions, and OpenGL's own.
@@ -37,8 +37,8 @@ class RawSharpener {
 public:
     explicit RawSharpener(OpenCLDevice const &device)
         : cl_(ORU::OCL::ExtensionManager::instance()->table()),
-          weights_(GaussianWeights(cSharpening.sigma)),
-          host_(cWidth * cHeight * cLightBytes / sizeof(float)) {
+          weights_(GaussianWeights(kSharpening.sigma)),
+          host_(kWidth * kHeight * kLightBytes / sizeof(float)) {
         cl_device_id const id = device.device.id();
         cl_context_properties const properties[] = {
             CL_CONTEXT_PLATFORM, reinterpret_cast<cl_context_properties>(device.platform.id()), 0};
@@ -47,7 +47,7 @@ public:
         Check(code);
         queue_ = cl_.clCreateCommandQueue(context_, id, 0, &code);
         Check(code);
-        char const *source = cSharpenKernels;
+        char const *source = kSharpenKernels;
         program_ = cl_.clCreateProgramWithSource(context_, 1, &source, nullptr, &code);
         Check(code);
         Check(cl_.clBuildProgram(program_, 0, nullptr, "", nullptr, nullptr));
@@ -67,73 +67,76 @@ public:
     RawSharpener &operator=(RawSharpener const &) = delete;
 
     void sharpen(unsigned int texture) {
-        std::size_t const bytes = host_.size() * sizeof(float);
-        cl_int code = CL_SUCCESS;
-        cl_mem light = cl_.clCreateBuffer(context_, CL_MEM_READ_WRITE, bytes, nullptr, &code);
-        Check(code);
-        cl_mem rows = cl_.clCreateBuffer(context_, CL_MEM_READ_WRITE, bytes, nullptr, &code);
-        Check(code);
-        cl_mem weights =
-            cl_.clCreateBuffer(context_, CL_MEM_READ_ONLY | CL_MEM_COPY_HOST_PTR,
-                               weights_.size() * sizeof(float), weights_.data(), &code);
-        Check(code);
+        Memory const memory(*this, CL_MEM_READ_WRITE, nullptr);
         ::glBindTexture(GL_TEXTURE_2D, texture);
         ::glGetTexImage(GL_TEXTURE_2D, 0, GL_RGBA, GL_FLOAT, host_.data());
-        Check(cl_.clEnqueueWriteBuffer(queue_, light, CL_TRUE, 0, bytes, host_.data(), 0, nullptr,
-                                       nullptr));
-        launch(light, rows, weights);
-        Check(cl_.clEnqueueReadBuffer(queue_, light, CL_TRUE, 0, bytes, host_.data(), 0, nullptr,
-                                      nullptr));
-        ::glTexSubImage2D(GL_TEXTURE_2D, 0, 0, 0, static_cast<GLsizei>(cWidth),
-                          static_cast<GLsizei>(cHeight), GL_RGBA, GL_FLOAT, host_.data());
+        Check(cl_.clEnqueueWriteBuffer(queue_, memory.light, CL_TRUE, 0, bytes(), host_.data(), 0,
+                                       nullptr, nullptr));
+        launch(memory);
+        Check(cl_.clEnqueueReadBuffer(queue_, memory.light, CL_TRUE, 0, bytes(), host_.data(), 0,
+                                      nullptr, nullptr));
+        ::glTexSubImage2D(GL_TEXTURE_2D, 0, 0, 0, static_cast<GLsizei>(kWidth),
+                          static_cast<GLsizei>(kHeight), GL_RGBA, GL_FLOAT, host_.data());
         ::glBindTexture(GL_TEXTURE_2D, 0);
-        cl_.clReleaseMemObject(light);
-        cl_.clReleaseMemObject(rows);
-        cl_.clReleaseMemObject(weights);
     }
 
     /// The kernels alone, on memory of the device.
     double secondsOfKernels() {
-        std::size_t const bytes = host_.size() * sizeof(float);
-        cl_int code = CL_SUCCESS;
-        cl_mem light = cl_.clCreateBuffer(context_, CL_MEM_READ_WRITE | CL_MEM_COPY_HOST_PTR, bytes,
-                                          host_.data(), &code);
-        Check(code);
-        cl_mem rows = cl_.clCreateBuffer(context_, CL_MEM_READ_WRITE, bytes, nullptr, &code);
-        Check(code);
-        cl_mem weights =
-            cl_.clCreateBuffer(context_, CL_MEM_READ_ONLY | CL_MEM_COPY_HOST_PTR,
-                               weights_.size() * sizeof(float), weights_.data(), &code);
-        Check(code);
-        double const seconds = oru_bench::Seconds([&] {
-            launch(light, rows, weights);
+        Memory const memory(*this, CL_MEM_READ_WRITE | CL_MEM_COPY_HOST_PTR, host_.data());
+        return oru_bench::Seconds([&] {
+            launch(memory);
             Check(cl_.clFinish(queue_));
         });
-        cl_.clReleaseMemObject(light);
-        cl_.clReleaseMemObject(rows);
-        cl_.clReleaseMemObject(weights);
-        return seconds;
     }
 
 private:
-    void launch(cl_mem light, cl_mem rows, cl_mem weights) {
+    /// What the kernels work on, for a scope.
+    struct Memory {
+        /// @param host what the picture is filled with, if anything
+        Memory(RawSharpener &sharpener, cl_mem_flags flags, float *host)
+            : cl(sharpener.cl_), light(sharpener.buffer(flags, sharpener.bytes(), host)),
+              rows(sharpener.buffer(CL_MEM_READ_WRITE, sharpener.bytes(), nullptr)),
+              weights(sharpener.buffer(CL_MEM_READ_ONLY | CL_MEM_COPY_HOST_PTR,
+                                       sharpener.weights_.size() * sizeof(float),
+                                       sharpener.weights_.data())) {}
+        ~Memory() {
+            for (cl_mem const memory : {light, rows, weights})
+                cl.clReleaseMemObject(memory);
+        }
+        Memory(Memory const &) = delete;
+        Memory &operator=(Memory const &) = delete;
+
+        ORU::OCL::FunctionTable const &cl;
+        cl_mem light, rows, weights;
+    };
+
+    std::size_t bytes() const { return host_.size() * sizeof(float); }
+
+    cl_mem buffer(cl_mem_flags flags, std::size_t size, float *host) {
+        cl_int code = CL_SUCCESS;
+        cl_mem const memory = cl_.clCreateBuffer(context_, flags, size, host, &code);
+        Check(code);
+        return memory;
+    }
+
+    void launch(Memory const &memory) {
         auto const taps = static_cast<cl_int>(weights_.size());
-        cl_int const size[2] = {static_cast<cl_int>(cWidth), static_cast<cl_int>(cHeight)};
-        auto const amount = static_cast<float>(cSharpening.amount);
+        cl_int const size[2] = {static_cast<cl_int>(kWidth), static_cast<cl_int>(kHeight)};
+        auto const amount = static_cast<float>(kSharpening.amount);
         auto const colours = ColourMask(3);
         for (cl_kernel const kernel : {blurRows_, sharpenColumns_}) {
-            Check(cl_.clSetKernelArg(kernel, 0, sizeof light, &light));
-            Check(cl_.clSetKernelArg(kernel, 1, sizeof rows, &rows));
+            Check(cl_.clSetKernelArg(kernel, 0, sizeof memory.light, &memory.light));
+            Check(cl_.clSetKernelArg(kernel, 1, sizeof memory.rows, &memory.rows));
             Check(cl_.clSetKernelArg(kernel, 2, sizeof size, size));
-            Check(cl_.clSetKernelArg(kernel, 3, sizeof weights, &weights));
+            Check(cl_.clSetKernelArg(kernel, 3, sizeof memory.weights, &memory.weights));
             Check(cl_.clSetKernelArg(kernel, 4, sizeof taps, &taps));
         }
         Check(cl_.clSetKernelArg(sharpenColumns_, 5, sizeof amount, &amount));
         Check(cl_.clSetKernelArg(sharpenColumns_, 6, sizeof colours, colours.data()));
-        static constexpr std::size_t sGlobal[2] = {cWidth, cHeight};
-        static constexpr std::size_t sLocal[2] = {16, 4};
+        static constexpr std::size_t kGlobal[2] = {kWidth, kHeight};
+        static constexpr std::size_t kLocal[2] = {16, 4};
         for (cl_kernel const kernel : {blurRows_, sharpenColumns_})
-            Check(cl_.clEnqueueNDRangeKernel(queue_, kernel, 2, nullptr, sGlobal, sLocal, 0,
+            Check(cl_.clEnqueueNDRangeKernel(queue_, kernel, 2, nullptr, kGlobal, kLocal, 0,
                                              nullptr, nullptr));
     }
 
@@ -160,7 +163,7 @@ void SharpenStage(benchmark::State &state) {
     OpenCLSharpener sharpener(devices.front(), nullptr);
     RawSharpener raw(devices.front());
     auto light = MakeLight();
-    sharpener.sharpen(light, 3, cSharpening); // compiles what is compiled at first use
+    sharpener.sharpen(light, 3, kSharpening); // compiles what is compiled at first use
     raw.sharpen(light->objectID());
 
     std::vector<double> base, stage;
@@ -168,13 +171,13 @@ void SharpenStage(benchmark::State &state) {
         oru_bench::Comparison comparison(state);
         while (state.KeepRunning()) {
             base.push_back(oru_bench::Seconds([&] { raw.sharpen(light->objectID()); }));
-            stage.push_back(oru_bench::Seconds([&] { sharpener.sharpen(light, 3, cSharpening); }));
+            stage.push_back(oru_bench::Seconds([&] { sharpener.sharpen(light, 3, kSharpening); }));
             comparison.add(base.back(), stage.back());
         }
     }
-    state.counters["raw_Mpx_s"] = cMegapixels / oru_bench::Median(base);
-    state.counters["oru_Mpx_s"] = cMegapixels / oru_bench::Median(stage);
-    state.counters["kernels_Mpx_s"] = cMegapixels / raw.secondsOfKernels();
+    state.counters["raw_Mpx_s"] = kMegapixels / oru_bench::Median(base);
+    state.counters["oru_Mpx_s"] = kMegapixels / oru_bench::Median(stage);
+    state.counters["kernels_Mpx_s"] = kMegapixels / raw.secondsOfKernels();
 }
 BENCHMARK(SharpenStage)->UseManualTime()->Iterations(15)->Unit(benchmark::kMillisecond);
 

@@ -19,9 +19,9 @@ App::Image LargePhoto() {
 }
 
 /// The work of the GPU for an area: upload, all stages, read-back.
-void DevelopArea(Developer &developer, App::Image const &photo, ORU::IntegerRect const &area,
-                 Recipe const &recipe) {
-    developer.upload(photo, area, recipe);
+void DevelopAreas(Developer &developer, App::Image const &photo, Areas const &areas,
+                  Recipe const &recipe) {
+    developer.upload(photo, areas);
     developer.sharpen(recipe);
     developer.develop(recipe);
     App::Image const result = developer.readBack();
@@ -35,14 +35,14 @@ void OnePercentSpot(benchmark::State &state, Sharpening const &sharpening) {
     Developer developer(std::make_unique<GlslSharpener>("to compare alike"));
     App::Image const photo = LargePhoto();
     Recipe const recipe{0.3, sharpening, {{3000.5, 2000.25, 243, 1.5}}};
-    ORU::IntegerRect const frame = Frame(photo.width, photo.height);
-    ORU::IntegerRect const area = PixelsAround(RegionOf(recipe.spots), 0, frame);
-    DevelopArea(developer, photo, area, recipe); // compiles what is compiled at first use
+    Areas const whole = WholePicture(photo);
+    Areas const areas = AreasOfSpots(recipe.spots, recipe.sharpening, photo);
+    DevelopAreas(developer, photo, areas, recipe); // compiles what is compiled at first use
     oru_bench::Compare(
-        state, 1, [&] { DevelopArea(developer, photo, frame, recipe); },
-        [&] { DevelopArea(developer, photo, area, recipe); });
-    state.counters["share"] = static_cast<double>(area.width() * area.height()) /
-                              static_cast<double>(frame.width() * frame.height());
+        state, 1, [&] { DevelopAreas(developer, photo, whole, recipe); },
+        [&] { DevelopAreas(developer, photo, areas, recipe); });
+    state.counters["share"] = static_cast<double>(areas.target.width() * areas.target.height()) /
+                              static_cast<double>(photo.width * photo.height);
 }
 
 BENCHMARK_CAPTURE(OnePercentSpot, plain, Sharpening{0, 1})

@@ -25,11 +25,11 @@ void LogicalException::write(std::ostream &os) const {
 }
 
 void LogicalException::initialize(char const *file, int line, char const *message) {
-    static char const undefined[] = "Undefined";
+    static constexpr char kUndefined[] = "Undefined";
     setWhat("ORU logical exception");
-    file_ = file ? file : undefined;
+    file_ = file ? file : kUndefined;
     line_ = line;
-    message_ = message ? message : undefined;
+    message_ = message ? message : kUndefined;
 }
 
 } // namespace ORU

@@ -79,7 +79,8 @@ int half::convert(int floatBits) {
     return sign | (e << 10) | (m >> 13);
 }
 
-/// Raises the floating-point overflow flag, as a conversion by hardware would.
+/// Raises the floating-point overflow flag, as a conversion by hardware would. Products raise it in
+/// the unit that computes, where `std::feraiseexcept` of this target reaches the x87's flags only.
 float half::overflow() {
     float volatile f = 1e10f;
     for (int i = 0; i < 10; ++i)

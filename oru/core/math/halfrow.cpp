@@ -11,10 +11,10 @@
 #endif
 
 // The processor's conversion instructions serve where they agree with the class; a block of values
-// with any on which they differ goes through the class. They differ on
-// signalling NaNs to float, which they make quiet, and to half on ties, on the sign of zeros, on
-// denormals, overflow and NaNs. Of these ties are mended by rounding before the instruction cuts;
-// the rest is rare in pictures.
+// with any on which they differ goes through the class. They differ on signalling NaNs to float,
+// which they make quiet, and to half on ties, on the sign of zeros, on denormals, overflow and
+// NaNs. Of these ties are mended by rounding before the instruction cuts; the rest is rare in
+// pictures.
 
 namespace ORU {
 
@@ -32,11 +32,11 @@ void ScalarToHalf(float const *source, half *target, std::size_t count) {
 
 ORU_TARGET("avx,f16c")
 void VectorToFloat(half const *source, float *target, std::size_t count) {
-    std::size_t const block = 32; // one test for four vectors
+    constexpr std::size_t kBlock = 32; // one test for four vectors
     __m128i const magnitude = _mm_set1_epi16(0x7FFF);
     __m128i const infinity = _mm_set1_epi16(0x7C00);
     std::size_t i = 0;
-    for (; i + block <= count; i += block) {
+    for (; i + kBlock <= count; i += kBlock) {
         auto const *const from = reinterpret_cast<__m128i const *>(source + i);
         __m128i const a = _mm_loadu_si128(from);
         __m128i const b = _mm_loadu_si128(from + 1);
@@ -46,7 +46,7 @@ void VectorToFloat(half const *source, float *target, std::size_t count) {
             _mm_max_epi16(_mm_max_epi16(_mm_and_si128(a, magnitude), _mm_and_si128(b, magnitude)),
                           _mm_max_epi16(_mm_and_si128(c, magnitude), _mm_and_si128(d, magnitude)));
         if (_mm_movemask_epi8(_mm_cmpgt_epi16(largest, infinity))) { // a NaN of either kind
-            ScalarToFloat(source + i, target + i, block);
+            ScalarToFloat(source + i, target + i, kBlock);
             continue;
         }
         _mm256_storeu_ps(target + i, _mm256_cvtph_ps(a));
@@ -83,7 +83,8 @@ void VectorToHalf(float const *source, half *target, std::size_t count) {
     ScalarToHalf(source + i, target + i, count - i);
 }
 
-/// What the processor and the system offer (Intel 64 manual, volume 1, 14.3 and 14.4).
+/// What the processor and the system offer (Intel 64 manual, volume 1, 14.3 and 14.4); asked by
+/// hand, since `__builtin_cpu_supports` of older clang does not know F16C.
 struct Processor {
     bool hasF16C = false;
     bool hasAVX2 = false;

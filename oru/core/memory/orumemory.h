@@ -27,10 +27,11 @@ using MemoryCheckFunction = bool (*)(void const *p, std::size_t size);
 // The hooks, null until the host sets them. Written once at start-up and read without a lock.
 extern ORU_API AllocationFunction gAllocationFunction;
 extern ORU_API DeallocationFunction gDeallocationFunction;
-/// For hosts that hand out executable memory; the library itself neither sets nor calls it.
+/// Neither set nor called by the library; has its place in the binary interface.
 extern ORU_API ExecutableAllocationFunction gExecutableAllocationFunction;
-/// Counterpart of `gExecutableAllocationFunction`, as unused.
+/// The counterpart; has its place in the binary interface.
 extern ORU_API ExecutableDeallocationFunction gExecutableDeallocationFunction;
+/// Kept, never called by the library; has its place in the binary interface.
 extern ORU_API MemoryCheckFunction gMemoryCheckFunction;
 
 } // namespace ORU_private

@@ -18,7 +18,8 @@ ORU_API void *NewAlignedMemory(ORU::MemoryType type, std::size_t size, int align
 /// Frees what `NewAlignedMemory` returned for the same `type`; null is ignored.
 ORU_API void DeleteAlignedMemory(ORU::MemoryType type, void *p) noexcept;
 
-/// Whether `size` bytes at `p` may be touched: always true, there for hosts that ask.
+/// Whether `size` bytes at `p` may be touched: always true. Nothing here asks; it has its place in
+/// the binary interface.
 ORU_API bool CheckMemoryLegal(void const *p, std::size_t size);
 
 } // namespace ORU_private

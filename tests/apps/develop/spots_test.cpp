@@ -65,8 +65,8 @@ std::map<std::string, SpotList> SpotSets() {
 /// The stages of the program on a context of their own.
 class SpotRegions : public ::testing::Test {
 protected:
-    Image develop(Image const &photo, ORU::IntegerRect const &area, Develop::Recipe const &recipe) {
-        developer_->upload(photo, area, recipe);
+    Image develop(Image const &photo, Develop::Areas const &areas, Develop::Recipe const &recipe) {
+        developer_->upload(photo, areas);
         developer_->sharpen(recipe);
         developer_->develop(recipe);
         return developer_->readBack();
@@ -74,13 +74,13 @@ protected:
 
     /// The full frame, and the base with the region of the spots put over it.
     std::pair<Image, Image> developBothWays(Image const &photo, Develop::Recipe recipe) {
-        ORU::IntegerRect const frame = Develop::Frame(photo.width, photo.height);
-        Image const full = develop(photo, frame, recipe);
-        ORU::IntegerRect const area =
-            Develop::PixelsAround(Develop::RegionOf(recipe.spots), 0, frame);
-        Image const part = area.isEmpty() ? Image() : develop(photo, area, recipe);
+        Develop::Areas const whole = Develop::WholePicture(photo);
+        Image const full = develop(photo, whole, recipe);
+        Develop::Areas const areas = Develop::AreasOfSpots(recipe.spots, recipe.sharpening, photo);
+        ORU::IntegerRect const &area = areas.target;
+        Image const part = area.isEmpty() ? Image() : develop(photo, areas, recipe);
         recipe.spots.clear();
-        Image base = develop(photo, frame, recipe);
+        Image base = develop(photo, whole, recipe);
         for (std::size_t y = 0; y < part.height; ++y)
             std::copy_n(part.row(y), part.rowBytes(),
                         base.row(y + static_cast<std::size_t>(area.offset().y)) +

@@ -12,14 +12,14 @@ using ambra::lumo::TVec2;
 
 BoundingRegionBase::~BoundingRegionBase() = default;
 
-void BoundingRegionBase::outset(TVec2<float> const &vOutset) {
-    ORU_ASSERT(vOutset.x >= 0.f && vOutset.y >= 0.f);
-    dilate(BoundingRect(TVec2<float>(-vOutset.x, -vOutset.y), vOutset));
+void BoundingRegionBase::outset(TVec2<float> const &margin) {
+    ORU_ASSERT_TEXT("vOutset.x >= 0.f && vOutset.y >= 0.f", margin.x >= 0 && margin.y >= 0);
+    dilate(BoundingRect(TVec2<float>(-margin.x, -margin.y), margin));
 }
 
-void BoundingRegionBase::inset(TVec2<float> const &vInset) {
-    ORU_ASSERT(vInset.x >= 0.f && vInset.y >= 0.f);
-    erode(BoundingRect(TVec2<float>(-vInset.x, -vInset.y), vInset));
+void BoundingRegionBase::inset(TVec2<float> const &margin) {
+    ORU_ASSERT_TEXT("vInset.x >= 0.f && vInset.y >= 0.f", margin.x >= 0 && margin.y >= 0);
+    erode(BoundingRect(TVec2<float>(-margin.x, -margin.y), margin));
 }
 
 BoundingRegionBase::Representation BoundingRegionBase::representation() const {

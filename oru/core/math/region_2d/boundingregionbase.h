@@ -64,14 +64,14 @@ public:
     /// difference): where a filter whose footprint is `r` reads only what is inside.
     virtual void erode(BoundingRect const &r) = 0;
 
-    /// Grows by `vOutset.x` at the left and at the right, and by `vOutset.y` above and below.
+    /// Grows by `margin.x` at the left and at the right, and by `margin.y` above and below.
     /// @throws InternalException when a component is negative or a NaN
-    virtual void outset(ambra::lumo::TVec2<float> const &vOutset);
+    virtual void outset(ambra::lumo::TVec2<float> const &margin);
 
-    /// Shrinks by `vInset.x` at the left and at the right, and by `vInset.y` above and below,
+    /// Shrinks by `margin.x` at the left and at the right, and by `margin.y` above and below,
     /// perhaps to nothing.
     /// @throws InternalException when a component is negative or a NaN
-    virtual void inset(ambra::lumo::TVec2<float> const &vInset);
+    virtual void inset(ambra::lumo::TVec2<float> const &margin);
 
     /// Moves the region by `d`.
     virtual void translate(ambra::lumo::TVec2<float> const &d) = 0;
