@@ -32,6 +32,8 @@ function(oru_add_test name)
         target_link_libraries(${name} PRIVATE oru)
     endif()
     target_link_libraries(${name} PRIVATE ${arg_LIBRARIES} GTest::gmock GTest::gtest_main)
+    list(TRANSFORM arg_SOURCES PREPEND "${CMAKE_CURRENT_SOURCE_DIR}/" OUTPUT_VARIABLE sources)
+    set_property(GLOBAL APPEND_STRING PROPERTY ORU_TEST_PROGRAMS "${name}\t${sources}\n")
 
     set(prefix "")
     if(arg_ENVIRONMENT)

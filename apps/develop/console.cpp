@@ -21,6 +21,18 @@ bool HasTerminal() {
     return _isatty(_fileno(stdout)) || std::getenv("ORU_TERMINAL") != nullptr;
 }
 
+/// A text without the drive that ORU_ROOT_DRIVE names: a script that runs on a system without
+/// drives put it before absolute paths, and who gave those shall see them again.
+std::string WithoutDrive(std::string text) {
+    char const *const drive = std::getenv("ORU_ROOT_DRIVE");
+    if (drive == nullptr || *drive == '\0')
+        return text;
+    std::string const root = drive + std::string("/");
+    for (std::size_t at = text.find(root); at != std::string::npos; at = text.find(root, at))
+        text.erase(at, root.size() - 1);
+    return text;
+}
+
 void Write(std::FILE *file, std::string const &text) {
     std::fwrite(text.data(), 1, text.size(), file);
     std::fflush(file);
@@ -50,14 +62,14 @@ void Console::line(std::string const &text) {
     if (quiet_)
         return;
     clearBar();
-    Write(stdout, text + "\n");
+    Write(stdout, WithoutDrive(text) + "\n");
     drawBar();
 }
 
 void Console::problem(std::string const &name, std::string const &reason) {
     hadProblems_ = true;
     clearBar();
-    Write(stderr, "develop: " + name + ": " + reason + "\n");
+    Write(stderr, WithoutDrive("develop: " + name + ": " + reason) + "\n");
     drawBar();
 }
 

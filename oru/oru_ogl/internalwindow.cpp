@@ -2,6 +2,7 @@
 #include "oru/oru_ogl/internalwindow.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <boost/format.hpp>
@@ -10,8 +11,8 @@ namespace ORU::OGL {
 
 namespace {
 
-DWORD const kStyle = WS_OVERLAPPEDWINDOW;
-DWORD const kExtendedStyle = WS_EX_APPWINDOW | WS_EX_WINDOWEDGE;
+constexpr DWORD kStyle = WS_OVERLAPPEDWINDOW;
+constexpr DWORD kExtendedStyle = WS_EX_APPWINDOW | WS_EX_WINDOWEDGE;
 
 } // namespace
 
@@ -40,18 +41,17 @@ InternalWindow::InternalWindow(short x, short y) : window_(nullptr) {
     }
 }
 
+InternalWindow::InternalWindow(ambra::lumo::TVec2<int> const &origin)
+    : InternalWindow(static_cast<short>(origin.x), static_cast<short>(origin.y)) {}
+
 InternalWindow::~InternalWindow() {
-    try {
-        destroy();
-    } catch (...) {
-        // A destructor has nobody to report to.
-    }
+    DropExceptions([this] { destroy(); });
 }
 
 void InternalWindow::destroy() {
-    HDC const hDC = ::GetDC(window_);
-    ORU_ASSERT(hDC != 0);
-    if (!::ReleaseDC(window_, hDC))
+    HDC const dc = ::GetDC(window_);
+    ORU_ASSERT_TEXT("hDC != 0", dc);
+    if (!::ReleaseDC(window_, dc))
         ORU_THROW_INTERNAL("Unable to release the device context");
     ::DestroyWindow(window_);
     if (!::UnregisterClassA(className().c_str(), ::GetModuleHandleW(nullptr)))

@@ -1,6 +1,8 @@
-// A hidden window that lends its device context to contexts that draw into no window.
+// The library's own, not for hosts: a hidden window that lends its device context to contexts that
+// draw into no window.
 #pragma once
 
+#include "oru/core/math/tvec2.h"
 #include "oru/core/utility/windowsforward.h"
 
 #include <string>
@@ -14,6 +16,9 @@ public:
     /// @param x, y desktop position, which decides on which display the window lies
     /// @throws InternalException when the class or the window cannot be made
     InternalWindow(short x, short y);
+
+    /// At a display's origin, whose low 16 bits count.
+    explicit InternalWindow(ambra::lumo::TVec2<int> const &origin);
 
     /// Destroys the window and its class; a failure is dropped.
     ~InternalWindow();

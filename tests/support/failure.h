@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <exception>
+#include <new>
 #include <string>
 
 namespace oru_test {
@@ -23,6 +24,8 @@ Failure FailureOf(Call call) {
         call();
     } catch (ORU::LogicalException const &e) {
         return {*e.message() != '\0' ? e.message() : e.what(), e.file(), e.line()};
+    } catch (std::bad_alloc const &) {
+        throw; // no exception of a check: the test's own matter
     } catch (std::exception const &e) {
         return {e.what(), "", 0};
     }

@@ -39,18 +39,25 @@ class TestSummary(unittest.TestCase):
             with self.assertRaises(SystemExit):
                 self.verdict(cases, skips)
 
-    def test_only_a_program_that_never_began_runs_again(self):
+    def test_only_what_was_ended_from_outside_runs_again(self):
+        passed = "[==========] Running\n[  PASSED  ] 1 test.\n"
+        cases = {  # what it printed, how CTest says that it ended, whether that is no failure
+            "Never.Began": ("", "***Failed", True), "Killed.After": (passed, "Subprocess killed", True),
+            "Crashed.After": (passed, "***Exception: SegFault", False),
+            "Killed.Before": ("[==========] Running", "Subprocess killed", False)}
         with tempfile.TemporaryDirectory() as folder:
-            first, second = pathlib.Path(folder, "1.xml"), pathlib.Path(folder, "2.xml")
-            expected = pathlib.Path(folder, "skips.txt")
-            expected.write_text("")
-            first.write_text('<testsuite><testcase name="A.a" status="fail"><system-out/></testcase>'
-                             '<testcase name="A.b" status="fail"><system-out>crash</system-out>'
-                             '</testcase><testcase name="A.c" status="run"/></testsuite>')
-            self.assertEqual(test_summary.unbegun(first), ["A.a"])
-            for again, failed in ("run", ["A.b"]), ("fail", ["A.a", "A.b"]):
-                second.write_text(f'<testsuite><testcase name="A.a" status="{again}"/></testsuite>')
-                self.assertEqual(test_summary.read_results([first, second])[1], failed)
+            results, log = pathlib.Path(folder, "results.xml"), pathlib.Path(folder, "log")
+            log.write_text("".join(f" 1/4 Test #{number}: {name} ....{end}***Exception:  0.1 sec\n"
+                                   for number, (name, (_, end, _)) in enumerate(cases.items())))
+            rows = "".join(f'<testcase name="{name}" status="fail"><system-out>{output}</system-out>'
+                           '</testcase>' for name, (output, _, _) in cases.items())
+            results.write_text(f"<testsuite>{rows}</testsuite>")
+            self.assertEqual(list(test_summary.interrupted(results, log)),
+                             [name for name, (_, _, again) in cases.items() if again])
+            again = pathlib.Path(folder, "again.xml")
+            again.write_text('<testsuite><testcase name="Never.Began" status="run"/></testsuite>')
+            self.assertEqual(test_summary.read_results([results, again])[1],
+                             ["Killed.After", "Crashed.After", "Killed.Before"])
 
 
 if __name__ == "__main__":

@@ -11,11 +11,21 @@ export ORU_BUILD_DIR
 ORU_DEPS_DIR=$ORU_ROOT/build/deps
 ORU_LOG_DIR=$ORU_BUILD_DIR/logs
 
+# Another release of these would lay out and judge the same code otherwise.
+ORU_CLANG_FORMAT=clang-format-14
+ORU_CLANG_TIDY=clang-tidy-14
+
 say() { printf '==> %s\n' "$*"; }
 
 die() {
     printf '%s: %s\n' "$(basename "$0")" "$*" >&2
     exit 1
+}
+
+# refuse ARGUMENT: ends the script for an argument that it does not know.
+refuse() {
+    printf '%s: unknown argument %s (see tools/%s --help)\n' "$(basename "$0")" "$1" "$(basename "$0")" >&2
+    exit 2
 }
 
 # show_help: the comment block at the top of the script, without its marks.

@@ -1,8 +1,11 @@
 # Sums up CTest's JUnit results and holds the skipped tests against the list of expected ones.
 #
 #     test_summary.py EXPECTED RESULTS...   sums up; a test in several results counts as in the last
-#     test_summary.py --unbegun RESULTS     prints a pattern of the failed tests whose program never began
+#     test_summary.py --interrupted RESULTS LOG   prints a pattern of the failed tests that did not fail:
+#                                                 their program never began, or was killed after its work
+import argparse
 import collections
+import pathlib
 import re
 import sys
 import xml.etree.ElementTree as ElementTree
@@ -36,10 +39,17 @@ def read_results(paths):
     return results["run"], results["fail"], results["skipped"]
 
 
-def unbegun(path):
-    """The failed tests that printed nothing: GoogleTest's first line comes before any test."""
-    return [case.get("name") for case in ElementTree.parse(path).iter("testcase")
-            if case.get("status") == "fail" and not (case.findtext("system-out") or "").strip()]
+def interrupted(results, log):
+    """The failed tests whose program printed nothing (GoogleTest's first line comes before any test), or
+    was killed from outside, as CTest's log tells, when GoogleTest had said that all had passed."""
+    text = pathlib.Path(log).read_text(encoding="utf-8", errors="replace")
+    killed = set(re.findall(r"Test +#\d+: (\S+) [ .]*Subprocess (?:killed|terminated)", text))
+    for case in ElementTree.parse(results).iter("testcase"):
+        if case.get("status") == "fail":
+            output = (case.findtext("system-out") or "").strip()
+            passed = re.search(r"^\[  PASSED  \] \d+ tests?\.$", output, re.MULTILINE)
+            if not output or (passed and case.get("name") in killed):
+                yield case.get("name")
 
 
 def main(expected_path, *results_paths):
@@ -68,7 +78,11 @@ def main(expected_path, *results_paths):
 
 
 if __name__ == "__main__":
-    if sys.argv[1] == "--unbegun":
-        print("|".join(re.escape(name) for name in unbegun(sys.argv[2])))
+    parser = argparse.ArgumentParser(description="Sums up the results of CTest.")
+    parser.add_argument("--interrupted", action="store_true")
+    parser.add_argument("files", nargs="+", metavar="FILE")
+    arguments = parser.parse_args()
+    if arguments.interrupted:
+        print("|".join(re.escape(name) for name in interrupted(*arguments.files)))
     else:
-        sys.exit(main(*sys.argv[1:]))
+        sys.exit(main(*arguments.files))

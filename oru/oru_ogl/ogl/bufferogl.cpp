@@ -3,7 +3,7 @@
 
 #include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/objects/ending.h"
+#include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
@@ -26,7 +26,6 @@ constexpr internal::Translation<Buffer::Type, 4, TypeRow> kTypes = {
     {ORU_TYPE(PIXEL_UNPACK_BUFFER), ORU_TYPE(PIXEL_PACK_BUFFER), ORU_TYPE(ARRAY_BUFFER),
      ORU_TYPE(ELEMENT_ARRAY_BUFFER)}};
 #undef ORU_TYPE
-static_assert(kTypes.isInOrder());
 
 #define ORU_USAGE(Name)                                                                            \
     { Buffer::USAGE_##Name, GL_##Name }
@@ -36,7 +35,6 @@ constexpr internal::Translation<Buffer::Usage, 9> kUsages = {
      ORU_USAGE(STATIC_READ), ORU_USAGE(STATIC_COPY), ORU_USAGE(DYNAMIC_DRAW),
      ORU_USAGE(DYNAMIC_READ), ORU_USAGE(DYNAMIC_COPY)}};
 #undef ORU_USAGE
-static_assert(kUsages.isInOrder());
 
 } // namespace
 
@@ -45,7 +43,7 @@ Buffer::Buffer(std::int64_t size, Type type, Usage usage, void const *data)
       usagePolicy_(usage) {
     ORU_ASSERT_SUPPORTED(GL_ARB_PIXEL_BUFFER_OBJECT);
     ORU_ASSERT_SUPPORTED(GL_ARB_VERTEX_BUFFER_OBJECT);
-    if (size < 1)
+    if (size < 1) // the check's text is what hosts see
         ORU_THROW_INTERNAL("Range error: nSize > 0");
     // A context may name both extensions and be too old for the entry points that are called here.
     ORU_ASSERT_SUPPORTED(GL_VERSION_1_5);
@@ -82,11 +80,9 @@ void Buffer::setTarget(Type type) {
 }
 
 void Buffer::fill(void const *data) {
-    unsigned int const previous = getBoundID();
-    bind();
-    internal::Ending restore([&] { ORU_GL(BindBuffer, target(), previous); });
+    internal::BoundObjectScope bound(*this, ORU_BINDER(BindBuffer));
     ORU_GL(BufferData, target(), size_, data, Usage2GL(usagePolicy_));
-    restore.now();
+    bound.restore();
 }
 
 void Buffer::bind() {
@@ -145,7 +141,7 @@ void *Buffer::map(unsigned int access) {
 }
 
 void Buffer::unmap() {
-    if (!mapped_)
+    if (!mapped_) // the check's text is what hosts see, with its slip
         ORU_THROW_INTERNAL("Buffer must be mapped before umapping it (this will cause a GL error)");
     if (!ORU_GL(UnmapBuffer, target()))
         ORU_THROW_INTERNAL("Cannot unmap buffer");
@@ -187,21 +183,8 @@ bool Buffer::isUnpackBuffer() const {
     return target() == GL_PIXEL_UNPACK_BUFFER;
 }
 
-unsigned int Buffer::Type2GL(Type type) {
-    return kTypes.toGL(type);
-}
-
-Buffer::Type Buffer::GL2Type(unsigned int target) {
-    return kTypes.fromGL(target);
-}
-
-unsigned int Buffer::Usage2GL(Usage usage) {
-    return kUsages.toGL(usage);
-}
-
-Buffer::Usage Buffer::GL2Usage(unsigned int usage) {
-    return kUsages.fromGL(usage);
-}
+ORU_TRANSLATED(Buffer, Type, kTypes)
+ORU_TRANSLATED(Buffer, Usage, kUsages)
 
 bool Buffer::IsSupported() {
     return internal::Supports(GL_ARB_PIXEL_BUFFER_OBJECT) &&

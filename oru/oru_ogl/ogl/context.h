@@ -67,7 +67,7 @@ public:
     OpenGLProfile openGLProfile() const { return initOptions_.openGLProfile(); }
 
     /// Whether the current context can wait for the vertical retrace (WGL_EXT_swap_control).
-    /// @throws InternalException when it has no record and the library is not initialized
+    /// @throws InternalException when it has no record and the library is not initialised
     static bool SupportsVerticalRetraceControl();
 
     /// @name Display devices
@@ -127,7 +127,7 @@ protected:
     /// @note wglCreateContextAttribsARB (WGL_ARB_create_context) or wglCreateContext, wglShareLists
     HGLRC createRenderingContext(HDC dc, Context const *share);
 
-    /// Makes this context use another rendering context's objects.
+    /// Makes this context use another rendering context's objects; for hosts that derive.
     /// @throws InternalException when the system refuses
     /// @note wglShareLists
     void shareLists(HGLRC other);
@@ -142,7 +142,9 @@ protected:
     /// @note wglMakeCurrent, wglDeleteContext
     void destroyContext();
 
-    /// Maps the rendering context to its device's record, or ends that; nothing without one.
+    /// Maps the rendering context to its device's record, or ends that; nothing without one. The
+    /// kinds here register as they publish themselves; the first has its place in the binary
+    /// interface.
     /// @throws InternalException when the record cannot be built, or when there is nothing to end
     void registerWithExtensionMgr();
     void unregisterWithExtensionMgr();
@@ -155,7 +157,11 @@ protected:
     /// Joins a sibling's group, or makes a new one when it is null.
     /// @throws InternalException when the sibling is this context or in no group
     void addShareContext(Context const *sibling) const;
+
+    /// The same; has its place in the binary interface.
     void registerSharedContext(Context const *sibling);
+
+    /// Leaves the group; nothing without a rendering context.
     void unregisterSharedContext();
 
     /// Finds the group of an adopted context by trying whether display lists are shared.
@@ -171,8 +177,7 @@ protected:
     /// @note a Direct3D 11 swap chain on the window, which goes at once
     static DisplayDeviceKey DisplayDeviceFromWindow(HWND const &window);
 
-    /// The key of the output at the desktop's origin, found out once. The first call must not
-    /// overlap another.
+    /// The key of the output at the desktop's origin, found out once.
     /// @throws InternalException when there is none
     static DisplayDeviceKey const &PrimaryDisplayDevice();
 
@@ -183,6 +188,7 @@ protected:
                                                  bool defaultToZeroOnFailure);
 
 private:
+    // Read by nobody; they have their place in the binary interface.
     static void SetThrowTestException(bool value) { sThrowTestException_ = value; }
     static bool sThrowTestException_;
 

@@ -10,9 +10,9 @@ namespace ORU::OGL {
 
 namespace {
 
-DisplayDeviceKey const &KeyOf(Context const *pContext) {
-    ORU_ASSERT(pContext != NULL);
-    return pContext->displayDeviceKey();
+DisplayDeviceKey const &KeyOf(Context const *share) {
+    ORU_ASSERT_TEXT("pContext != NULL", share);
+    return share->displayDeviceKey();
 }
 
 } // namespace
@@ -21,14 +21,13 @@ ContextOffscreen::ContextOffscreen(DisplayDeviceKey const &key) : Context(key) {
     create(nullptr);
 }
 
-ContextOffscreen::ContextOffscreen(Context const *pContext) : Context(KeyOf(pContext)) {
-    create(pContext);
+ContextOffscreen::ContextOffscreen(Context const *share) : Context(KeyOf(share)) {
+    create(share);
 }
 
 void ContextOffscreen::create(Context const *share) {
-    auto const origin = DisplayOrigin(displayDeviceKey().adapterName, true);
-    window_ = MakeScoped(
-        ORU_NEW InternalWindow(static_cast<short>(origin.x), static_cast<short>(origin.y)));
+    window_ =
+        MakeScoped(ORU_NEW InternalWindow(DisplayOrigin(displayDeviceKey().adapterName, true)));
     initialize(::GetDC(window_->hWnd()), BufferFormat(8, 8, 8, 0, 0, 0, false), BUFFERING_SINGLE,
                MULTISAMPLING_NONE, share);
     publish(share);

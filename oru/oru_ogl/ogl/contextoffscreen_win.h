@@ -18,7 +18,7 @@ public:
 
     /// A context on the same device as another, sharing its objects.
     /// @throws InternalException for null, LogicalException when the context cannot be made
-    explicit ContextOffscreen(Context const *pContext);
+    explicit ContextOffscreen(Context const *share);
 
     /// Deletes the rendering context and the window.
     ~ContextOffscreen() override;

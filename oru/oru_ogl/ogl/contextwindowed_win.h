@@ -6,6 +6,10 @@
 namespace ORU::OGL {
 
 /// A rendering context on a host's window, which it neither owns nor touches otherwise.
+///
+/// It takes a device context of the window and, leaving the window alone from then on, never gives
+/// it back. Give the window's class the style CS_OWNDC: its device contexts are then all the same,
+/// while without it each rendering context made on the window costs one more.
 class ORU_API ContextWindowed : public Context {
 public:
     /// Makes a context on the display device that shows the window. A window takes one pixel format

@@ -59,25 +59,25 @@ void Framebuffer::requireBound(char const *failure) const {
         ORU_THROW_INTERNAL(failure);
 }
 
-void Framebuffer::attach(Texture2DArray *poTex, unsigned int layer, unsigned int level,
+void Framebuffer::attach(Texture2DArray *texture, unsigned int layer, unsigned int level,
                          unsigned int colorIndex) {
-    ORU_ENFORCE(poTex != NULL);
-    RequireUnbound(*poTex);
+    ORU_ENFORCE_TEXT("poTex != NULL", texture);
+    RequireUnbound(*texture);
     requireBound(kAttachUnbound);
     GLenum const attachment = ColorAttachment(colorIndex);
-    if (layer >= poTex->depth(0))
+    if (layer >= texture->depth(0))
         ORU_THROW_INTERNAL("Array Index too large");
     ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
-    ORU_GL(FramebufferTextureLayer, target(), attachment, poTex->objectID(),
+    ORU_GL(FramebufferTextureLayer, target(), attachment, texture->objectID(),
            static_cast<GLint>(level), static_cast<GLint>(layer));
 }
 
-void Framebuffer::attach(Texture2 *poTex, unsigned int level, unsigned int colorIndex) {
-    ORU_ENFORCE(poTex != NULL);
-    RequireUnbound(*poTex);
+void Framebuffer::attach(Texture2 *texture, unsigned int level, unsigned int colorIndex) {
+    ORU_ENFORCE_TEXT("poTex != NULL", texture);
+    RequireUnbound(*texture);
     requireBound(kAttachUnbound);
     GLenum const attachment = ColorAttachment(colorIndex);
-    ORU_GL(FramebufferTexture2DEXT, target(), attachment, poTex->target(), poTex->objectID(),
+    ORU_GL(FramebufferTexture2DEXT, target(), attachment, texture->target(), texture->objectID(),
            static_cast<GLint>(level));
 }
 
@@ -88,15 +88,15 @@ void Framebuffer::attach(unsigned int textureID, unsigned int textureTarget, uns
            static_cast<GLint>(level));
 }
 
-void Framebuffer::attach(Renderbuffer *poBuffer, unsigned int colorIndex) {
-    ORU_ENFORCE(poBuffer != NULL);
+void Framebuffer::attach(Renderbuffer *renderbuffer, unsigned int colorIndex) {
+    ORU_ENFORCE_TEXT("poBuffer != NULL", renderbuffer);
     requireBound(kAttachUnbound);
-    GLenum const attachment = AttachmentFor(*poBuffer, colorIndex);
+    GLenum const attachment = AttachmentFor(*renderbuffer, colorIndex);
     ORU_GL(FramebufferRenderbufferEXT, target(), attachment, GL_RENDERBUFFER_EXT,
-           poBuffer->objectID());
-    if (poBuffer->format() == GL_DEPTH_STENCIL_EXT)
+           renderbuffer->objectID());
+    if (renderbuffer->format() == GL_DEPTH_STENCIL_EXT)
         ORU_GL(FramebufferRenderbufferEXT, target(), GL_STENCIL_ATTACHMENT_EXT, GL_RENDERBUFFER_EXT,
-               poBuffer->objectID());
+               renderbuffer->objectID());
 }
 
 GLenum Framebuffer::AttachmentFor(Renderbuffer const &renderbuffer, unsigned int colorIndex) {
@@ -108,17 +108,17 @@ GLenum Framebuffer::AttachmentFor(Renderbuffer const &renderbuffer, unsigned int
     return attachment + colorIndex;
 }
 
-void Framebuffer::detach(Texture2 *poTex, unsigned int colorIndex) {
-    ORU_ENFORCE(poTex != NULL);
+void Framebuffer::detach(Texture2 *texture, unsigned int colorIndex) {
+    ORU_ENFORCE_TEXT("poTex != NULL", texture);
     requireBound(kDetachUnbound);
     GLenum const attachment = ColorAttachment(colorIndex);
-    ORU_GL(FramebufferTexture2DEXT, target(), attachment, poTex->target(), 0, 0);
+    ORU_GL(FramebufferTexture2DEXT, target(), attachment, texture->target(), 0, 0);
 }
 
-void Framebuffer::detach(Renderbuffer *poBuffer, unsigned int colorIndex) {
-    ORU_ENFORCE(poBuffer != NULL);
+void Framebuffer::detach(Renderbuffer *renderbuffer, unsigned int colorIndex) {
+    ORU_ENFORCE_TEXT("poBuffer != NULL", renderbuffer);
     requireBound(kDetachUnbound);
-    GLenum const attachment = AttachmentFor(*poBuffer, colorIndex);
+    GLenum const attachment = AttachmentFor(*renderbuffer, colorIndex);
     ORU_GL(FramebufferRenderbufferEXT, target(), attachment, GL_RENDERBUFFER_EXT, 0);
 }
 

@@ -21,7 +21,7 @@ void PixelUnpackParameters::setAlignment(unsigned int bytes) {
     case 8:
         alignment_ = ALIGNMENT_8;
         return;
-    default:
+    default: // the check's text is what hosts see, with its slip
         ORU_ASSERT(!"Unsupported aligment in PixelUnpackParameters::setAlignment!");
     }
 }

@@ -7,8 +7,8 @@
 
 namespace ORU::OGL {
 
-ProgramEnabledScope::ProgramEnabledScope(Program *theProgram) : theProgram_(theProgram) {
-    ORU_ASSERT(theProgram);
+ProgramEnabledScope::ProgramEnabledScope(Program *program) : theProgram_(program) {
+    ORU_ASSERT_TEXT("theProgram", program);
     theProgram_->enable();
 }
 

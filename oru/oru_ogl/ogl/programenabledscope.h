@@ -13,10 +13,10 @@ public:
     /// Holds no program until `enable`.
     ProgramEnabledScope() = default;
 
-    /// @param theProgram a linked program that outlives the scope
+    /// @param program a linked program that outlives the scope
     /// @throws InternalException for null or a program that is not linked
     /// @note glUseProgram
-    explicit ProgramEnabledScope(Program *theProgram);
+    explicit ProgramEnabledScope(Program *program);
     ProgramEnabledScope(ProgramEnabledScope const &) = default;
     ProgramEnabledScope &operator=(ProgramEnabledScope const &) = default;
 

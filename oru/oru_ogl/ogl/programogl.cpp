@@ -10,7 +10,7 @@ Program::Program() {
     if (!ProgramImplCore::IsSupported())
         ORU_THROW_INTERNAL("OpenGL shader programs must be supported");
     actualProgram_.reset(ORU_NEW ProgramImplCore);
-    ORU_ENFORCE(actualProgram_ != NULL);
+    ORU_ENFORCE_TEXT("actualProgram_ != NULL", actualProgram_);
 }
 
 Program::Program(Program &&other) noexcept = default;
@@ -22,7 +22,7 @@ bool Program::IsSupported() {
 }
 
 ProgramImpl &Program::body() const {
-    ORU_ENFORCE(actualProgram_ != NULL);
+    ORU_ENFORCE_TEXT("actualProgram_ != NULL", actualProgram_);
     return *actualProgram_;
 }
 

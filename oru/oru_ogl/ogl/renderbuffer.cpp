@@ -3,7 +3,7 @@
 
 #include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/objects/ending.h"
+#include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -44,7 +44,7 @@ Renderbuffer::Renderbuffer(unsigned int format, int width, int height)
     if (width > maximum)
         ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of width ", width,
                                        ", a max width of ", maximum, " is supported"));
-    if (height > maximum)
+    if (height > maximum) // the check's text is what hosts see, with its "width"
         ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of width ", height,
                                        ", a max height of ", maximum, " is supported"));
     ORU_GL(GenRenderbuffersEXT, 1, &objectID_);
@@ -57,13 +57,11 @@ Renderbuffer::Renderbuffer(unsigned int format, int width, int height)
 }
 
 void Renderbuffer::makeStorage() {
-    unsigned int const previous = getBoundID();
-    internal::Ending restore([&] { ORU_GL(BindRenderbufferEXT, target(), previous); });
-    bind();
+    internal::BoundObjectScope bound(*this, ORU_BINDER(BindRenderbufferEXT));
     ORU_GL(RenderbufferStorageEXT, target(), format_, width_, height_);
     ORU_ASSERT(objectID_ != 0);
     unbind();
-    restore.now();
+    bound.restore();
 }
 
 Renderbuffer::~Renderbuffer() {
@@ -79,7 +77,7 @@ void Renderbuffer::bind() {
 }
 
 void Renderbuffer::unbind() {
-    if (!isBound())
+    if (!isBound()) // the check's text is what hosts see
         ORU_THROW_INTERNAL("Framebuffer object must be bound before calling unbind()");
     ORU_GL(BindRenderbufferEXT, target(), 0);
 }

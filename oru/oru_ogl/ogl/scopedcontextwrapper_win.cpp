@@ -1,8 +1,6 @@
 // Remembering the current context for a scope, and releasing it.
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 
-#include "oru/core/exceptions/checks.h"
-#include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {
@@ -12,15 +10,10 @@ ScopedContextWrapper::ScopedContextWrapper(bool restore)
       restore_(restore) {}
 
 ScopedContextWrapper::~ScopedContextWrapper() {
-    try {
-        if (::wglGetCurrentContext() == renderContext_ && ::wglGetCurrentDC() == deviceContext_)
-            return;
-        if (!::wglMakeCurrent(deviceContext_, renderContext_))
-            ORU_THROW_INTERNAL(
-                ComposeText("Context::can't make this context current", ::GetLastError()));
-    } catch (...) {
-        // A destructor has nobody to report to.
-    }
+    if (::wglGetCurrentContext() == renderContext_ && ::wglGetCurrentDC() == deviceContext_)
+        return;
+    // Its result is not looked at: a destructor has nobody to report to.
+    ::wglMakeCurrent(deviceContext_, renderContext_);
 }
 
 void ReleaseOGLContext() {

@@ -22,7 +22,7 @@ public:
 private:
     HDC deviceContext_;
     HGLRC renderContext_;
-    [[maybe_unused]] bool restore_;
+    [[maybe_unused]] bool restore_; ///< read by nobody; has its place in the binary interface
 };
 
 /// Makes no context current on the calling thread.

@@ -23,7 +23,7 @@ bool Shader::IsSupported(ShaderType type) {
 }
 
 ShaderImpl &Shader::body() const {
-    ORU_ENFORCE(actualShader_ != NULL);
+    ORU_ENFORCE_TEXT("actualShader_ != NULL", actualShader_);
     return *actualShader_;
 }
 

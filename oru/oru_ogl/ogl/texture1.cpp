@@ -2,34 +2,41 @@
 #include "oru/oru_ogl/ogl/texture1.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
 #include "oru/oru_ogl/platformgl.h"
 
-#include <optional>
-
 namespace ORU::OGL {
+
+namespace {
+
+using Part = internal::Part<1>;
+
+void Send(Part const &part, GLenum format, GLenum type, void const *pixels) {
+    ORU_GL(TexSubImage1D, part.target, part.level, part.first[0], part.sides[0], format, type,
+           pixels);
+}
+
+} // namespace
 
 Texture1::Texture1(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
                    bool mipmapped)
     : Texture(target, binding, format, width, 1, 1) {
     if (!internal::CurrentRecord(&ExtensionManager::supportsNonPowerOfTwoTextures) &&
-        !internal::IsPowerOfTwoSize(width))
+        !internal::ArePowersOfTwo(width)) // the check's text is what hosts see, with its "2"
         ORU_THROW_INTERNAL("Texture2::ctor hardware only supports power of two textures");
 
-    unsigned int const previous = getBoundID();
-    ORU_GL(BindTexture, this->target(), objectID());
-    internal::Ending restore([&] { ORU_GL(BindTexture, this->target(), previous); });
+    internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
     auto const allocate = [&](GLint level, std::array<GLsizei, 1> const &sides) {
         ORU_GL(TexImage1D, this->target(), level, static_cast<GLint>(InternalFormat2GL(format)),
                sides[0], 0, getGLFormat(format), GL_UNSIGNED_BYTE, nullptr);
     };
-    internal::ForEachLevel(std::array{internal::ToGLsizei(width)}, 1, mipmapped, allocate);
+    internal::ForEachLevel(internal::ToSides(width), 1, mipmapped, allocate);
     setFilter(FILTER_NEAREST, FILTER_NEAREST);
-    setWrap(internal::CurrentRecord(&ExtensionManager::supportsClampToEdge) ? WRAPMODE_CLAMP_TO_EDGE
-                                                                            : WRAPMODE_CLAMP);
-    restore.now();
+    setWrap(internal::NewTextureClamp());
+    bound.restore();
 }
 
 Texture1::~Texture1() = default;
@@ -45,29 +52,15 @@ void Texture1::checkPart(char const *operation, int level, std::uint64_t width) 
 void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Type type,
                         void const *data, PixelUnpackParameters const &params) {
     checkPart("subimage", level, width);
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
-    internal::WithUnpackState(params, [&] {
-        ORU_GL(TexSubImage1D, target(), level, x, static_cast<GLsizei>(width), glFormat, glType,
-               data);
-    });
+    internal::Upload(Send, Part{target(), level, {x}, internal::ToSides(width)}, format, type, data,
+                     params);
 }
 
 void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Type type,
                         Buffer *buffer, std::size_t offset, PixelUnpackParameters const &params) {
     checkPart("subimage", level, width);
-    internal::CheckUnpackBuffer(buffer, offset);
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
-    if (!buffer->isUnpackBuffer())
-        buffer->convertToUnpackBuffer();
-    std::optional<internal::BoundBuffer> bound;
-    internal::WithUnpackState(params, [&] {
-        bound.emplace(*buffer);
-        ORU_GL(TexSubImage1D, target(), level, x, static_cast<GLsizei>(width), glFormat, glType,
-               internal::BufferOffset(offset));
-    });
-    bound->restore();
+    internal::Upload(Send, Part{target(), level, {x}, internal::ToSides(width)}, format, type,
+                     buffer, offset, params);
 }
 
 void Texture1::copyTexSubImage(int level, int xOffset, int x, int y, std::uint64_t width) {
@@ -83,12 +76,9 @@ void Texture1::getPixelData(Buffer *buffer, int offset, int level, unsigned int 
                             unsigned int type) const {
     ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, 1);
     internal::CheckBuffer(buffer);
-    if (!buffer->isPackBuffer())
-        buffer->convertToPackBuffer();
-    internal::BoundBuffer bound(*buffer);
-    ORU_GL(GetTexImage, target(), level, format, type,
-           internal::BufferOffset(static_cast<std::uint64_t>(offset)));
-    bound.restore();
+    internal::BecomePackBuffer(*buffer);
+    internal::ReadInto(*buffer, static_cast<std::uint64_t>(offset),
+                       [&](void *pixels) { getPixelData(pixels, level, format, type); });
 }
 
 std::size_t Texture1::pixelDataSize(int /*level*/, Format format, Type type) const {

@@ -2,6 +2,7 @@
 #include "oru/oru_ogl/ogl/texture2.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
@@ -10,6 +11,13 @@
 namespace ORU::OGL {
 
 namespace {
+
+using Part = internal::Part<2>;
+
+void Send(Part const &part, GLenum format, GLenum type, void const *pixels) {
+    ORU_GL(TexSubImage2D, part.target, part.level, part.first[0], part.first[1], part.sides[0],
+           part.sides[1], format, type, pixels);
+}
 
 /// Whether an upload takes the caller's memory for the texture's own storage. Where the storage is
 /// kept is a parameter of the rectangle target, whichever target the upload is for.
@@ -25,13 +33,10 @@ Texture2::Texture2(Target target, TargetBinding binding, InternalFormat format, 
                    std::uint64_t height, bool mipmapped, void *clientStorage, Type type)
     : Texture(target, binding, format, width, height, 1), clientStorage_(clientStorage) {
     if (!internal::CurrentRecord(&ExtensionManager::supportsNonPowerOfTwoTextures) &&
-        !internal::Supports(GL_ARB_TEXTURE_RECTANGLE) &&
-        !(internal::IsPowerOfTwoSize(width) && internal::IsPowerOfTwoSize(height)))
+        !internal::Supports(GL_ARB_TEXTURE_RECTANGLE) && !internal::ArePowersOfTwo(width, height))
         ORU_THROW_INTERNAL("Texture2::ctor hardware only supports power of two textures");
 
-    unsigned int const previous = getBoundID();
-    ORU_GL(BindTexture, this->target(), objectID());
-    internal::Ending restore([&] { ORU_GL(BindTexture, this->target(), previous); });
+    internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
     if (clientStorage_)
         ORU_ASSERT_SUPPORTED(GL_APPLE_CLIENT_STORAGE);
     internal::Ending endClientStorage([this] {
@@ -42,12 +47,10 @@ Texture2::Texture2(Target target, TargetBinding binding, InternalFormat format, 
         UseClientStorage(true);
     allocate(mipmapped, type);
     setFilter(FILTER_NEAREST, FILTER_NEAREST);
-    WrapMode const wrap = internal::CurrentRecord(&ExtensionManager::supportsClampToEdge)
-                              ? WRAPMODE_CLAMP_TO_EDGE
-                              : WRAPMODE_CLAMP;
+    WrapMode const wrap = internal::NewTextureClamp();
     setWrap(wrap, wrap);
     endClientStorage.now();
-    restore.now();
+    bound.restore();
 }
 
 Texture2::~Texture2() = default;
@@ -57,12 +60,12 @@ void Texture2::allocate(bool mipmapped, Type type) {
     unsigned int const glFormat = getGLFormat(format());
     unsigned int const glType = type == TYPE_NONE ? GL_UNSIGNED_BYTE : Type2GL(type);
     bool const layered = target() == GL_TEXTURE_1D_ARRAY;
-    internal::ForEachLevel(
-        std::array{internal::ToGLsizei(width(0)), internal::ToGLsizei(height(0))}, layered ? 1 : 2,
-        mipmapped, [&](GLint level, std::array<GLsizei, 2> const &sides) {
-            ORU_GL(TexImage2D, target(), level, glInternalFormat, sides[0], sides[1], 0, glFormat,
-                   glType, clientStorage_);
-        });
+    auto const allocateLevel = [&](GLint level, std::array<GLsizei, 2> const &sides) {
+        ORU_GL(TexImage2D, target(), level, glInternalFormat, sides[0], sides[1], 0, glFormat,
+               glType, clientStorage_);
+    };
+    internal::ForEachLevel(internal::ToSides(width(0), height(0)), layered ? 1 : 2, mipmapped,
+                           allocateLevel);
 }
 
 void Texture2::setWrap(WrapMode s, WrapMode t) {
@@ -82,29 +85,16 @@ void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint6
                         Format format, Type type, void const *data,
                         PixelUnpackParameters const &params) {
     checkPart("subimage", level, width, height);
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
-    internal::WithUnpackState(params, [&] {
-        ORU_GL(TexSubImage2D, target(), level, x, y, static_cast<GLsizei>(width),
-               static_cast<GLsizei>(height), glFormat, glType, data);
-    });
+    internal::Upload(Send, Part{target(), level, {x, y}, internal::ToSides(width, height)}, format,
+                     type, data, params);
 }
 
 void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint64_t height,
                         Format format, Type type, Buffer *buffer, std::size_t offset,
                         PixelUnpackParameters const &params) {
     checkPart("subimage", level, width, height);
-    internal::CheckUnpackBuffer(buffer, offset);
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
-    if (!buffer->isUnpackBuffer())
-        buffer->convertToUnpackBuffer();
-    internal::WithUnpackState(params, [&] {
-        internal::BoundBuffer bound(*buffer);
-        ORU_GL(TexSubImage2D, target(), level, x, y, static_cast<GLsizei>(width),
-               static_cast<GLsizei>(height), glFormat, glType, internal::BufferOffset(offset));
-        bound.restore();
-    });
+    internal::Upload(Send, Part{target(), level, {x, y}, internal::ToSides(width, height)}, format,
+                     type, buffer, offset, params);
 }
 
 void Texture2::copyTexSubImage(int level, int xOffset, int yOffset, int x, int y,
@@ -137,12 +127,11 @@ void Texture2::getPixelData(Buffer *buffer, std::size_t offset, int level, Forma
     internal::CheckByteAlignment(alignment);
     unsigned int const glFormat = Format2GL(format);
     unsigned int const glType = Type2GL(type);
-    if (!buffer->isPackBuffer())
-        buffer->convertToPackBuffer();
+    internal::BecomePackBuffer(*buffer);
     PushAndSetReadbackByteAlignment(alignment);
-    internal::BoundBuffer bound(*buffer);
-    ORU_GL(GetTexImage, target(), level, glFormat, glType, internal::BufferOffset(offset));
-    bound.restore();
+    internal::ReadInto(*buffer, offset, [&](void *pixels) {
+        ORU_GL(GetTexImage, target(), level, glFormat, glType, pixels);
+    });
     PopPixelTransferModes();
 }
 

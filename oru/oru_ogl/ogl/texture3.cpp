@@ -2,6 +2,7 @@
 #include "oru/oru_ogl/ogl/texture3.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
@@ -9,26 +10,31 @@
 
 namespace ORU::OGL {
 
+namespace {
+
+using Part = internal::Part<3>;
+
+void Send(Part const &part, GLenum format, GLenum type, void const *pixels) {
+    ORU_GL(TexSubImage3D, part.target, part.level, part.first[0], part.first[1], part.first[2],
+           part.sides[0], part.sides[1], part.sides[2], format, type, pixels);
+}
+
+} // namespace
+
 /// The part of construction that both ways share: `allocate` runs with the texture bound.
 template<class Allocate>
 void Texture3::initialize(Allocate allocate) {
     if (!internal::CurrentRecord(&ExtensionManager::supportsNonPowerOfTwoTextures) &&
-        !(internal::IsPowerOfTwoSize(width(0)) && internal::IsPowerOfTwoSize(height(0)) &&
-          internal::IsPowerOfTwoSize(Texture::depth(0))))
+        !internal::ArePowersOfTwo(width(0), height(0), Texture::depth(0)))
         ORU_THROW_INTERNAL("Texture3::ctor hardware only supports power of two textures");
     ORU_ASSERT_SUPPORTED(GL_VERSION_1_2); // glTexImage3D
 
-    unsigned int const previous = getBoundID();
-    ORU_GL(BindTexture, target(), objectID());
-    internal::Ending restore([&] { ORU_GL(BindTexture, target(), previous); });
-    allocate(std::array{internal::ToGLsizei(width(0)), internal::ToGLsizei(height(0)),
-                        internal::ToGLsizei(Texture::depth(0))});
+    internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
+    allocate(internal::ToSides(width(0), height(0), Texture::depth(0)));
     setFilter(FILTER_NEAREST, FILTER_NEAREST);
-    WrapMode const wrap = internal::CurrentRecord(&ExtensionManager::supportsClampToEdge)
-                              ? WRAPMODE_CLAMP_TO_EDGE
-                              : WRAPMODE_CLAMP;
+    WrapMode const wrap = internal::NewTextureClamp();
     setWrap(wrap, wrap, wrap);
-    restore.now();
+    bound.restore();
 }
 
 Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
@@ -83,30 +89,18 @@ void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std
                         std::uint64_t depth, Format format, Type type, void const *data,
                         PixelUnpackParameters const &params) {
     checkPart(level, width, height, depth);
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
-    internal::WithUnpackState(params, [&] {
-        ORU_GL(TexSubImage3D, target(), level, x, y, z, static_cast<GLsizei>(width),
-               static_cast<GLsizei>(height), static_cast<GLsizei>(depth), glFormat, glType, data);
-    });
+    internal::Upload(Send,
+                     Part{target(), level, {x, y, z}, internal::ToSides(width, height, depth)},
+                     format, type, data, params);
 }
 
 void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std::uint64_t height,
                         std::uint64_t depth, Format format, Type type, Buffer *buffer,
                         std::size_t offset, PixelUnpackParameters const &params) {
     checkPart(level, width, height, depth);
-    internal::CheckUnpackBuffer(buffer, offset);
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
-    if (!buffer->isUnpackBuffer())
-        buffer->convertToUnpackBuffer();
-    internal::WithUnpackState(params, [&] {
-        internal::BoundBuffer bound(*buffer);
-        ORU_GL(TexSubImage3D, target(), level, x, y, z, static_cast<GLsizei>(width),
-               static_cast<GLsizei>(height), static_cast<GLsizei>(depth), glFormat, glType,
-               internal::BufferOffset(offset));
-        bound.restore();
-    });
+    internal::Upload(Send,
+                     Part{target(), level, {x, y, z}, internal::ToSides(width, height, depth)},
+                     format, type, buffer, offset, params);
 }
 
 void Texture3::copyTexSubImage(int level, int xOffset, int yOffset, int zOffset, int x, int y,
@@ -135,13 +129,11 @@ void Texture3::getPixelData(Buffer *buffer, int offset, int level, Format format
     internal::CheckByteAlignment(alignment);
     unsigned int const glFormat = Format2GL(format);
     unsigned int const glType = Type2GL(type);
-    if (!buffer->isPackBuffer())
-        buffer->convertToPackBuffer();
+    internal::BecomePackBuffer(*buffer);
     PushAndSetReadbackByteAlignment(alignment);
-    internal::BoundBuffer bound(*buffer);
-    ORU_GL(GetTexImage, target(), level, glFormat, glType,
-           internal::BufferOffset(static_cast<std::uint64_t>(offset)));
-    bound.restore();
+    internal::ReadInto(*buffer, static_cast<std::uint64_t>(offset), [&](void *pixels) {
+        ORU_GL(GetTexImage, target(), level, glFormat, glType, pixels);
+    });
     PopPixelTransferModes();
 }
 

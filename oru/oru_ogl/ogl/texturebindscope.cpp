@@ -11,20 +11,20 @@
 
 namespace ORU::OGL {
 
-Texture2DBindScope::Texture2DBindScope(Texture2D *theTexture, unsigned int unit, bool active)
+Texture2DBindScope::Texture2DBindScope(Texture2D *texture, unsigned int unit, bool active)
     : active_(active) {
     if (!active_)
         return;
-    ORU_ASSERT(theTexture);
+    ORU_ASSERT_TEXT("theTexture", texture);
     previousUnit_ = TextureState::ActiveTextureUnit();
     TextureState::SetActiveTextureUnit(unit);
     unit_ = unit;
     try {
         TextureUnit const &theUnit = *TextureUnit::Unit(unit);
         theUnit.enable2D();
-        theUnit.bind(theTexture);
-        theTexture->setFilter(Texture::FILTER_NEAREST, Texture::FILTER_NEAREST);
-        theTexture->setWrap(Texture::WRAPMODE_CLAMP_TO_EDGE, Texture::WRAPMODE_CLAMP_TO_EDGE);
+        theUnit.bind(texture);
+        texture->setFilter(Texture::FILTER_NEAREST, Texture::FILTER_NEAREST);
+        texture->setWrap(Texture::WRAPMODE_CLAMP_TO_EDGE, Texture::WRAPMODE_CLAMP_TO_EDGE);
         theUnit.setEnv(TextureUnit::ENVIRONMENT_REPLACE);
     } catch (...) {
         end();

@@ -20,7 +20,6 @@ constexpr internal::Translation<TextureUnit::Environment, 6> kEnvironments = {
     {ORU_ROW(ADD), ORU_ROW(BLEND), ORU_ROW(COMBINE), ORU_ROW(DECAL), ORU_ROW(MODULATE),
      ORU_ROW(REPLACE)}};
 #undef ORU_ROW
-static_assert(kEnvironments.isInOrder());
 
 } // namespace
 
@@ -71,13 +70,7 @@ void TextureUnit::setEnv(Environment environment) const {
            static_cast<GLint>(Environment2GL(environment)));
 }
 
-unsigned int TextureUnit::Environment2GL(Environment environment) {
-    return kEnvironments.toGL(environment);
-}
-
-TextureUnit::Environment TextureUnit::GL2Environment(unsigned int mode) {
-    return kEnvironments.fromGL(mode);
-}
+ORU_TRANSLATED(TextureUnit, Environment, kEnvironments)
 
 bool TextureUnit::verifyActiveTexture() const {
     return TextureState::ActiveTextureUnit() == static_cast<unsigned int>(this - sUnits_);

@@ -84,7 +84,8 @@ public:
 private:
     TextureUnit() = default;
 
-    /// Whether this unit is the active one. @note glGetIntegerv
+    /// Whether this unit is the active one; has its place in the binary interface.
+    /// @note glGetIntegerv
     bool verifyActiveTexture() const;
 
     static TextureUnit sUnits_[]; ///< a unit's index is its place here

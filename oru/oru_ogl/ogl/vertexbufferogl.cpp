@@ -124,9 +124,9 @@ void VertexBuffer::deleteDeviceSideResources() {
 
 void VertexBuffer::setupWithProgram(unsigned int programID) {
     setup();
-    for (Field &f : fields_) {
-        f.resolvedSlot_ = ORU_GL(GetAttribLocation, programID, f.name_.c_str());
-        ORU_ASSERT(f.resolvedSlot_ >= 0);
+    for (Field &field : fields_) {
+        field.resolvedSlot_ = ORU_GL(GetAttribLocation, programID, field.name_.c_str());
+        ORU_ASSERT_TEXT("f.resolvedSlot_ >= 0", field.resolvedSlot_ >= 0);
     }
 }
 
@@ -135,11 +135,11 @@ void VertexBuffer::setupWithProgram(Program *program) {
     useWithProgram(program);
 }
 
-void VertexBuffer::useWithProgram(Program *oglProgram) {
-    ORU_ENFORCE(oglProgram != NULL);
-    for (Field &f : fields_) {
-        f.resolvedSlot_ = oglProgram->getAttributeLocation(f.name_.c_str());
-        ORU_ASSERT(f.resolvedSlot_ >= 0);
+void VertexBuffer::useWithProgram(Program *program) {
+    ORU_ENFORCE_TEXT("oglProgram != NULL", program);
+    for (Field &field : fields_) {
+        field.resolvedSlot_ = program->getAttributeLocation(field.name_.c_str());
+        ORU_ASSERT_TEXT("f.resolvedSlot_ >= 0", field.resolvedSlot_ >= 0);
     }
 }
 

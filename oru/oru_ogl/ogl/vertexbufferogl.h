@@ -157,7 +157,7 @@ private:
     std::vector<Field> fields_;
     unsigned int vertexSize_ = 0; ///< bytes of all fields in one vertex
     unsigned int vertexCount_ = 0;
-    unsigned int totalSize_ = 0; ///< bytes of all vertices
+    unsigned int totalSize_ = 0; ///< bytes of all vertices; has its place in the binary interface
     PrimitiveType primitiveType_ = PRIMITIVETYPE_POINTS;
     std::vector<unsigned int> attributeBuffers_; ///< GL buffer names, one per field once prepared
     unsigned int vertexBuffer_ = 0;              ///< GL vertex array name, 0 until prepared

@@ -117,7 +117,7 @@ TEST(ContextFailures, LeaveNothingBehind) {
                 } catch (ORU::LogicalException const &e) {
                     EXPECT_EQ(typeid(ORU::LogicalException), typeid(e));
                     EXPECT_STREQ("ORU Internal exception", e.what());
-                    EXPECT_STREQ("oru/oru_ogl/ogl/context_win.cpp", e.file());
+                    EXPECT_THAT(e.file(), testing::StartsWith("oru/oru_ogl/ogl/context_win"));
                     return e.message();
                 }
                 return "";

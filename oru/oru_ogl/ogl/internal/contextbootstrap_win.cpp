@@ -9,9 +9,7 @@
 namespace ORU::OGL::internal {
 
 ContextBootstrap::ContextBootstrap(DisplayDeviceKey const &key) : Context(key) {
-    auto const origin = DisplayOrigin(key.adapterName, true);
-    window_ = MakeScoped(
-        ORU_NEW InternalWindow(static_cast<short>(origin.x), static_cast<short>(origin.y)));
+    window_ = MakeScoped(ORU_NEW InternalWindow(DisplayOrigin(key.adapterName, true)));
     deviceContext_ = ::GetDC(window_->hWnd());
 
     // Only a context that is current when this one is made can offer the function.

@@ -71,7 +71,7 @@ void ProgramImplCore::requireLinkedForQuery() const {
 void ProgramImplCore::attach(Shader *shader) {
     auto const *coreShader =
         shader ? dynamic_cast<ShaderImplCore const *>(shader->actualShader_.get()) : nullptr;
-    ORU_ENFORCE(coreShader != NULL);
+    ORU_ENFORCE_TEXT("coreShader != NULL", coreShader);
     if (!shader->isLoaded())
         ORU_THROW_INTERNAL("Shader must be loaded before attaching");
     ORU_GL(AttachShader, programID_, coreShader->shaderID());
@@ -80,7 +80,7 @@ void ProgramImplCore::attach(Shader *shader) {
 void ProgramImplCore::detach(Shader const *shader) {
     auto const *coreShader =
         shader ? dynamic_cast<ShaderImplCore const *>(shader->actualShader_.get()) : nullptr;
-    ORU_ENFORCE(coreShader != NULL);
+    ORU_ENFORCE_TEXT("coreShader != NULL", coreShader);
     ORU_GL(DetachShader, programID_, coreShader->shaderID());
 }
 

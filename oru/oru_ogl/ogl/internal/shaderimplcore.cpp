@@ -16,9 +16,7 @@ namespace {
 #define ORU_SHADER(Type, GLType)                                                                   \
     { Shader::SHADERTYPE_##Type, GL_##GLType##_SHADER }
 constexpr internal::Translation<Shader::ShaderType, 5> kTypes = {
-    __FILE__,
-    __LINE__,
-    "Type enums are not all properly translated.",
+    "Type enums are not all properly translated.", // unlike the other tables' texts: no literal
     {ORU_SHADER(FRAGMENT, FRAGMENT), ORU_SHADER(VERTEX, VERTEX),
      ORU_SHADER(TESSELLATION_CONTROL, TESS_CONTROL),
      ORU_SHADER(TESSELLATION_EVALUATION, TESS_EVALUATION), ORU_SHADER(GEOMETRY, GEOMETRY)}};
@@ -29,9 +27,9 @@ static_assert(kTypes.isInOrder());
 
 ShaderImpl::~ShaderImpl() = default;
 
-ShaderImplCore::ShaderImplCore(Shader::ShaderType eShaderType) {
-    ORU_ASSERT(IsSupported(eShaderType));
-    shaderID_ = ORU_GL(CreateShader, kTypes.toGL(eShaderType));
+ShaderImplCore::ShaderImplCore(Shader::ShaderType type) {
+    ORU_ASSERT_TEXT("IsSupported(eShaderType)", IsSupported(type));
+    shaderID_ = ORU_GL(CreateShader, kTypes.toGL(type, __FILE__, __LINE__));
 }
 
 ShaderImplCore::~ShaderImplCore() {
@@ -85,6 +83,7 @@ void ShaderImplCore::compile(bool throwOnFailure) {
     int const length = getInfoLogLength();
     if (length == 0)
         ORU_THROW_INTERNAL("Unknown Compile Error.");
+    // A shader's failure, which says "Program": the check's text is what hosts see.
     ORU_THROW_INTERNAL("Program Compile Error: \n" + internal::ReadInfoLog(*this, length));
 }
 

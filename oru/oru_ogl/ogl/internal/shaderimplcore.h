@@ -9,7 +9,7 @@ namespace ORU::OGL {
 /// A body that owns one OpenGL shader object.
 class ORU_API ShaderImplCore : public ShaderImpl {
 public:
-    explicit ShaderImplCore(Shader::ShaderType eShaderType);
+    explicit ShaderImplCore(Shader::ShaderType type);
     ~ShaderImplCore() override;
 
     static bool IsSupported(Shader::ShaderType type);

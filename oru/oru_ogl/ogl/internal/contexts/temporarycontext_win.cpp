@@ -1,19 +1,15 @@
 // The short-lived context on which a pixel format is searched while no context is current.
 #include "oru/oru_ogl/ogl/internal/contexts/temporarycontext_win.h"
 
-#include "oru/core/exceptions/checks.h"
-#include "oru/core/utility/composetext.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/ogl/internal/contexts/makecurrent_win.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL::internal {
 
 TemporaryContext::~TemporaryContext() {
-    try {
-        release();
-    } catch (...) {
-        // A destructor has nobody to report to.
-    }
+    DropExceptions([this] { release(); });
 }
 
 HDC TemporaryContext::makeWindow() {
@@ -23,9 +19,7 @@ HDC TemporaryContext::makeWindow() {
 
 void TemporaryContext::adopt(HGLRC context) {
     renderContext_ = context;
-    if (!ORU_WGL(MakeCurrent, deviceContext_, renderContext_))
-        ORU_THROW_INTERNAL(
-            ComposeText("Context::can't make this context current", ::GetLastError()));
+    MakeCurrent(__FILE__, __LINE__, deviceContext_, renderContext_);
 }
 
 bool TemporaryContext::release() {

@@ -8,9 +8,8 @@ namespace ORU::OGL::internal {
 /// Runs an action once: with `now()`, which lets its failure out, or else, when an exception ends
 /// the scope first, in the destructor, which drops it.
 ///
-///     unsigned int const previous = getBoundID();
-///     ORU_GL(BindBuffer, target(), objectID());
-///     Ending restore([&] { ORU_GL(BindBuffer, target(), previous); });
+///     ORU_GL(PushClientAttrib, GL_CLIENT_PIXEL_STORE_BIT);
+///     Ending restore([] { ORU_GL0(PopClientAttrib); });
 ///     …
 ///     restore.now();
 template<class Action>

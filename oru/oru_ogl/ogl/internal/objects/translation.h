@@ -16,12 +16,10 @@ struct TranslationRow {
 /// One row per enumerator, in the enumeration's order, which starts at 0 and has no gaps.
 template<class Enumeration, std::size_t Count, class Row = TranslationRow<Enumeration>>
 struct Translation {
-    char const *file; ///< position and text of the failure, those of the table
-    int line;
-    char const *failure;
+    char const *failure; ///< text of the failure
     Row rows[Count];
 
-    /// For a static_assert beside the table: each row is where the look-up by value expects it.
+    /// For a static_assert: each row is where the look-up by value expects it.
     constexpr bool isInOrder() const {
         for (std::size_t i = 0; i < Count; ++i) {
             if (static_cast<std::size_t>(rows[i].value) != i)
@@ -36,15 +34,17 @@ struct Translation {
         return index < Count ? &rows[index] : nullptr;
     }
 
+    /// @param file, line position of the failure
     /// @throws InternalException for a number that is no enumerator
-    unsigned int toGL(Enumeration value) const {
+    unsigned int toGL(Enumeration value, char const *file, int line) const {
         if (Row const *row = find(value))
             return row->gl;
         ORU_private::ThrowInternal(file, line, failure);
     }
 
+    /// @param file, line position of the failure
     /// @throws InternalException for a GL value without an enumerator
-    Enumeration fromGL(unsigned int gl) const {
+    Enumeration fromGL(unsigned int gl, char const *file, int line) const {
         for (Row const &row : rows) {
             if (row.gl == gl)
                 return row.value;
@@ -55,5 +55,16 @@ struct Translation {
 
 } // namespace ORU::OGL::internal
 
-/// The first three fields of a table, with the text that the check of a negated literal has.
-#define ORU_TRANSLATION_FAILURE(text) __FILE__, __LINE__, "!\"" text "\""
+/// The failure of a table, with the text that the check of a negated literal has.
+#define ORU_TRANSLATION_FAILURE(text) "!\"" text "\""
+
+/// Defines the two functions of a class that translate one of its enumerations by a table:
+/// `ORU_TRANSLATED(Buffer, Usage, kUsages)` defines Buffer::Usage2GL and Buffer::GL2Usage.
+#define ORU_TRANSLATED(Class, Enumeration, table)                                                  \
+    static_assert(table.isInOrder());                                                              \
+    unsigned int Class::Enumeration##2GL(Enumeration value) {                                      \
+        return table.toGL(value, __FILE__, __LINE__);                                              \
+    }                                                                                              \
+    Class::Enumeration Class::GL2##Enumeration(unsigned int gl) {                                  \
+        return table.fromGL(gl, __FILE__, __LINE__);                                               \
+    }

@@ -22,13 +22,13 @@ void ThrowPart(char const *operation, int level, std::initializer_list<Side> sid
 }
 
 void CheckBuffer(Buffer const *buffer) {
-    ORU_ENFORCE(buffer != NULL);
+    ORU_ENFORCE_TEXT("buffer != NULL", buffer);
     if (buffer->isMapped())
         ORU_THROW_INTERNAL("Pixel Buffer Object cannot be memory mapped during data transfer");
 }
 
 void CheckUnpackBuffer(Buffer const *buffer, std::uint64_t offset) {
-    ORU_ENFORCE(buffer != NULL);
+    ORU_ENFORCE_TEXT("buffer != NULL", buffer);
     if (offset >= buffer->size())
         ORU_THROW_INTERNAL(ComposeText(
             "offset(", offset, ") is greater than pixel buffer object size", buffer->size()));

@@ -4,13 +4,16 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
-#include "oru/oru_ogl/ogl/internal/objects/ending.h"
+#include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/pixelunpackparameters.h"
+#include "oru/oru_ogl/ogl/texture.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <initializer_list>
+#include <optional>
 
 namespace ORU::OGL::internal {
 
@@ -50,23 +53,6 @@ inline void *BufferOffset(std::uint64_t offset) {
     return reinterpret_cast<void *>(static_cast<std::uintptr_t>(offset));
 }
 
-/// Binds a buffer to its target until `restore()`, or until an exception ends the scope.
-class BoundBuffer {
-public:
-    explicit BoundBuffer(Buffer &buffer) : restore_(Restore{buffer.target(), buffer.getBoundID()}) {
-        buffer.bind();
-    }
-    void restore() { restore_.now(); }
-
-private:
-    struct Restore {
-        unsigned int target;
-        unsigned int previous;
-        void operator()() const { ORU_GL(BindBuffer, target, previous); }
-    };
-    Ending<Restore> restore_;
-};
-
 /// Runs an upload with the unpack state that the parameters describe, and puts the state back. When
 /// the upload fails, the state stays as the upload had it, on the client attribute stack above what
 /// it was before: the caller looks at it, or drops it with glPopClientAttrib.
@@ -76,6 +62,66 @@ void WithUnpackState(PixelUnpackParameters const &parameters, Upload upload) {
     parameters.apply();
     upload();
     ORU_GL0(PopClientAttrib);
+}
+
+/// The part of the texture bound to a target that an upload writes.
+template<std::size_t Sides>
+struct Part {
+    GLenum target;
+    GLint level;
+    std::array<GLint, Sides> first;   ///< texel of the part
+    std::array<GLsizei, Sides> sides; ///< texels in each direction
+};
+
+/// The call that uploads of so many sides end in. `pixels` is an address, or an offset into the
+/// pixel unpack buffer.
+template<std::size_t Sides>
+using SendPart = void (*)(Part<Sides> const &part, GLenum format, GLenum type, void const *pixels);
+
+/// Uploads pixels from memory. Checks the formats only; `CheckPart` comes before it.
+template<std::size_t Sides>
+void Upload(SendPart<Sides> send, Part<Sides> const &part, Texture::Format format,
+            Texture::Type type, void const *data, PixelUnpackParameters const &parameters) {
+    GLenum const glFormat = Texture::Format2GL(format);
+    GLenum const glType = Texture::Type2GL(type);
+    WithUnpackState(parameters, [&] { send(part, glFormat, glType, data); });
+}
+
+/// Uploads pixels from a buffer, which becomes a pixel unpack buffer; checks buffer and formats.
+template<std::size_t Sides>
+void Upload(SendPart<Sides> send, Part<Sides> const &part, Texture::Format format,
+            Texture::Type type, Buffer *buffer, std::uint64_t offset,
+            PixelUnpackParameters const &parameters) {
+    CheckUnpackBuffer(buffer, offset);
+    GLenum const glFormat = Texture::Format2GL(format);
+    GLenum const glType = Texture::Type2GL(type);
+    if (!buffer->isUnpackBuffer())
+        buffer->convertToUnpackBuffer();
+    // Hosts that record the calls know 1-D uploads to put the unpack state back first.
+    constexpr bool kStateFirst = Sides == 1;
+    std::optional<BoundObjectScope> bound;
+    WithUnpackState(parameters, [&] {
+        bound.emplace(*buffer, ORU_BINDER(BindBuffer));
+        send(part, glFormat, glType, BufferOffset(offset));
+        if (!kStateFirst)
+            bound->restore();
+    });
+    if (kStateFirst)
+        bound->restore();
+}
+
+/// Makes a buffer one that can be bound for `ReadInto`.
+inline void BecomePackBuffer(Buffer &buffer) {
+    if (!buffer.isPackBuffer())
+        buffer.convertToPackBuffer();
+}
+
+/// Runs `read(pixels)` with a pixel pack buffer bound, in which `pixels` is the offset.
+template<class Read>
+void ReadInto(Buffer const &buffer, std::uint64_t offset, Read read) {
+    BoundObjectScope bound(buffer, ORU_BINDER(BindBuffer));
+    read(BufferOffset(offset));
+    bound.restore();
 }
 
 } // namespace ORU::OGL::internal

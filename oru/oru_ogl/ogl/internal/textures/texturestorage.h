@@ -2,7 +2,8 @@
 #pragma once
 
 #include "oru/core/utility/boundary.h"
-#include "oru/oru_ogl/gltypes.h"
+#include "oru/oru_ogl/ogl/internal/objects/supported.h"
+#include "oru/oru_ogl/ogl/texture.h"
 
 #include <algorithm>
 #include <array>
@@ -12,15 +13,23 @@
 
 namespace ORU::OGL::internal {
 
-/// A size as OpenGL takes it; one that does not fit becomes negative, which OpenGL refuses.
-inline GLsizei ToGLsizei(std::uint64_t size) {
-    constexpr std::uint64_t largest = std::numeric_limits<GLsizei>::max();
-    return size <= largest ? static_cast<GLsizei>(size) : -1;
+/// Sizes as OpenGL takes them; one that does not fit becomes negative, which OpenGL refuses.
+template<class... Sizes>
+std::array<GLsizei, sizeof...(Sizes)> ToSides(Sizes... sizes) {
+    constexpr std::uint64_t kLargest = std::numeric_limits<GLsizei>::max();
+    return {(sizes <= kLargest ? static_cast<GLsizei>(sizes) : -1)...};
 }
 
-/// Whether a size, in its low 32 bits, is a power of two or 0.
-inline bool IsPowerOfTwoSize(std::uint64_t size) {
-    return IsPowerOfTwo(static_cast<unsigned>(size));
+/// Whether sizes, in their low 32 bits, are all powers of two or 0.
+template<class... Sizes>
+bool ArePowersOfTwo(Sizes... sizes) {
+    return (IsPowerOfTwo(static_cast<unsigned>(sizes)) && ...);
+}
+
+/// How a new texture is clamped: to its edges, where the current context can.
+inline Texture::WrapMode NewTextureClamp() {
+    return CurrentRecord(&ExtensionManager::supportsClampToEdge) ? Texture::WRAPMODE_CLAMP_TO_EDGE
+                                                                 : Texture::WRAPMODE_CLAMP;
 }
 
 /// Calls `allocate(level, sides)` for level 0 and, with mipmaps, for all levels below it.

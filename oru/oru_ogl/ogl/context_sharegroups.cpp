@@ -1,0 +1,134 @@
+// Share groups: which contexts share their objects.
+#include "oru/oru_ogl/ogl/context.h"
+
+#include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/scopedptr.h"
+#include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
+#include "oru/oru_ogl/platformgl.h"
+
+#include <algorithm>
+#include <cstddef>
+#include <vector>
+
+namespace ORU::OGL {
+
+namespace {
+
+using ShareGroup = std::vector<Context const *>;
+using ShareGroups = std::vector<ShareGroup>;
+
+/// Made when first asked for; goes with the last group.
+ShareGroups *gShareGroups = nullptr;
+
+/// The group index of a context that was not found (yet); no index comes near it.
+constexpr std::size_t kLargeIndex = 0x0FFFFFFF;
+
+ShareGroups &Groups() {
+    if (!gShareGroups)
+        gShareGroups = ORU_NEW ShareGroups();
+    return *gShareGroups;
+}
+
+/// Whether a display list made in `a` appears in `b`, and disappears there when deleted in `a`.
+/// When it does not appear, the empty list stays in `a`: deleting it would make that context
+/// current once more for each group that is asked.
+bool SharesLists(Context const *a, Context const *b) {
+    ORU_ASSERT(a);
+    ORU_ASSERT(b);
+    ScopedContextWrapper const restoreCurrent;
+    try {
+        a->makeCurrent();
+        GLuint const id = ::glGenLists(1);
+        b->makeCurrent();
+        if (!::glIsList(id))
+            return false;
+        a->makeCurrent();
+        ::glDeleteLists(id, 1);
+        b->makeCurrent();
+        return !::glIsList(id);
+    } catch (InternalException const &) {
+        // A context that cannot be made current here, being in use elsewhere, tells nothing.
+        return false;
+    }
+}
+
+} // namespace
+
+void Context::addShareContext(Context const *sibling) const {
+    ORU_ASSERT(sibling != this);
+    ShareGroups &groups = Groups();
+    if (!sibling) {
+        groups.emplace_back(1, this);
+        return;
+    }
+    auto const group = std::find_if(groups.begin(), groups.end(), [=](ShareGroup const &g) {
+        return std::find(g.begin(), g.end(), sibling) != g.end();
+    });
+    ORU_ASSERT_TEXT("outerIter != gVectorOfContextVectors->end()", group != groups.end());
+    group->push_back(this);
+}
+
+void Context::registerSharedContext(Context const *sibling) {
+    addShareContext(sibling);
+}
+
+void Context::unregisterSharedContext() {
+    if (renderContext_)
+        UnregisterShareContext(this);
+}
+
+void Context::UnregisterShareContext(Context const *context) {
+    ShareGroups &groups = Groups();
+    for (auto group = groups.begin(); group != groups.end(); ++group) {
+        auto const member = std::find(group->begin(), group->end(), context);
+        if (member == group->end())
+            continue;
+        group->erase(member);
+        if (group->empty())
+            groups.erase(group);
+        break;
+    }
+    if (groups.empty()) {
+        ORUDeleter<ShareGroups>()(gShareGroups);
+        gShareGroups = nullptr;
+    }
+}
+
+void Context::RegisterContextWrapped(Context const *context) {
+    for (ShareGroup &group : Groups()) {
+        if (SharesLists(group.front(), context)) {
+            group.push_back(context);
+            return;
+        }
+    }
+    Groups().emplace_back(1, context);
+}
+
+bool Context::isSharingWithCurrentContext() const {
+    ShareGroups const &groups = Groups();
+    HGLRC const current = ORU_WGL0(GetCurrentContext);
+    if (!current)
+        return false;
+
+    std::size_t indexSource = kLargeIndex - 1; // differs from indexQuery while neither is found
+    std::size_t indexQuery = kLargeIndex;
+    for (std::size_t g = 0; g < groups.size(); ++g) {
+        std::size_t index = 0;
+        for (Context const *member : groups[g]) {
+            if (member == this)
+                indexSource = g;
+            if (member->renderContext() == current)
+                indexQuery = g;
+            if (indexSource == indexQuery)
+                return true;
+            ++index;
+            ORU_ASSERT_TEXT("index< LARGE_INDEX-1", index < kLargeIndex - 1);
+        }
+    }
+    ORU_ASSERT_TEXT("indexSource < LARGE_INDEX-1", indexSource < kLargeIndex - 1);
+    ORU_ASSERT_TEXT("indexQuery < LARGE_INDEX-1", indexQuery < kLargeIndex - 1);
+    return false;
+}
+
+} // namespace ORU::OGL
