@@ -24,12 +24,12 @@ def emit(folder, writer):
         writer.write(f"{FOLDER}/{name}", text, f"catalogue/{table} by emit_cl.py")
 
     write("functiontable.h", function_table(entries), ENTRY_POINTS)
-    write("functiontable_slots.inc", slots(entries), ENTRY_POINTS)
+    write("internal/functiontable_slots.inc", slots(entries), ENTRY_POINTS)
     write("extensionenum.h", extension_enum(extensions), EXTENSIONS)
     write("extensionmanagerocl_operations.inc", operations(extensions), EXTENSIONS)
-    write("extensions.inc", extension_rows(extensions), EXTENSIONS)
+    write("internal/extensions.inc", extension_rows(extensions), EXTENSIONS)
     write("devicepropertyenum.h", property_enum(properties), PROPERTIES)
-    write("deviceproperty_rows.inc", property_rows(properties), PROPERTIES)
+    write("internal/deviceproperty_rows.inc", property_rows(properties), PROPERTIES)
     writer.write("tests/support/oclruntime/entrypoints.inc", entry_points(entries),
                  f"catalogue/{ENTRY_POINTS} by emit_cl.py")
 

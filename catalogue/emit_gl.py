@@ -1,7 +1,9 @@
 """Emits the OpenGL function layer: enumeration, function table, loaders, interceptor operations, error checker."""
 from gl_catalogue import Catalogue
 
-FOLDER = "oru/oru_ogl/extensionator"
+BASE = "oru/oru_ogl"
+FOLDER = f"{BASE}/extensionator"
+UNDEFINITIONS = "openglextension_undef.inc"
 SOURCE = "catalogue/gl_entry_points.tsv and gl_extensions.tsv by emit_gl.py"
 
 # Written by hand in openglerrorchecker.cpp: they keep or read the begin/end state.
@@ -17,9 +19,12 @@ def emit(folder, writer):
         clash = RESERVED_NAMES.intersection(p.name for p in entry.parameters)
         if clash:
             raise ValueError(f"{entry.name}: the parameter name {clash.pop()} is used by the generated code")
+    writer.write(f"{BASE}/{UNDEFINITIONS}", undefinitions(catalogue), SOURCE)
     outputs = {
+        # The path that hosts know; the layer below the enumeration needs the text, too.
+        UNDEFINITIONS: f'#include "{BASE}/{UNDEFINITIONS}"\n',
         "openglextension.h": enumeration(catalogue),
-        "openglextension_undef.inc": undefinitions(catalogue),
+        "internal/catalogueogl.h": names(catalogue),
         "functiontable.h": function_table(catalogue),
         "gloperations.inc": operations(catalogue),
         "extensionmanagerogl_loaders.inc": loader_declarations(catalogue),
@@ -61,7 +66,7 @@ enum OpenGLExtension : unsigned int {{
 
 def function_table(catalogue):
     blocks = []
-    for group, entries in catalogue.groups.items():
+    for group, _, entries in catalogue.runs():
         rows = "\n".join(f"    {e.result} (ORU_APIENTRY *{e.name})({e.declarations}) = nullptr;"
                          for e in entries)
         blocks.append(f"    // {group}\n{rows}")
@@ -84,8 +89,7 @@ struct FunctionTable {{
 
 
 def operations(catalogue):
-    rows = "\n".join(f"ORU_GL_OPERATION({e.result}, {e.name[2:]}, ({e.full_declarations}), "
-                     f"({e.full_arguments}))" for e in catalogue.entry_points)
+    rows = "\n".join(e.expansion("ORU_GL_OPERATION") for e in catalogue.entry_points)
     return f"""// One line per wrapped OpenGL entry point, in slot order. Define
 //     ORU_GL_OPERATION(Result, Name, Parameters, Arguments)
 // and include this file where the expansions belong (it undefines the macro at its end):
@@ -99,36 +103,79 @@ def loader_declarations(catalogue):
     return "\n".join(f"bool init_{x.string}();" for x in catalogue.extensions if not x.is_wgl) + "\n"
 
 
+def names(catalogue):
+    gl_count = len([x for x in catalogue.extensions if not x.is_wgl])
+    return f"""// The names of the catalogue.
+#pragma once
+
+#include "oru/oru_ogl/extensionator/openglextension.h"
+
+namespace ORU::OGL {{
+
+/// The names of the FunctionTable's entry points, in its order.
+extern char const *const kEntryPointNames[{len(catalogue.extended)}];
+
+/// A capability and its exact extension string.
+struct NamedExtension {{
+    char const *name;
+    OpenGLExtension value;
+}};
+
+/// The capabilities, those of OpenGL and those of WGL, each ascending by name as strcmp compares.
+extern NamedExtension const kGLExtensions[{gl_count}];
+extern NamedExtension const kWGLExtensions[{len(catalogue.extensions) - gl_count}];
+
+}} // namespace ORU::OGL
+"""
+
+
+def loader(runs):
+    """The body of a group's loader: every entry point is asked for, also after one that is missing."""
+    first, *others = [f"loadGroup({index}, {len(entries)})" for index, entries in runs] or ["true"]
+    if not others:
+        return f"{{ return {first}; }}"
+    lines = "".join(f"    all = {call} && all;\n" for call in others)
+    return f"{{\n    bool all = {first};\n{lines}    return all;\n}}"
+
+
 def loaders(catalogue):
-    names = "\n".join(f'    "{e.name}",' for e in catalogue.extended)
-    bodies, dispatch, position = [], [], {}
-    for index, entry in enumerate(catalogue.extended):
-        position.setdefault(entry.group, index)
+    runs = {}
+    for group, index, entries in catalogue.runs():
+        runs.setdefault(group, []).append((index, entries))
+    bodies, dispatch = [], []
     for extension in catalogue.extensions:
         if extension.is_wgl:
+            dispatch.append(f"    nullptr, // {extension.string}")
             continue
-        entries = catalogue.groups.get(extension.string)
-        body = f"loadGroup({position[extension.string]}, {len(entries)})" if entries else "true"
-        bodies.append(f"bool ExtensionManager::init_{extension.string}() {{ return {body}; }}")
+        bodies.append(f"bool ExtensionManager::init_{extension.string}() {loader(runs.get(extension.string, []))}")
         dispatch.append(f"    &ExtensionManager::init_{extension.string},")
-    strings = "\n".join(f'    "{x.string}",' for x in catalogue.extensions)
+    entry_points = "\n".join(f'    "{e.name}",' for e in catalogue.extended)
+
+    def named(is_wgl):
+        chosen = sorted((x.string, x.enumerator) for x in catalogue.extensions if x.is_wgl == is_wgl)
+        return "\n".join(f'    {{"{string}", {enumerator}}},' for string, enumerator in chosen)
+
     return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 
 #include "oru/oru_ogl/extensionator/internal/catalogueogl.h"
 
 namespace ORU::OGL {{
 
-char const *const kEntryPointNames[{len(catalogue.extended)}] = {{
-{names}
+char const *const kEntryPointNames[] = {{
+{entry_points}
 }};
 
-char const *const kExtensionStrings[{len(catalogue.extensions)}] = {{
-{strings}
+NamedExtension const kGLExtensions[] = {{
+{named(False)}
+}};
+
+NamedExtension const kWGLExtensions[] = {{
+{named(True)}
 }};
 
 {chr(10).join(bodies)}
 
-ExtensionManager::GroupLoader const ExtensionManager::sGroupLoaders_[{len(dispatch)}] = {{
+ExtensionManager::GroupLoader const ExtensionManager::sGroupLoaders_[] = {{
 {chr(10).join(dispatch)}
 }};
 

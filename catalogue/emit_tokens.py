@@ -15,15 +15,15 @@ TOKENS = "gl_tokens.tsv"
 CHOICES = "gl_token_choices.tsv"
 SUFFIXES = ["ARB", "EXT", "APPLE", "ATI", "NV", "SGIS"]
 LEFT_OUT = "GL_ARB_fragment_program"
-COUNT = 1476
 
 
 def emit(folder, writer):
     names = choose(tables.rows(folder / TOKENS, 3), dict(tables.rows(folder / CHOICES, 2)))
-    if len(names) != COUNT:
-        raise ValueError(f"{TOKENS}: {len(names)} values instead of {COUNT}")
+    values = [int(value, 0) for value, _ in names]
+    if values != sorted(set(values)):
+        raise ValueError(f"{TOKENS}: the values do not ascend")
     rows = "\n".join(f'ORU_GL_TOKEN({value}, "{name}")' for value, name in names)
-    writer.write("oru/oru_ogl/extensionator/opengltokens.inc", f"""// One line per named value, ascending; define ORU_GL_TOKEN(Value, Name) before.
+    writer.write("oru/oru_ogl/extensionator/internal/opengltokens.inc", f"""// One line per named value, ascending; define ORU_GL_TOKEN(Value, Name) before.
 {rows}
 #undef ORU_GL_TOKEN
 """, f"catalogue/{TOKENS} and {CHOICES} by emit_tokens.py")

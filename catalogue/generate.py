@@ -1,13 +1,16 @@
 #!/usr/bin/env python3
 """Makes the table-driven C++ of the library from the rows in this folder.
 
-    generate.py --output DIR   writes the files below DIR, touching only those whose text changed
+    generate.py --output DIR   writes the files below DIR, touching only those whose text changed, and
+                               removes what an earlier run wrote and this one does not
     generate.py --list         prints their paths relative to DIR, one a line, and writes nothing
 """
 import argparse
+import importlib
 import pathlib
 import sys
 
+BANNER = "// Generated from "
 CATALOGUE = pathlib.Path(__file__).resolve().parent
 sys.path.insert(0, str(CATALOGUE))
 
@@ -22,9 +25,12 @@ class Writer:
         """Adds the file `path`; `source` names the table and the emitter for its first line."""
         if path in self.files:
             raise ValueError(f"{path} is generated twice")
-        self.files[path] = f"// Generated from {source}; change those, not this file.\n{text}"
+        self.files[path] = f"{BANNER}{source}; change those, not this file.\n{text}"
 
     def flush(self, output):
+        for old in output.rglob("*.*"):
+            if old.relative_to(output).as_posix() not in self.files and self.is_generated(old):
+                old.unlink()
         for path, text in self.files.items():
             target = output / path
             if target.exists() and target.read_text(encoding="utf-8") == text:
@@ -32,11 +38,15 @@ class Writer:
             target.parent.mkdir(parents=True, exist_ok=True)
             target.write_text(text, encoding="utf-8")
 
+    @staticmethod
+    def is_generated(path):
+        return path.is_file() and path.read_bytes().startswith(BANNER.encode())
+
 
 def emitters():
     """The emit_*.py modules of this folder, in name order."""
     for path in sorted(CATALOGUE.glob("emit_*.py")):
-        yield __import__(path.stem)
+        yield importlib.import_module(path.stem)
 
 
 def main():

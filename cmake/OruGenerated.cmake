@@ -1,39 +1,33 @@
-# Runs catalogue/generate.py: its .cpp files are sources of the library, made anew when any file of
-# catalogue/ changes.
+# Runs the generator of catalogue/.
 include_guard(GLOBAL)
 
-set(generator "${PROJECT_SOURCE_DIR}/catalogue/generate.py")
-set(generated_dir "${PROJECT_BINARY_DIR}/generated")
-if(NOT EXISTS "${generator}")
-    add_custom_target(oru_generated)
-    return()
-endif()
+# oru_generate(<name> <catalogue> <output> <sources>): the target <name> makes what the generator in the
+# folder <catalogue> makes, below the folder <output>, anew when a file of <catalogue> changes. The variable
+# <sources> gets its .cpp files, by which the list of a build follows the tables.
+function(oru_generate name catalogue output sources)
+    file(GLOB inputs CONFIGURE_DEPENDS "${catalogue}/*.py" "${catalogue}/*.tsv")
+    set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${inputs})
 
-file(GLOB_RECURSE inputs CONFIGURE_DEPENDS "${PROJECT_SOURCE_DIR}/catalogue/*")
-list(FILTER inputs EXCLUDE REGEX "__pycache__")
-set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${inputs})
+    set(generator "${Python3_EXECUTABLE}" -B "${catalogue}/generate.py")
+    execute_process(
+        COMMAND ${generator} --list
+        OUTPUT_VARIABLE outputs OUTPUT_STRIP_TRAILING_WHITESPACE
+        COMMAND_ERROR_IS_FATAL ANY)
+    string(REPLACE "\n" ";" outputs "${outputs}")
+    list(TRANSFORM outputs PREPEND "${output}/")
 
-set(generate "${Python3_EXECUTABLE}" -B "${generator}" --output "${generated_dir}")
-execute_process(
-    COMMAND "${Python3_EXECUTABLE}" -B "${generator}" --list
-    OUTPUT_VARIABLE outputs OUTPUT_STRIP_TRAILING_WHITESPACE
-    COMMAND_ERROR_IS_FATAL ANY)
-string(REPLACE "\n" ";" outputs "${outputs}")
-list(TRANSFORM outputs PREPEND "${generated_dir}/" REGEX "^[^/]")
+    # The generator leaves unchanged files untouched, so a stamp tells that it ran.
+    set(stamp "${output}/generated.stamp")
+    add_custom_command(
+        OUTPUT "${stamp}"
+        BYPRODUCTS ${outputs}
+        COMMAND ${generator} --output "${output}"
+        COMMAND "${CMAKE_COMMAND}" -E touch "${stamp}"
+        DEPENDS ${inputs}
+        COMMENT "Generating ${name}"
+        VERBATIM)
+    add_custom_target(${name} DEPENDS "${stamp}")
 
-# The generator leaves unchanged files untouched, so a stamp tells that it ran.
-set(stamp "${generated_dir}/generated.stamp")
-add_custom_command(
-    OUTPUT "${stamp}"
-    BYPRODUCTS ${outputs}
-    COMMAND ${generate}
-    COMMAND "${CMAKE_COMMAND}" -E touch "${stamp}"
-    DEPENDS ${inputs}
-    COMMENT "Generating from catalogue/"
-    VERBATIM)
-add_custom_target(oru_generated DEPENDS "${stamp}")
-
-set(sources ${outputs})
-list(FILTER sources INCLUDE REGEX "\\.cpp$")
-target_sources(oru PRIVATE ${sources})
-add_dependencies(oru oru_generated)
+    list(FILTER outputs INCLUDE REGEX "\\.cpp$")
+    set(${sources} ${outputs} PARENT_SCOPE)
+endfunction()

@@ -9,7 +9,8 @@ install(EXPORT oruTargets NAMESPACE oru:: DESTINATION "${config_dir}")
 install(DIRECTORY "${PROJECT_SOURCE_DIR}/oru" "${PROJECT_BINARY_DIR}/generated/oru"
     DESTINATION "${CMAKE_INSTALL_INCLUDEDIR}"
     FILES_MATCHING PATTERN "*.h" PATTERN "*.inc"
-    PATTERN "internal" EXCLUDE)
+    PATTERN "internal" EXCLUDE
+    PATTERN "internalwindow.h" EXCLUDE)
 
 configure_package_config_file("${PROJECT_SOURCE_DIR}/cmake/oruConfig.cmake.in"
     "${PROJECT_BINARY_DIR}/oruConfig.cmake" INSTALL_DESTINATION "${config_dir}")

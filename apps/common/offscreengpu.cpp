@@ -6,6 +6,7 @@
 
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/interceptorscope.h"
 #include "oru/oru_ogl/extensionator/opengltracer.h"
 #include "oru/oru_ogl/ogl/oruopengl.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -16,27 +17,12 @@ namespace App {
 
 using namespace ORU::OGL;
 
-namespace {
-
-/// Takes a tracer off the chain when it goes.
-class PushedTracer : public OpenGLTracer {
-public:
-    explicit PushedTracer(std::ostream &stream) : OpenGLTracer(stream) {
-        OpenGLInterceptor::Instance()->addInterceptor(this);
-    }
-    ~PushedTracer() override { OpenGLInterceptor::Instance()->popInterceptor(); }
-    PushedTracer(PushedTracer const &) = delete;
-    PushedTracer &operator=(PushedTracer const &) = delete;
-};
-
-} // namespace
-
 OffscreenGpu::OffscreenGpu(std::string const &traceFile) {
     if (!traceFile.empty()) {
         traceStream_.open(ToPath(traceFile));
         if (!traceStream_)
             throw Failure("the trace " + traceFile + " cannot be written");
-        tracer_ = std::make_unique<PushedTracer>(traceStream_);
+        tracer_ = std::make_unique<InterceptorScope<OpenGLTracer>>(traceStream_);
     }
     context_ = std::make_unique<ContextOffscreen>();
     context_->makeCurrent();

@@ -12,6 +12,8 @@
 
 namespace ORU::OGL {
 class OpenGLTracer;
+template<class Decorator>
+class InterceptorScope;
 } // namespace ORU::OGL
 
 namespace App {
@@ -39,7 +41,7 @@ public:
 private:
     ORU::OGL::AutoInitializer library_;
     std::ofstream traceStream_;
-    std::unique_ptr<ORU::OGL::OpenGLTracer> tracer_;
+    std::unique_ptr<ORU::OGL::InterceptorScope<ORU::OGL::OpenGLTracer>> tracer_;
     std::unique_ptr<ORU::OGL::ContextOffscreen> context_;
 };
 

@@ -1,5 +1,6 @@
 // The code of the page on the architecture.
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/interceptorscope.h"
 #include "oru/oru_ogl/extensionator/openglinterceptordecorator.h"
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
@@ -29,10 +30,10 @@ TEST(Architecture, CountsCalls) {
     AutoInitializer const library;
     ContextOffscreen const context;
     context.makeCurrent();
-    CallCounter counter;
-    OpenGLInterceptor::Instance()->addInterceptor(&counter);
+    // [scope]
+    InterceptorScope<CallCounter> const counter;
     ORU_GL(Viewport, 0, 0, 1, 1);
     ORU_GL0(Flush);
-    OpenGLInterceptor::Instance()->popInterceptor();
-    EXPECT_EQ(2, counter.calls);
+    EXPECT_EQ(2, counter->calls);
+    // [scope]
 }

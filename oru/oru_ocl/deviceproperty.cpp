@@ -31,7 +31,7 @@ Slot &SlotOf(Enum::DeviceProperty property) {
 
 #define ORU_CL_DEVICE_PROPERTY(Property, Constant, Type)                                           \
     static_assert(Enum::Property == Constant, "a property is its constant of the headers");
-#include "oru/oru_ocl/deviceproperty_rows.inc"
+#include "oru/oru_ocl/internal/deviceproperty_rows.inc"
 
 } // namespace
 
@@ -43,7 +43,7 @@ void FillDevicePropertyTable() {
     Row const rows[] = {
 #define ORU_CL_DEVICE_PROPERTY(Property, Constant, Type)                                           \
     {Enum::Property, Enum::GetTypeName<Type>()},
-#include "oru/oru_ocl/deviceproperty_rows.inc"
+#include "oru/oru_ocl/internal/deviceproperty_rows.inc"
     };
     for (Row const &row : rows)
         SlotOf(row.property) = {row.property, row.type};

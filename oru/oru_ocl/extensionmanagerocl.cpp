@@ -24,7 +24,7 @@ namespace {
 
 #define ORU_CL_SLOT(Extension, Name)                                                               \
     static_assert(std::is_same_v<decltype(FunctionTable::Name), decltype(&::Name)>, #Name);
-#include "oru/oru_ocl/functiontable_slots.inc"
+#include "oru/oru_ocl/internal/functiontable_slots.inc"
 
 struct Slot {
     Enum::Extension extension;
@@ -34,7 +34,7 @@ struct Slot {
 
 constexpr Slot kSlots[] = {
 #define ORU_CL_SLOT(Extension, Name) {Enum::Extension, #Name, offsetof(FunctionTable, Name)},
-#include "oru/oru_ocl/functiontable_slots.inc"
+#include "oru/oru_ocl/internal/functiontable_slots.inc"
 };
 
 static_assert(sizeof(FunctionTable) == std::size(kSlots) * sizeof(FARPROC));
@@ -42,12 +42,12 @@ static_assert(sizeof(FunctionTable) == std::size(kSlots) * sizeof(FARPROC));
 /// The extensions' names; an extension's value is its index.
 constexpr char const *kExtensionNames[] = {
 #define ORU_CL_EXTENSION(Extension, Name) #Name,
-#include "oru/oru_ocl/extensions.inc"
+#include "oru/oru_ocl/internal/extensions.inc"
 };
 
 #define ORU_CL_EXTENSION(Extension, Name)                                                          \
     static_assert(std::string_view(kExtensionNames[Enum::Extension]) == #Name);
-#include "oru/oru_ocl/extensions.inc"
+#include "oru/oru_ocl/internal/extensions.inc"
 
 bool IsExtension(Enum::Extension extension) {
     return static_cast<std::size_t>(extension) < std::size(kExtensionNames);
@@ -159,7 +159,7 @@ bool ExtensionManager::resolve(Enum::Extension extension) {
     bool ExtensionManager::zero_##Name() {                                                         \
         return true;                                                                               \
     }
-#include "oru/oru_ocl/extensions.inc"
+#include "oru/oru_ocl/internal/extensions.inc"
 
 bool ExtensionManager::initializeCL(Enum::Extension extension) {
     return IsExtension(extension) && resolve(extension);

@@ -2,8 +2,10 @@
 #include "oru/oru_ogl/libraryogl.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/core/utility/sharedptr.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
+#include "oru/oru_ogl/extensionator/internal/contextservices.h"
 #include "oru/oru_ogl/extensionator/openglinterceptor.h"
 #include "oru/oru_ogl/extensionator/wgl/wglinterceptor.h"
 
@@ -28,7 +30,7 @@ bool Library::IsInitialized() {
 
 void Library::Terminate() {
     if (sSrcFile_) {
-        ORU_ENFORCE(sBinFile_ != NULL);
+        ORU_ENFORCE_TEXT("sBinFile_ != NULL", sBinFile_);
         for (std::fstream *file : {sSrcFile_, sBinFile_}) {
             file->flush();
             file->close();
@@ -52,13 +54,12 @@ AutoInitializer::AutoInitializer(Library::InitOptions const &options) : active_(
 }
 
 AutoInitializer::~AutoInitializer() {
-    if (!active_)
-        return;
-    try {
-        Library::Terminate();
-    } catch (...) {
-        // A destructor has nobody to report to.
-    }
+    if (active_)
+        DropExceptions([] { Library::Terminate(); });
+}
+
+bool internal::IsLibraryInitialized() {
+    return Library::IsInitialized();
 }
 
 } // namespace ORU::OGL

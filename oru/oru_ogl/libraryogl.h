@@ -14,7 +14,8 @@ namespace ORU::OGL {
 /// is made on it.
 class ORU_API Library {
 public:
-    /// Options of the layer, kept for the host; nothing in the layer acts on them.
+    /// Options of the layer, kept for the host; nothing in the layer acts on them. Those that
+    /// contexts and records copy are `ExtensionManager::InitOptions`.
     class InitOptions {
     public:
         bool throwOnNullContext() const { return throwOnNullContext_; }
@@ -45,6 +46,7 @@ public:
 private:
     static bool sIsInitialized_;
     static InitOptions sInitOptions_;
+    // Two files that nothing opens; they have their place in the binary interface.
     static std::fstream *sSrcFile_;
     static std::fstream *sBinFile_;
 };

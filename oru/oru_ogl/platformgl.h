@@ -14,4 +14,4 @@
 #include <GL/glext.h>
 #include <GL/wglext.h>
 
-#include "oru/oru_ogl/extensionator/openglextension_undef.inc"
+#include "oru/oru_ogl/openglextension_undef.inc"

@@ -55,7 +55,7 @@ struct Slot {
 };
 constexpr Slot slots[] = {
 #define ORU_CL_SLOT(Extension, Name) {#Name, Enum::Extension},
-#include "oru/oru_ocl/functiontable_slots.inc"
+#include "oru/oru_ocl/internal/functiontable_slots.inc"
 };
 
 FARPROC ValueOf(Slot const &slot) {

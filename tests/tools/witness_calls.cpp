@@ -1,5 +1,6 @@
 // Makes OpenGL calls with arguments of every form under a tracer, for a witness to compare.
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/interceptorscope.h"
 #include "oru/oru_ogl/extensionator/opengltracer.h"
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
@@ -54,10 +55,10 @@ int main(int count, char **arguments) {
     ORU::OGL::ContextOffscreen const context;
     context.makeCurrent();
     std::ofstream file(arguments[1], std::ios_base::binary);
-    ORU::OGL::OpenGLTracer tracer(file);
-    ORU::OGL::OpenGLInterceptor::Instance()->addInterceptor(&tracer);
-    Draw();
-    UseObjects();
-    ORU::OGL::OpenGLInterceptor::Instance()->popInterceptor();
+    {
+        ORU::OGL::InterceptorScope<ORU::OGL::OpenGLTracer> const tracer(file);
+        Draw();
+        UseObjects();
+    }
     return file.flush() ? 0 : 1;
 }

@@ -4,6 +4,7 @@
 
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/interceptorscope.h"
 #include "oru/oru_ogl/extensionator/openglforwarder.h"
 
 #include <iterator>
@@ -64,7 +65,6 @@ BENCHMARK(CheckedCallOfExtension)->UseManualTime()->Iterations(1000)->ThreadRang
 // round the processor mispredicts a branch in each call of the shorter chain.
 void ForwardingDecorator(benchmark::State &state) {
     ThreadContext const context;
-    OpenGLForwarder forwarder;
     // Through a pointer, so that both measurements run the same machine code.
     void (*calls)() = [] {
         for (int i = 0; i < kCalls; ++i)
@@ -73,9 +73,11 @@ void ForwardingDecorator(benchmark::State &state) {
     benchmark::DoNotOptimize(calls);
     Comparison comparison(state, kCalls);
     while (state.KeepRunning()) {
-        OpenGLInterceptor::Instance()->addInterceptor(&forwarder);
-        double const with = Seconds(calls);
-        OpenGLInterceptor::Instance()->popInterceptor();
+        double with = 0;
+        {
+            InterceptorScope<OpenGLForwarder> const forwarder;
+            with = Seconds(calls);
+        }
         double const without = Seconds(calls);
         comparison.add(without, with);
     }
@@ -95,7 +97,7 @@ char const *const kNames[] = {
 #define ORU_GL_OPERATION(Result, Name, Parameters, Arguments) "gl" #Name,
 #include "oru/oru_ogl/extensionator/gloperations.inc"
 };
-std::size_t const kFirstExtended = 336;
+std::size_t const kFirstExtended = std::size(kNames) - sizeof(FunctionTable) / sizeof(PROC);
 
 /// Looks every name up, which is the least that reading a device's entry points takes.
 void ReadEntryPoints(std::vector<PROC> &addresses) {

@@ -3,6 +3,7 @@
 #include "bench/glcontext.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/interceptorscope.h"
 #include "oru/oru_ogl/extensionator/openglforwarder.h"
 #include "oru/oru_ogl/extensionator/opengltracer.h"
 
@@ -131,12 +132,10 @@ void PoppedTracer(benchmark::State &state) {
     benchmark::DoNotOptimize(calls);
     Nowhere nowhere;
     std::ostream stream(&nowhere);
-    OpenGLTracer tracer(stream);
     Comparison comparison(state, kCalls);
     while (state.KeepRunning()) {
         double const before = Seconds(calls);
-        OpenGLInterceptor::Instance()->addInterceptor(&tracer);
-        OpenGLInterceptor::Instance()->popInterceptor();
+        { InterceptorScope<OpenGLTracer> const tracer(stream); }
         comparison.add(before, Seconds(calls));
     }
 }

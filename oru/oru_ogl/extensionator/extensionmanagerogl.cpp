@@ -2,19 +2,21 @@
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/tokenize.h"
 #include "oru/core/utility/versionstring.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/catalogueogl.h"
+#include "oru/oru_ogl/extensionator/internal/contextservices.h"
 #include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
-#include "oru/oru_ogl/ogl/context.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <algorithm>
-#include <array>
+#include <cstddef>
 #include <cstring>
 #include <initializer_list>
+#include <iterator>
 #include <ostream>
 
 namespace ORU::OGL {
@@ -67,37 +69,30 @@ Rung const kLadder[] = {
     {1, 2, GL_VERSION_1_2, {}},
 };
 
-OpenGLExtension const kFirstWGL = WGL_ARB_CREATE_CONTEXT;
-OpenGLExtension const kLastWGL = WGL_NV_RENDER_TEXTURE_RECTANGLE;
-
-/// The GL capabilities in the order of their strings, for binary search.
-class NameIndex {
-public:
-    NameIndex() {
-        for (std::size_t i = 0; i < order_.size(); ++i)
-            order_[i] = static_cast<OpenGLExtension>(i);
-        std::sort(order_.begin(), order_.end(), [](OpenGLExtension a, OpenGLExtension b) {
-            return std::strcmp(kExtensionStrings[a], kExtensionStrings[b]) < 0;
-        });
-    }
-
-    OpenGLExtension find(char const *name) const {
-        auto const found = std::lower_bound(order_.begin(), order_.end(), name,
-                                            [](OpenGLExtension e, char const *text) {
-                                                return std::strcmp(kExtensionStrings[e], text) < 0;
-                                            });
-        bool const equal = found != order_.end() && !std::strcmp(kExtensionStrings[*found], name);
-        return equal ? *found : UNKNOWN_OPENGL_EXTENSION;
-    }
-
-private:
-    std::array<OpenGLExtension, kFirstWGL> order_;
-};
+/// The capability of an exact name, or UNKNOWN_OPENGL_EXTENSION.
+template<std::size_t Count>
+OpenGLExtension FindExtension(NamedExtension const (&extensions)[Count], char const *name) {
+    auto const *const found = std::lower_bound(
+        std::begin(extensions), std::end(extensions), name,
+        [](NamedExtension const &e, char const *text) { return std::strcmp(e.name, text) < 0; });
+    bool const equal = found != std::end(extensions) && !std::strcmp(found->name, name);
+    return equal ? found->value : UNKNOWN_OPENGL_EXTENSION;
+}
 
 /// A GL string by the plain call: the interceptor chain needs the record that is being built.
 std::string GLString(GLenum name) {
-    auto const *text = reinterpret_cast<char const *>(::glGetString(name));
+    auto const *const text = reinterpret_cast<char const *>(::glGetString(name));
     return text ? text : "";
+}
+
+/// What a test answers; no when it fails with whatever exception.
+template<class Test>
+bool Passes(Test test) {
+    try {
+        return test();
+    } catch (...) {
+        return false;
+    }
 }
 
 } // namespace
@@ -110,8 +105,8 @@ ExtensionManager::ExtensionManager(HGLRC rc)
 
 ExtensionManager::ExtensionManager(Context *context)
     : tableExt_(MakeShared(ORU_NEW FunctionTable())),
-      displayDeviceKey_(context->displayDeviceKey()), initOptions_(CurrentInitOptions()) {
-    context->makeCurrent();
+      displayDeviceKey_(internal::DisplayDeviceOf(*context)), initOptions_(CurrentInitOptions()) {
+    internal::MakeContextCurrent(*context);
     initialize();
 }
 
@@ -142,9 +137,9 @@ void ExtensionManager::readVendor() {
 }
 
 void ExtensionManager::readVersions() {
-    std::string const sVersionLong = GLString(GL_VERSION);
-    ORU_ASSERT(!sVersionLong.empty());
-    TokenizeVersionString(sVersionLong, majorVersion_, minorVersion_, releaseVersion_,
+    std::string const version = GLString(GL_VERSION);
+    ORU_ASSERT_TEXT("!sVersionLong.empty()", !version.empty());
+    TokenizeVersionString(version, majorVersion_, minorVersion_, releaseVersion_,
                           additionalVersionInfo_);
     if (majorVersion_ == 4 && minorVersion_ > 1)
         minorVersion_ = 1;
@@ -183,14 +178,13 @@ void ExtensionManager::readWGLExtensions() {
         char const *const text = stored(ORU_WGL0(GetCurrentDC));
         std::vector<std::string> tokens;
         TokenizeExtensionString(text ? text : "", tokens);
-        for (std::string const &token : tokens)
-            for (unsigned int value = kFirstWGL; value <= kLastWGL; ++value) {
-                auto const e = static_cast<OpenGLExtension>(value);
-                if (token != kExtensionStrings[e] || !InitializeWGLExtension(e))
-                    continue;
-                supported_.insert(e);
-                supportedNames_.push_back(token);
-            }
+        for (std::string const &token : tokens) {
+            OpenGLExtension const e = FindExtension(kWGLExtensions, token.c_str());
+            if (!InitializeWGLExtension(e))
+                continue;
+            supported_.insert(e);
+            supportedNames_.push_back(token);
+        }
     }
 
     // Looked up again, not taken from the process-wide pointer, which another thread may rewrite.
@@ -214,25 +208,18 @@ std::string ExtensionManager::getExtensionsString() const {
         GLubyte const *const text =
             tableExt_->glGetStringi ? tableExt_->glGetStringi(GL_EXTENSIONS, static_cast<GLuint>(i))
                                     : nullptr;
-        std::string const anExtensionString = text ? reinterpret_cast<char const *>(text) : "";
-        ORU_ASSERT(!anExtensionString.empty());
+        std::string const name = text ? reinterpret_cast<char const *>(text) : "";
+        ORU_ASSERT_TEXT("!anExtensionString.empty()", !name.empty());
         if (i > 0)
             names += ' ';
-        names += anExtensionString;
+        names += name;
     }
     return names;
 }
 
 void ExtensionManager::TokenizeExtensionString(std::string const &text,
                                                std::vector<std::string> &out) {
-    std::string::size_type end = 0;
-    for (;;) {
-        auto const begin = text.find_first_not_of(' ', end);
-        if (begin == std::string::npos)
-            return;
-        end = std::min(text.find(' ', begin), text.size());
-        out.push_back(text.substr(begin, end - begin));
-    }
+    Tokenize(text, " ", out);
 }
 
 bool ExtensionManager::loadGroup(std::size_t first, std::size_t count) {
@@ -248,12 +235,12 @@ bool ExtensionManager::loadGroup(std::size_t first, std::size_t count) {
 }
 
 OpenGLExtension ExtensionManager::nameToEnumGL(char const *name) {
-    static NameIndex const index;
-    return index.find(name);
+    return FindExtension(kGLExtensions, name);
 }
 
 bool ExtensionManager::initializeGL(OpenGLExtension e) {
-    return e < kFirstWGL && (this->*sGroupLoaders_[e])();
+    // A WGL capability has no loader here.
+    return e < UNKNOWN_OPENGL_EXTENSION && sGroupLoaders_[e] && (this->*sGroupLoaders_[e])();
 }
 
 bool ExtensionManager::initialize(OpenGLExtension e) {
@@ -271,7 +258,7 @@ void ExtensionManager::tryInitializing(OpenGLExtension e, bool required) {
 }
 
 FunctionTable const &ExtensionManager::table() const {
-    ORU_ASSERT(tableExt_.get() != 0);
+    ORU_ASSERT_TEXT("tableExt_.get() != 0", tableExt_);
     return *tableExt_;
 }
 
@@ -328,6 +315,34 @@ bool ExtensionManager::supportsRenderToTexture() const {
 
 bool ExtensionManager::supportsRenderToTextureRectangle() const {
     return isSupported(WGL_NV_RENDER_TEXTURE_RECTANGLE);
+}
+
+bool ExtensionManager::testFloatFiltering() {
+    return isSupported(WGL_ARB_RENDER_TEXTURE) && internal::FiltersFloatsLinearly();
+}
+
+bool ExtensionManager::testHalfFiltering() {
+    return isSupported(WGL_ARB_RENDER_TEXTURE) && internal::FiltersHalvesLinearly();
+}
+
+bool ExtensionManager::supportsFloatFiltering() {
+    if (!floatFiltering_.isKnown) {
+        floatFiltering_.value =
+            supportsFloatingPointTextures() && Passes([this] { return testFloatFiltering(); });
+        floatFiltering_.isKnown = true;
+    }
+    return floatFiltering_.value;
+}
+
+bool ExtensionManager::supportsHalfFiltering() {
+    if (!isSupported(GL_EXT_GPU_SHADER4))
+        return false;
+    if (!halfFiltering_.isKnown) {
+        halfFiltering_.value =
+            supports16BitFloat() && Passes([this] { return testHalfFiltering(); });
+        halfFiltering_.isKnown = true;
+    }
+    return halfFiltering_.value;
 }
 
 unsigned int ExtensionManager::numberOfTextureUnits() const {

@@ -4,9 +4,9 @@
 #include "oru/core/utility/export.h"
 #include "oru/core/utility/sharedptr.h"
 #include "oru/core/utility/windowsforward.h"
+#include "oru/oru_ogl/displaydevicekey.h"
 #include "oru/oru_ogl/extensionator/functiontable.h"
 #include "oru/oru_ogl/extensionator/openglextension.h"
-#include "oru/oru_ogl/ogl/displaydevicekey.h"
 
 #include <cstddef>
 #include <iosfwd>
@@ -44,7 +44,7 @@ public:
     enum Vendor : unsigned int { VENDOR_OTHER = 0, VENDOR_AMD, VENDOR_NVIDIA, VENDOR_INTEL };
 
     /// The options that each new context and record copies; kept for the host, the layer acts on
-    /// none of them.
+    /// none of them. `Library::InitOptions` has the first two for the library as a whole.
     class InitOptions {
     public:
         bool throwOnNullContext() const { return throwOnNullContext_; }
@@ -81,8 +81,8 @@ public:
     /// @{
 
     /// The record of the calling thread's current context.
-    /// @return null when there is none and the library is initialized
-    /// @throws InternalException when there is none and the library is not initialized
+    /// @return null when there is none and the library is initialised
+    /// @throws InternalException when there is none and the library is not initialised
     static ExtensionManager *Instance();
 
     /// The record of a rendering context; results and failures as above.
@@ -95,7 +95,7 @@ public:
 
     /// The function table of the calling thread's current context, whose record is made when it has
     /// none (a context that the host created itself).
-    /// @throws InternalException when there is no record and the library is not initialized, or
+    /// @throws InternalException when there is no record and the library is not initialised, or
     ///         when the context does not even tell its version
     static FunctionTable const &CurrentTable();
 
@@ -123,7 +123,7 @@ public:
 
     /// The record of a context's display device, built when it does not exist yet.
     /// @return for a null context null
-    /// @throws InternalException for a null context while the library is not initialized, and as
+    /// @throws InternalException for a null context while the library is not initialised, and as
     ///         above
     static ExtensionManager *Instance(Context const *context);
 
@@ -269,19 +269,20 @@ private:
     void climbVersionLadder();
     void readExtensions();
     void readWGLExtensions();
-    void tryInitializing(OpenGLExtension e, bool required);
     bool testFloatFiltering();
     bool testHalfFiltering();
     bool loadGroup(std::size_t first, std::size_t count);
     std::string getExtensionsString() const;
     static void TokenizeExtensionString(std::string const &text, std::vector<std::string> &out);
+    // Called by nobody; has its place in the binary interface.
+    void tryInitializing(OpenGLExtension e, bool required);
     CreateContextAttribs getWglCreateContextAttribsPtr() const {
         return createContextAttribs_;
     }
 
-    static GroupLoader const sGroupLoaders_[];
+    static GroupLoader const sGroupLoaders_[]; // by capability, null for those of WGL
     static InitOptions sInitOptions_;
-    static ExtensionManager *sCachedNullExtMgrInstance_;
+    static ExtensionManager *sCachedNullExtMgrInstance_; // the answer without a context: null
 
     CreateContextAttribs createContextAttribs_ = nullptr;
     std::set<OpenGLExtension> supported_;

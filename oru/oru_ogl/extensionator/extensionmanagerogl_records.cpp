@@ -1,21 +1,16 @@
 // Where capability records are kept and how the one of a device or context is found or made.
 #include "oru/core/exceptions/checks.h"
-#include "oru/core/utility/scopedptr.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/internal/contextregistry.h"
+#include "oru/oru_ogl/extensionator/internal/contextservices.h"
 #include "oru/oru_ogl/extensionator/openglinterceptor.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
-#include "oru/oru_ogl/libraryogl.h"
-#include "oru/oru_ogl/ogl/context.h"
-#include "oru/oru_ogl/ogl/internal/contextbootstrap_win.h"
-#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 
 #include <tbb/concurrent_hash_map.h>
 #include <tbb/spin_mutex.h>
 
 namespace ORU::OGL {
 
-using internal::ContextBootstrap;
 using internal::ContextRegistry;
 
 namespace {
@@ -63,7 +58,7 @@ void ExtensionManager::SetInitOptions(InitOptions const &options) {
 }
 
 ExtensionManager *ExtensionManager::NullExtensionManager() {
-    if (!Library::IsInitialized())
+    if (!internal::IsLibraryInitialized())
         ORU_THROW_INTERNAL("OGL Library must be initialized to use Instance()");
     return sCachedNullExtMgrInstance_;
 }
@@ -120,7 +115,7 @@ ExtensionManager *ExtensionManager::Instance(DisplayDeviceKey const &key) {
 }
 
 ExtensionManager *ExtensionManager::Instance(Context const *context) {
-    return context ? Instance(context->displayDeviceKey()) : NullExtensionManager();
+    return context ? Instance(internal::DisplayDeviceOf(*context)) : NullExtensionManager();
 }
 
 ExtensionManager *ExtensionManager::Find(DisplayDeviceKey const &key) {
@@ -129,23 +124,25 @@ ExtensionManager *ExtensionManager::Find(DisplayDeviceKey const &key) {
 }
 
 ExtensionManager *ExtensionManager::Create(DisplayDeviceKey const &key) {
-    ScopedContextWrapper const restoreCurrent;
-    ContextBootstrap bootstrap(key);
-    bootstrap.makeCurrent();
-    auto const record = MakeShared(ORU_NEW ExtensionManager(&bootstrap));
-    if (TheDeviceRegistry().insert(DeviceRegistry::value_type(key.deviceID, record)))
-        return record.get();
-    return Find(key); // another thread was first; this record goes with its pointer
+    ExtensionManager *result = nullptr;
+    internal::WithBootstrapContext(key, [&key, &result](Context *bootstrap) {
+        auto const record = MakeShared(ORU_NEW ExtensionManager(bootstrap));
+        if (TheDeviceRegistry().insert(DeviceRegistry::value_type(key.deviceID, record)))
+            result = record.get();
+        else
+            result = Find(key); // another thread was first; this record goes with its pointer
+    });
+    return result;
 }
 
 void ExtensionManager::RegisterContext(Context const &context) {
-    ExtensionManager *const record = Instance(context.displayDeviceKey());
-    ContextRegistry::Insert(context.renderContext(), record, &record->table());
+    ExtensionManager *const record = Instance(internal::DisplayDeviceOf(context));
+    ContextRegistry::Insert(internal::RenderContextOf(context), record, &record->table());
 }
 
 void ExtensionManager::UnRegisterContext(Context const &context) {
-    bool const bFound = ContextRegistry::Erase(context.renderContext());
-    ORU_ASSERT(bFound);
+    bool const wasRegistered = ContextRegistry::Erase(internal::RenderContextOf(context));
+    ORU_ASSERT_TEXT("bFound", wasRegistered);
 }
 
 void ExtensionManager::Terminate() {

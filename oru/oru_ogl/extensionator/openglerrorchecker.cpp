@@ -9,39 +9,24 @@ namespace ORU::OGL {
 OpenGLErrorChecker::~OpenGLErrorChecker() = default;
 
 unsigned char const *OpenGLErrorChecker::GetOpenGLErrorString(unsigned int error) {
-    char const *text = "Unspecified GL error";
+#define ORU_ERROR_NAME(Error)                                                                      \
+    case Error:                                                                                    \
+        return reinterpret_cast<unsigned char const *>(#Error)
+
     switch (error) {
-    case GL_INVALID_ENUM:
-        text = "GL_INVALID_ENUM";
-        break;
-    case GL_INVALID_VALUE:
-        text = "GL_INVALID_VALUE";
-        break;
-    case GL_INVALID_OPERATION:
-        text = "GL_INVALID_OPERATION";
-        break;
-    case GL_STACK_OVERFLOW:
-        text = "GL_STACK_OVERFLOW";
-        break;
-    case GL_STACK_UNDERFLOW:
-        text = "GL_STACK_UNDERFLOW";
-        break;
-    case GL_OUT_OF_MEMORY:
-        text = "GL_OUT_OF_MEMORY";
-        break;
-    case GL_INVALID_FRAMEBUFFER_OPERATION:
-        text = "GL_INVALID_FRAMEBUFFER_OPERATION";
-        break;
-    case GL_CONTEXT_LOST:
-        text = "GL_CONTEXT_LOST";
-        break;
-    case GL_TABLE_TOO_LARGE:
-        text = "GL_TABLE_TOO_LARGE";
-        break;
+        ORU_ERROR_NAME(GL_INVALID_ENUM);
+        ORU_ERROR_NAME(GL_INVALID_VALUE);
+        ORU_ERROR_NAME(GL_INVALID_OPERATION);
+        ORU_ERROR_NAME(GL_STACK_OVERFLOW);
+        ORU_ERROR_NAME(GL_STACK_UNDERFLOW);
+        ORU_ERROR_NAME(GL_OUT_OF_MEMORY);
+        ORU_ERROR_NAME(GL_INVALID_FRAMEBUFFER_OPERATION);
+        ORU_ERROR_NAME(GL_CONTEXT_LOST);
+        ORU_ERROR_NAME(GL_TABLE_TOO_LARGE);
     default:
-        break;
+        return reinterpret_cast<unsigned char const *>("Unspecified GL error");
     }
-    return reinterpret_cast<unsigned char const *>(text);
+#undef ORU_ERROR_NAME
 }
 
 void ThrowOpenGLError(char const *file, unsigned int line, unsigned int error) {

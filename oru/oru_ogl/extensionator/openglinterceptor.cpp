@@ -21,7 +21,8 @@ OpenGLInterceptor *OpenGLInterceptor::CreateErrorChecker() {
 void OpenGLInterceptor::Destroy() {
     if (!sInterceptor_)
         return;
-    ORU_ENFORCE(dynamic_cast<OpenGLErrorChecker *>(sInterceptor_) != NULL);
+    ORU_ENFORCE_TEXT("dynamic_cast<OpenGLErrorChecker *>(sInterceptor_) != NULL",
+                     dynamic_cast<OpenGLErrorChecker *>(sInterceptor_));
     ORUDeleter<OpenGLInterceptor>()(sInterceptor_);
     sInterceptor_ = nullptr;
 }

@@ -36,6 +36,7 @@ public:
     static void Destroy();
 
     /// Makes a decorator the first link. It stays the caller's: pop it before it is destroyed.
+    /// An InterceptorScope does both.
     void addInterceptor(OpenGLInterceptorDecorator *decorator);
 
     /// Takes the first link off the chain when it is a decorator.

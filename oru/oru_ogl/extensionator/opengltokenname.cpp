@@ -5,6 +5,7 @@
 
 #include <array>
 #include <cstddef>
+#include <iterator>
 
 namespace ORU::OGL::internal {
 
@@ -12,9 +13,8 @@ namespace {
 
 constexpr OpenGLToken kTokens[] = {
 #define ORU_GL_TOKEN(Value, Name) {Value, sizeof(Name) - 1, Name},
-#include "oru/oru_ogl/extensionator/opengltokens.inc"
+#include "oru/oru_ogl/extensionator/internal/opengltokens.inc"
 };
-constexpr std::size_t kTokenCount = sizeof kTokens / sizeof *kTokens;
 
 constexpr OpenGLToken kUnknown = {0, sizeof("Unknown Token") - 1, "Unknown Token"};
 
@@ -47,7 +47,8 @@ struct TokenIndex {
 
     constexpr TokenIndex() {
         std::uint8_t pages = 0;
-        for (; pagedRows < kTokenCount && kTokens[pagedRows].value < kPagedValues; ++pagedRows) {
+        for (; pagedRows < std::size(kTokens) && kTokens[pagedRows].value < kPagedValues;
+             ++pagedRows) {
             GLenum const value = kTokens[pagedRows].value;
             std::uint8_t &page = pageOf[value / kPageSize];
             if (page == 0)
@@ -68,7 +69,7 @@ OpenGLToken const &FindOpenGLToken(GLenum value) {
         std::size_t const row = kIndex.rowPlusOne[page * kPageSize + value % kPageSize];
         return row ? kTokens[row - 1] : kUnknown;
     }
-    for (std::size_t row = kIndex.pagedRows; row < kTokenCount; ++row)
+    for (std::size_t row = kIndex.pagedRows; row < std::size(kTokens); ++row)
         if (kTokens[row].value == value)
             return kTokens[row];
     return kUnknown;

@@ -11,13 +11,10 @@ namespace ORU::OGL {
 /// it.
 ///
 ///     std::ofstream file("gl.txt");
-///     OpenGLTracer tracer(file);
-///     OpenGLInterceptor::Instance()->addInterceptor(&tracer);
-///     …
-///     OpenGLInterceptor::Instance()->popInterceptor();
+///     InterceptorScope<OpenGLTracer> const tracer(file);
 ///
-/// writes lines such as `app.cpp:86: glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MIN_FILTER, 9729)`.
-/// The form of an argument follows its type in the OpenGL prototype:
+/// writes, until the scope ends, lines such as `app.cpp:86: glTexParameteri(GL_TEXTURE_2D,
+/// GL_TEXTURE_MIN_FILTER, 9729)`. The form of an argument follows its type in the OpenGL prototype:
 /// - GLenum: the constant's name (see ORUOGLTokenName); GLboolean: GL_TRUE or GL_FALSE;
 /// - integers and bit masks in the stream's integer format, a GLhandleARB after "(GLhandleARB)";
 ///   GLbyte and GLubyte as one character;

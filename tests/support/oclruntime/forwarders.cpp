@@ -27,7 +27,7 @@ FunctionTable LoadSystem() {
 #define ORU_CL_SLOT(Extension, Name)                                                               \
     table.Name = reinterpret_cast<decltype(table.Name)>(                                           \
         reinterpret_cast<void *>(GetProcAddress(module, #Name)));
-#include "oru/oru_ocl/functiontable_slots.inc"
+#include "oru/oru_ocl/internal/functiontable_slots.inc"
     return table;
 }
 

@@ -15,39 +15,21 @@ class WGLInterceptorDecorator;
 /// and not locked.
 class ORU_API WGLInterceptor {
 public:
-    virtual BOOL wcgmCopyContext(char const *file, unsigned int line, HGLRC source,
-                                 HGLRC destination, UINT mask) = 0;
-    virtual HGLRC wcgmCreateContext(char const *file, unsigned int line, HDC dc) = 0;
-    virtual HGLRC wcgmCreateLayerContext(char const *file, unsigned int line, HDC dc,
-                                         int layer) = 0;
-    virtual BOOL wcgmDeleteContext(char const *file, unsigned int line, HGLRC context) = 0;
-    virtual HGLRC wcgmGetCurrentContext(char const *file, unsigned int line) = 0;
-    virtual HDC wcgmGetCurrentDC(char const *file, unsigned int line) = 0;
-    virtual PROC wcgmGetProcAddress(char const *file, unsigned int line, char const *name) = 0;
-    virtual BOOL wcgmMakeCurrent(char const *file, unsigned int line, HDC dc, HGLRC context) = 0;
-    virtual BOOL wcgmShareLists(char const *file, unsigned int line, HGLRC source,
-                                HGLRC destination) = 0;
-    virtual BOOL wcgmUseFontBitmapsA(char const *file, unsigned int line, HDC dc, DWORD first,
-                                     DWORD count, DWORD listBase) = 0;
-    virtual BOOL wcgmUseFontBitmapsW(char const *file, unsigned int line, HDC dc, DWORD first,
-                                     DWORD count, DWORD listBase) = 0;
-    virtual BOOL wcgmSwapBuffers(char const *file, unsigned int line, HDC dc) = 0;
-    virtual int wcgmSetLayerPaletteEntries(char const *file, unsigned int line, HDC dc, int layer,
-                                           int start, int count, COLORREF const *entries) = 0;
-    virtual int wcgmGetLayerPaletteEntries(char const *file, unsigned int line, HDC dc, int layer,
-                                           int start, int count, COLORREF *entries) = 0;
-    virtual BOOL wcgmRealizeLayerPalette(char const *file, unsigned int line, HDC dc, int layer,
-                                         BOOL realize) = 0;
-    virtual BOOL wcgmSwapLayerBuffers(char const *file, unsigned int line, HDC dc, UINT planes) = 0;
+#define ORU_WGL_OPERATION(Result, Name, Parameters, Arguments)                                     \
+    virtual Result wcgm##Name Parameters = 0;
+#include "oru/oru_ogl/extensionator/wgl/wgloperations.inc"
 
     /// The first link of the chain; the first call makes the WGLErrorChecker.
-    static WGLInterceptor *Instance() { return sInterceptor_ ? sInterceptor_ : CreateChecker(); }
+    static WGLInterceptor *Instance() {
+        return sInterceptor_ ? sInterceptor_ : CreateChecker();
+    }
 
     /// Destroys the last link, so that the chain is empty.
     /// @throws InternalException when a decorator is still pushed; nothing is then destroyed
     static void Destroy();
 
     /// Makes a decorator the first link. It stays the caller's: pop it before it is destroyed.
+    /// An InterceptorScope does both.
     void addInterceptor(WGLInterceptorDecorator *decorator);
 
     /// Takes the first link off the chain when it is a decorator.
@@ -67,7 +49,7 @@ private:
 };
 
 /// Base of WGL decorators: knows the next link. A concrete decorator implements every operation and
-/// forwards it to `interceptor()`.
+/// forwards it to `interceptor()`; derive from WGLForwarder to write only those of interest.
 class ORU_API WGLInterceptorDecorator : public WGLInterceptor {
 public:
     /// @param next the next link, not owned; pushing the decorator sets it anew
@@ -83,44 +65,21 @@ private:
     WGLInterceptor *next_;
 };
 
-/// The last link of the WGL chain: calls the platform's function and returns its result.
+/// The last link of the WGL chain: calls the platform's function and returns its result. It checks
+/// nothing, whatever the name says, which hosts know: WGL reports failures by its results.
 class ORU_API WGLErrorChecker : public WGLInterceptor {
 public:
     WGLErrorChecker() = default;
 
-    BOOL wcgmCopyContext(char const *, unsigned int, HGLRC, HGLRC, UINT) override;
-    HGLRC wcgmCreateContext(char const *, unsigned int, HDC) override;
-    HGLRC wcgmCreateLayerContext(char const *, unsigned int, HDC, int) override;
-    BOOL wcgmDeleteContext(char const *, unsigned int, HGLRC) override;
-    HGLRC wcgmGetCurrentContext(char const *, unsigned int) override;
-    HDC wcgmGetCurrentDC(char const *, unsigned int) override;
-    PROC wcgmGetProcAddress(char const *, unsigned int, char const *) override;
-    BOOL wcgmMakeCurrent(char const *, unsigned int, HDC, HGLRC) override;
-    BOOL wcgmShareLists(char const *, unsigned int, HGLRC, HGLRC) override;
-    BOOL wcgmUseFontBitmapsA(char const *, unsigned int, HDC, DWORD, DWORD, DWORD) override;
-    BOOL wcgmUseFontBitmapsW(char const *, unsigned int, HDC, DWORD, DWORD, DWORD) override;
-    BOOL wcgmSwapBuffers(char const *, unsigned int, HDC) override;
-    int wcgmSetLayerPaletteEntries(char const *, unsigned int, HDC, int, int, int,
-                                   COLORREF const *) override;
-    int wcgmGetLayerPaletteEntries(char const *, unsigned int, HDC, int, int, int,
-                                   COLORREF *) override;
-    BOOL wcgmRealizeLayerPalette(char const *, unsigned int, HDC, int, BOOL) override;
-    BOOL wcgmSwapLayerBuffers(char const *, unsigned int, HDC, UINT) override;
+#define ORU_WGL_OPERATION(Result, Name, Parameters, Arguments)                                     \
+    Result wcgm##Name Parameters override;
+#include "oru/oru_ogl/extensionator/wgl/wgloperations.inc"
 
     virtual ~WGLErrorChecker();
 
     // Reachable only on the checker itself, not through the chain.
-    virtual BOOL wcgmUseFontOutlinesA(char const *file, unsigned int line, HDC dc, DWORD first,
-                                      DWORD count, DWORD listBase, FLOAT deviation, FLOAT extrusion,
-                                      int format, _GLYPHMETRICSFLOAT *metrics);
-    virtual BOOL wcgmUseFontOutlinesW(char const *file, unsigned int line, HDC dc, DWORD first,
-                                      DWORD count, DWORD listBase, FLOAT deviation, FLOAT extrusion,
-                                      int format, _GLYPHMETRICSFLOAT *metrics);
-    virtual BOOL wcgmDescribeLayerPlane(char const *file, unsigned int line, HDC dc,
-                                        int pixelFormat, int layer, UINT bytes,
-                                        tagLAYERPLANEDESCRIPTOR *descriptor);
-    virtual DWORD wcgmSwapMultipleBuffers(char const *file, unsigned int line, UINT count,
-                                          _WGLSWAP const *swaps);
+#define ORU_WGL_OPERATION(Result, Name, Parameters, Arguments) virtual Result wcgm##Name Parameters;
+#include "oru/oru_ogl/extensionator/wgl/wglcheckeroperations.inc"
 };
 
 } // namespace ORU::OGL

@@ -1,6 +1,7 @@
 // The throw-away context on which a display device's capabilities are read.
 #include "oru/oru_ogl/ogl/internal/contextbootstrap_win.h"
 
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -8,9 +9,7 @@
 namespace ORU::OGL::internal {
 
 ContextBootstrap::ContextBootstrap(DisplayDeviceKey const &key) : Context(key) {
-    auto const origin = DisplayOrigin(key.adapterName, true);
-    window_ = MakeScoped(
-        ORU_NEW InternalWindow(static_cast<short>(origin.x), static_cast<short>(origin.y)));
+    window_ = MakeScoped(ORU_NEW InternalWindow(DisplayOrigin(key.adapterName, true)));
     deviceContext_ = ::GetDC(window_->hWnd());
 
     // Only a context that is current when this one is made can offer the function.
@@ -28,13 +27,11 @@ ContextBootstrap::ContextBootstrap(DisplayDeviceKey const &key) : Context(key) {
 }
 
 ContextBootstrap::~ContextBootstrap() {
-    try {
+    DropExceptions([this] {
         ORU_WGL(MakeCurrent, nullptr, nullptr);
         destroyContext();
         window_.reset();
-    } catch (...) {
-        // A destructor has nobody to report to.
-    }
+    });
 }
 
 } // namespace ORU::OGL::internal

@@ -1,7 +1,7 @@
 // Finds out by drawing whether an implementation filters floating-point textures linearly.
 #include "oru/core/utility/dropexceptions.h"
-#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/contextservices.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
@@ -12,13 +12,13 @@
 #include <array>
 #include <cstddef>
 
-namespace ORU::OGL {
+namespace ORU::OGL::internal {
 
 namespace {
 
-GLsizei const kTestedSize = 16;
-GLsizei const kShownSize = 32;
-std::size_t const kChannels = 3;
+constexpr GLsizei kTestedSize = 16;
+constexpr GLsizei kShownSize = 32;
+constexpr std::size_t kChannels = 3;
 
 /// A rectangle from the origin to (right, 1), with texture coordinates that equal the positions.
 void DrawRectangle(GLfloat right, bool textured) {
@@ -95,46 +95,14 @@ bool FiltersLinearly(Texture::InternalFormat format) {
     return HasGrey(shown);
 }
 
-/// What a test answers; no when it fails with whatever exception.
-template<class Test>
-bool Passes(Test test) {
-    try {
-        return test();
-    } catch (...) {
-        return false;
-    }
-}
-
 } // namespace
 
-bool ExtensionManager::testFloatFiltering() {
-    return isSupported(WGL_ARB_RENDER_TEXTURE) &&
-           FiltersLinearly(Texture::INTERNALFORMAT_RGBA32F_ARB);
+bool FiltersFloatsLinearly() {
+    return FiltersLinearly(Texture::INTERNALFORMAT_RGBA32F_ARB);
 }
 
-bool ExtensionManager::testHalfFiltering() {
-    return isSupported(WGL_ARB_RENDER_TEXTURE) &&
-           FiltersLinearly(Texture::INTERNALFORMAT_RGBA16F_ARB);
+bool FiltersHalvesLinearly() {
+    return FiltersLinearly(Texture::INTERNALFORMAT_RGBA16F_ARB);
 }
 
-bool ExtensionManager::supportsFloatFiltering() {
-    if (!floatFiltering_.isKnown) {
-        floatFiltering_.value =
-            supportsFloatingPointTextures() && Passes([this] { return testFloatFiltering(); });
-        floatFiltering_.isKnown = true;
-    }
-    return floatFiltering_.value;
-}
-
-bool ExtensionManager::supportsHalfFiltering() {
-    if (!isSupported(GL_EXT_GPU_SHADER4))
-        return false;
-    if (!halfFiltering_.isKnown) {
-        halfFiltering_.value =
-            supports16BitFloat() && Passes([this] { return testHalfFiltering(); });
-        halfFiltering_.isKnown = true;
-    }
-    return halfFiltering_.value;
-}
-
-} // namespace ORU::OGL
+} // namespace ORU::OGL::internal
