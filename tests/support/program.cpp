@@ -8,7 +8,6 @@
 #include <algorithm>
 #include <fstream>
 #include <iterator>
-#include <sstream>
 #include <system_error>
 
 namespace apps_test {
@@ -48,18 +47,39 @@ private:
 
 } // namespace
 
-std::vector<std::string> Outcome::errorLines() const {
-    std::vector<std::string> lines;
-    std::istringstream text(errors);
-    for (std::string line; std::getline(text, line);)
-        lines.push_back(line);
-    return lines;
-}
-
 fs::path ProgramFolder() {
     wchar_t path[MAX_PATH];
     ::GetModuleFileNameW(nullptr, path, MAX_PATH);
     return fs::path(path).parent_path();
+}
+
+Process::Process(std::string const &name, std::vector<std::string> const &arguments,
+                 fs::path const &folder, void *output, void *errors) {
+    std::wstring command = Quoted(ProgramFolder() / name);
+    for (std::string const &argument : arguments)
+        command += L" " + Quoted(App::ToPath(argument));
+    STARTUPINFOW startup = {};
+    startup.cb = sizeof startup;
+    startup.dwFlags = output ? STARTF_USESTDHANDLES : 0;
+    startup.hStdOutput = output;
+    startup.hStdError = errors;
+    PROCESS_INFORMATION process = {};
+    ::CreateProcessW(nullptr, command.data(), nullptr, nullptr, TRUE, 0, nullptr, folder.c_str(),
+                     &startup, &process);
+    ::CloseHandle(process.hThread);
+    handle_ = process.hProcess;
+}
+
+Process::~Process() {
+    ::TerminateProcess(handle_, 99);
+    ::CloseHandle(handle_);
+}
+
+int Process::exitCode() const {
+    constexpr DWORD kMilliseconds = 150000;
+    DWORD code = 0;
+    bool const ended = ::WaitForSingleObject(handle_, kMilliseconds) == WAIT_OBJECT_0;
+    return ended && ::GetExitCodeProcess(handle_, &code) ? static_cast<int>(code) : -1;
 }
 
 Outcome RunProgram(std::string const &name, std::vector<std::string> const &arguments,
@@ -67,26 +87,9 @@ Outcome RunProgram(std::string const &name, std::vector<std::string> const &argu
     TemporaryFolder const captures;
     CaptureFile const output(captures.path() / "output");
     CaptureFile const errors(captures.path() / "errors");
-
-    std::wstring command = Quoted(ProgramFolder() / name);
-    for (std::string const &argument : arguments)
-        command += L" " + Quoted(App::ToPath(argument));
-
-    STARTUPINFOW startup = {};
-    startup.cb = sizeof startup;
-    startup.dwFlags = STARTF_USESTDHANDLES;
-    startup.hStdOutput = output.handle();
-    startup.hStdError = errors.handle();
-    PROCESS_INFORMATION process = {};
-    if (!::CreateProcessW(nullptr, command.data(), nullptr, nullptr, TRUE, 0, nullptr,
-                          folder.c_str(), &startup, &process))
-        return Outcome();
-    ::WaitForSingleObject(process.hProcess, INFINITE);
-    DWORD exitCode = 0;
-    ::GetExitCodeProcess(process.hProcess, &exitCode);
-    ::CloseHandle(process.hThread);
-    ::CloseHandle(process.hProcess);
-    return {static_cast<int>(exitCode), output.text(), errors.text()};
+    Process const process(name, arguments, folder, output.handle(), errors.handle());
+    int const exitCode = process.exitCode();
+    return {exitCode, output.text(), errors.text()};
 }
 
 TemporaryFolder::TemporaryFolder() {
