@@ -23,13 +23,13 @@ public:
     };
 
     CountingHooks() {
-        Current() = this;
+        sCurrent_ = this;
         ORU::SetAllocationDeallocationFunction(Allocate, Free);
     }
     ~CountingHooks() {
         ORU_private::gAllocationFunction = nullptr;
         ORU_private::gDeallocationFunction = nullptr;
-        Current() = nullptr;
+        sCurrent_ = nullptr;
     }
     CountingHooks(CountingHooks const &) = delete;
     CountingHooks &operator=(CountingHooks const &) = delete;
@@ -45,25 +45,22 @@ public:
     int wrongReleases() const { return wrongReleases_; }
 
 private:
-    static CountingHooks *&Current() {
-        static CountingHooks *current = nullptr;
-        return current;
-    }
+    inline static CountingHooks *sCurrent_ = nullptr;
 
     static void *Allocate(std::size_t size, ORU::MemoryType type, char const *file, int line) {
-        Current()->files_.insert(file);
-        if (++Current()->allocations_ == Current()->failAt_)
+        sCurrent_->files_.insert(file);
+        if (++sCurrent_->allocations_ == sCurrent_->failAt_)
             throw std::bad_alloc();
         void *const p = std::malloc(size);
-        Current()->outstanding_[p] = Allocation{size, type, file, line};
+        sCurrent_->outstanding_[p] = Allocation{size, type, file, line};
         return p;
     }
 
     static void Free(void *p, ORU::MemoryType type, char const *, int) {
-        auto &outstanding = Current()->outstanding_;
+        auto &outstanding = sCurrent_->outstanding_;
         auto const found = outstanding.find(p);
         if (found == outstanding.end() || found->second.type != type) {
-            ++Current()->wrongReleases_;
+            ++sCurrent_->wrongReleases_;
             return;
         }
         outstanding.erase(found);
