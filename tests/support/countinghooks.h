@@ -6,7 +6,6 @@
 #include <cstdlib>
 #include <map>
 #include <new>
-#include <set>
 #include <string>
 
 namespace oru_test {
@@ -37,8 +36,6 @@ public:
     int allocations() const { return allocations_; }
     /// The allocation that runs out of memory, counted from 1.
     void failAt(int allocation) { failAt_ = allocation; }
-    /// The sources that allocated.
-    std::set<std::string> const &files() const { return files_; }
     /// What is not freed yet, by address.
     std::map<void *, Allocation> const &outstanding() const { return outstanding_; }
     /// Releases of what was not allocated here, or under another type.
@@ -48,7 +45,6 @@ private:
     inline static CountingHooks *sCurrent_ = nullptr;
 
     static void *Allocate(std::size_t size, ORU::MemoryType type, char const *file, int line) {
-        sCurrent_->files_.insert(file);
         if (++sCurrent_->allocations_ == sCurrent_->failAt_)
             throw std::bad_alloc();
         void *const p = std::malloc(size);
@@ -69,7 +65,6 @@ private:
 
     int allocations_ = 0;
     int failAt_ = 0;
-    std::set<std::string> files_;
     int wrongReleases_ = 0;
     std::map<void *, Allocation> outstanding_;
 };

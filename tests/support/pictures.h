@@ -5,28 +5,17 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdint>
 #include <cstring>
 #include <random>
 
 namespace apps_test {
 
-/// Stored values by pixel and channel, whatever their size.
+/// Stored values by pixel and channel, whatever their size; the low byte comes first.
 inline unsigned int Value(App::Image const &image, std::size_t index) {
-    if (image.bitsPerChannel == 8)
-        return image.pixels[index];
-    std::uint16_t value;
-    std::memcpy(&value, image.pixels.data() + 2 * index, 2);
+    std::size_t const bytes = image.bitsPerChannel / 8;
+    unsigned int value = 0;
+    std::memcpy(&value, image.pixels.data() + bytes * index, bytes);
     return value;
-}
-
-inline void SetValue(App::Image &image, std::size_t index, unsigned int value) {
-    if (image.bitsPerChannel == 8) {
-        image.pixels[index] = static_cast<unsigned char>(value);
-        return;
-    }
-    auto const value16 = static_cast<std::uint16_t>(value);
-    std::memcpy(image.pixels.data() + 2 * index, &value16, 2);
 }
 
 inline std::size_t ValueCount(App::Image const &image) {
@@ -52,10 +41,11 @@ inline App::Image RandomPicture(App::Shape const &shape, unsigned int seed) {
 /// A picture whose pixels go through all the values, another order in each channel.
 inline App::Image EveryValue(unsigned int channels, unsigned int bits) {
     App::Image image({256, bits == 8 ? 1u : 256u, channels, bits});
-    std::size_t const pixels = image.width * image.height;
-    for (std::size_t i = 0; i < ValueCount(image); ++i)
-        SetValue(image, i,
-                 static_cast<unsigned int>(i / channels * (2 * (i % channels) + 1) % pixels));
+    for (std::size_t i = 0; i < ValueCount(image); ++i) {
+        // Odd factors reach every value; what is more than the levels is not copied.
+        std::size_t const value = i / channels * (2 * (i % channels) + 1);
+        std::memcpy(image.pixels.data() + bits / 8 * i, &value, bits / 8);
+    }
     return image;
 }
 

@@ -12,40 +12,7 @@
 
 namespace apps_test {
 
-namespace {
-
 namespace fs = std::filesystem;
-
-/// One argument as the C run-time of the program takes it apart again. (None here ends in a
-/// backslash or holds a quote.)
-std::wstring Quoted(fs::path const &argument) {
-    return L"\"" + argument.wstring() + L"\"";
-}
-
-/// A file that a child process may write to.
-class CaptureFile {
-public:
-    explicit CaptureFile(fs::path const &path) : path_(path) {
-        SECURITY_ATTRIBUTES inheritable = {sizeof inheritable, nullptr, TRUE};
-        handle_ = ::CreateFileW(path_.c_str(), GENERIC_WRITE, FILE_SHARE_READ, &inheritable,
-                                CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
-    }
-    ~CaptureFile() { ::CloseHandle(handle_); }
-    CaptureFile(CaptureFile const &) = delete;
-    CaptureFile &operator=(CaptureFile const &) = delete;
-
-    HANDLE handle() const { return handle_; }
-    std::string text() const {
-        std::ifstream file(path_, std::ios::binary);
-        return std::string(std::istreambuf_iterator<char>(file), {});
-    }
-
-private:
-    fs::path path_;
-    HANDLE handle_;
-};
-
-} // namespace
 
 fs::path ProgramFolder() {
     wchar_t path[MAX_PATH];
@@ -53,11 +20,10 @@ fs::path ProgramFolder() {
     return fs::path(path).parent_path();
 }
 
-Process::Process(std::string const &name, std::vector<std::string> const &arguments,
-                 fs::path const &folder, void *output, void *errors) {
-    std::wstring command = Quoted(ProgramFolder() / name);
-    for (std::string const &argument : arguments)
-        command += L" " + Quoted(App::ToPath(argument));
+Process::Process(std::string const &name, std::string const &arguments, fs::path const &folder,
+                 void *output, void *errors) {
+    std::wstring command =
+        L"\"" + (ProgramFolder() / name).wstring() + L"\" " + App::ToPath(arguments).wstring();
     STARTUPINFOW startup = {};
     startup.cb = sizeof startup;
     startup.dwFlags = output ? STARTF_USESTDHANDLES : 0;
@@ -82,14 +48,22 @@ int Process::exitCode() const {
     return ended && ::GetExitCodeProcess(handle_, &code) ? static_cast<int>(code) : -1;
 }
 
-Outcome RunProgram(std::string const &name, std::vector<std::string> const &arguments,
-                   fs::path const &folder) {
+Outcome RunProgram(std::string const &name, std::string const &arguments, fs::path const &folder) {
     TemporaryFolder const captures;
-    CaptureFile const output(captures.path() / "output");
-    CaptureFile const errors(captures.path() / "errors");
-    Process const process(name, arguments, folder, output.handle(), errors.handle());
-    int const exitCode = process.exitCode();
-    return {exitCode, output.text(), errors.text()};
+    auto const fileFor = [&](char const *stream) {
+        SECURITY_ATTRIBUTES inheritable = {sizeof inheritable, nullptr, TRUE};
+        return ::CreateFileW((captures.path() / stream).c_str(), GENERIC_WRITE, FILE_SHARE_READ,
+                             &inheritable, CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
+    };
+    auto const textOf = [&](char const *stream) {
+        std::ifstream file(captures.path() / stream, std::ios::binary);
+        return std::string(std::istreambuf_iterator<char>(file), {});
+    };
+    HANDLE const output = fileFor("output"), errors = fileFor("errors");
+    int const exitCode = Process(name, arguments, folder, output, errors).exitCode();
+    ::CloseHandle(output);
+    ::CloseHandle(errors);
+    return {exitCode, textOf("output"), textOf("errors")};
 }
 
 TemporaryFolder::TemporaryFolder() {

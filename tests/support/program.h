@@ -13,10 +13,10 @@ std::filesystem::path ProgramFolder();
 /// A program that stands beside the test, running. What still runs when its owner goes is ended.
 class Process {
 public:
-    /// @param arguments UTF-8
+    /// @param arguments as on a command line, in UTF-8
     /// @param folder its current folder
     /// @param output, errors handles of its standard streams, if it is to have them
-    Process(std::string const &name, std::vector<std::string> const &arguments,
+    Process(std::string const &name, std::string const &arguments,
             std::filesystem::path const &folder, void *output = nullptr, void *errors = nullptr);
     ~Process();
     Process(Process const &) = delete;
@@ -36,7 +36,7 @@ struct Outcome {
 };
 
 /// Runs a program to its end.
-Outcome RunProgram(std::string const &name, std::vector<std::string> const &arguments,
+Outcome RunProgram(std::string const &name, std::string const &arguments,
                    std::filesystem::path const &folder);
 
 /// An empty folder that goes with all its files.

@@ -132,15 +132,4 @@ TEST(ImageFile, DamagedAnywhere) {
         }
 }
 
-// A write that fails leaves what was there and nothing else.
-TEST(ImageFile, WholeOrNotAtAll) {
-    TemporaryFolder const folder;
-    std::filesystem::create_directory(folder.path() / "taken.png");
-    Image const image = RandomPicture({2, 2, 3, 8}, 1);
-    EXPECT_FAILURE("cannot be written: there is a folder of this name",
-                   App::WriteImage(folder.path() / "taken.png", image));
-    EXPECT_THROW(App::WriteImage(folder.path() / "no folder" / "a.png", image), App::Failure);
-    EXPECT_EQ(folder.list(""), std::vector<std::string>{"taken.png"});
-}
-
 } // namespace

@@ -18,12 +18,12 @@ inline constexpr App::SizeLimit kPngLimit = {1000000};
 /// A folder of pictures and the program that runs in it.
 class DevelopFixture : public ::testing::Test {
 protected:
-    Outcome develop(std::vector<std::string> const &arguments) {
+    Outcome develop(std::string const &arguments) {
         return RunProgram("develop.exe", arguments, folder_.path());
     }
 
     /// Runs the program, which must not complain. @return what it tells
-    std::string tellsOf(std::vector<std::string> const &arguments) {
+    std::string tellsOf(std::string const &arguments) {
         Outcome const outcome = develop(arguments);
         EXPECT_EQ(outcome.exitCode, 0);
         EXPECT_EQ(outcome.errors, "");

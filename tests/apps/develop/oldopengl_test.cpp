@@ -19,19 +19,19 @@ TEST_F(DevelopOnOldOpenGL, WorksFromVersion3On) {
     write("colour.png", colour);
     write("grey.png", grey);
     if (version < "3.0") {
-        Outcome const outcome = develop({"grey.png"});
+        Outcome const outcome = develop("grey.png");
         EXPECT_EQ(outcome.exitCode, 1);
         EXPECT_THAT(outcome.errors,
                     testing::StartsWith("develop: GPU: OpenGL 3.0 is needed, this is " + version));
         return;
     }
-    EXPECT_THAT(tellsOf({"--exposure", "0.7", "--sharpen", "0", "colour.png", "grey.png"}),
+    EXPECT_THAT(tellsOf("--exposure 0.7 --sharpen 0 colour.png grey.png"),
                 HasSubstr("OpenGL " + version));
     EXPECT_LE(WorstError(colour, read("out/colour.png"), 0.7), Tolerance(colour));
     EXPECT_LE(WorstError(grey, read("out/grey.png"), 0.7), Tolerance(grey));
     // Sharpening and spots use shaders of their own.
     write("spots.txt", "9 9 5 1");
-    tellsOf({"--sharpen", "1", "--device", "none", "--spots", "spots.txt", "colour.png"});
+    tellsOf("--sharpen 1 --device none --spots spots.txt colour.png");
 }
 
 } // namespace

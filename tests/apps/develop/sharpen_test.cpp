@@ -43,34 +43,30 @@ using Sharpen = DevelopFixture;
 
 // Every kind of picture, also smaller than the blur, with little, usual and extreme settings.
 TEST_F(Sharpen, IsExactOnEveryPath) {
+    App::Shape const shapes[] = {{61, 37, 3, 8}, {50, 31, 4, 8},  {40, 7, 1, 8},
+                                 {19, 40, 2, 8}, {1, 1, 3, 8},    {33, 1, 3, 16},
+                                 {1, 45, 1, 16}, {40, 30, 2, 16}, {29, 30, 4, 16}};
     std::map<std::string, Image> pictures;
-    for (App::Shape const &shape : std::vector<App::Shape>{{61, 37, 3, 8},
-                                                           {50, 31, 4, 8},
-                                                           {40, 7, 1, 8},
-                                                           {19, 40, 2, 8},
-                                                           {1, 1, 3, 8},
-                                                           {33, 1, 3, 16},
-                                                           {1, 45, 1, 16},
-                                                           {40, 30, 2, 16},
-                                                           {29, 30, 4, 16}}) {
-        Image const image = RandomPicture(shape, shape.channels);
-        pictures[shape.description() + ".png"] = image;
-        write("in/" + shape.description() + ".png", image);
+    for (App::Shape const &shape : shapes) {
+        std::string const name = shape.description() + ".png";
+        pictures[name] = RandomPicture(shape, shape.channels);
+        write("in/" + name, pictures[name]);
     }
     struct Path {
-        std::string name, option, value;
+        std::string name, options;
         char const *tells; ///< what the program says about it
     };
-    Path const paths[] = {{"shared", "--opencl", App::ToText(ProgramFolder() / "ocl_runtime"),
+    Path const paths[] = {{"shared",
+                           "--opencl \"" + App::ToText(ProgramFolder() / "ocl_runtime") + "\"",
                            "on the texture shared with OpenGL"},
-                          {"copy", "--device", "0.0", "on a copy"},
-                          {"glsl", "--device", "none", "sharpening by GLSL: as wished"},
-                          {"bare", "--opencl", "in", "sharpening by GLSL: no OpenCL runtime"}};
+                          {"copy", "--device 0.0", "on a copy"},
+                          {"glsl", "--device none", "sharpening by GLSL: as wished"},
+                          {"bare", "--opencl in", "sharpening by GLSL: no OpenCL runtime"}};
     for (auto const &[amount, sigma] :
          std::map<std::string, std::string>{{"5", "0.3"}, {"2", "20"}}) {
         for (Path const &path : paths)
-            EXPECT_THAT(tellsOf({"--sharpen", amount, "--radius", sigma, "--exposure", "-0.5",
-                                 "--output", path.name + amount, path.option, path.value, "in"}),
+            EXPECT_THAT(tellsOf("--exposure -0.5 --sharpen " + amount + " --radius " + sigma + " " +
+                                path.options + " --output " + path.name + amount + " in"),
                         testing::HasSubstr(path.tells));
         for (auto const &[name, image] : pictures) {
             std::vector<double> const light = LightOf(image);

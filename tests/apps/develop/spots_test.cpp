@@ -8,6 +8,7 @@
 
 #include <map>
 #include <random>
+#include <tuple>
 
 using namespace apps_test;
 using App::Image;
@@ -127,10 +128,10 @@ using Spots = DevelopFixture;
 TEST_F(Spots, BaseAndFullFrame) {
     write("photo.png", RandomPicture({100, 50, 3, 16}, 1));
     write("spots.txt", "20 20 4 1");
-    tellsOf({"--sharpen", "1", "--output", "base", "photo.png"});
-    tellsOf({"--sharpen", "1", "--output", "full", "--spots", "spots.txt", "photo.png"});
-    std::string const text = tellsOf({"--sharpen", "1", "--output", "local", "--spots", "spots.txt",
-                                      "--base", "base/photo.png", "--report", "photo.png"});
+    tellsOf("--sharpen 1 --output base photo.png");
+    tellsOf("--sharpen 1 --output full --spots spots.txt photo.png");
+    std::string const text = tellsOf("--sharpen 1 --output local --spots spots.txt --base "
+                                     "base/photo.png --report photo.png");
     EXPECT_EQ(read("full/photo.png").pixels, read("local/photo.png").pixels);
     EXPECT_NE(read("full/photo.png").pixels, read("base/photo.png").pixels);
     EXPECT_THAT(text, testing::HasSubstr("pixels processed: 2.00 %"));
@@ -144,10 +145,8 @@ TEST_F(Spots, Texts) {
     };
     SpotList const spots = parse("# a face\r\n\r\n\t 30.5  +2e1\t12 -1 # brighter\n   \n#");
     ASSERT_EQ(spots.size(), 1u);
-    EXPECT_EQ(spots[0].x, 30.5);
-    EXPECT_EQ(spots[0].y, 20);
-    EXPECT_EQ(spots[0].radius, 12);
-    EXPECT_EQ(spots[0].stops, -1);
+    auto const [x, y, radius, stops] = spots[0];
+    EXPECT_EQ(std::make_tuple(x, y, radius, stops), std::make_tuple(30.5, 20, 12, -1));
 
     std::string const count = "4 numbers are needed: centre x, centre y, radius, exposure";
     std::map<std::string, std::string> const reasons = {{"1 2 3", count},

@@ -16,7 +16,7 @@ TEST(Gallery, DrawsItsPictures) {
     for (std::string const name :
          {"hello_offscreen", "float_texture", "streaming_upload", "blend_and_lines"}) {
         TemporaryFolder const folder;
-        Outcome const outcome = RunProgram(name + ".exe", {"picture.png"}, folder.path());
+        Outcome const outcome = RunProgram(name + ".exe", "picture.png", folder.path());
         EXPECT_EQ(0, outcome.exitCode);
         EXPECT_EQ("", outcome.errors);
         App::Image const wanted = App::ReadImage(ORU_EXPECTED_PICTURES "/" + name + ".png", kLimit);
@@ -27,11 +27,11 @@ TEST(Gallery, DrawsItsPictures) {
 
 TEST(Gallery, ReportsFailures) {
     TemporaryFolder const folder;
-    Outcome const usage = RunProgram("hello_offscreen.exe", {}, folder.path());
+    Outcome const usage = RunProgram("hello_offscreen.exe", "", folder.path());
     EXPECT_EQ(2, usage.exitCode);
     EXPECT_THAT(usage.errors, testing::HasSubstr("FILE"));
     Outcome const unwritable =
-        RunProgram("hello_offscreen.exe", {"missing/folder/picture.png"}, folder.path());
+        RunProgram("hello_offscreen.exe", "missing/folder/picture.png", folder.path());
     EXPECT_EQ(1, unwritable.exitCode);
     EXPECT_NE("", unwritable.errors);
 }

@@ -33,7 +33,7 @@ bool Eventually(std::function<bool()> const &isSo) {
 class Viewer {
 public:
     explicit Viewer(fs::path const &photo)
-        : process_("viewer.exe", {App::ToText(photo)}, apps_test::ProgramFolder()) {
+        : process_("viewer.exe", "\"" + App::ToText(photo) + "\"", apps_test::ProgramFolder()) {
         Eventually([&] {
             window_ = ::FindWindowW(L"ORU viewer", photo.filename().c_str());
             return window_ && ::IsWindowVisible(window_);

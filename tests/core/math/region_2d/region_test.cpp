@@ -206,8 +206,6 @@ char const *BrokenLaw(Source &source) {
         bool const inA = Inside(a, p), inR = Inside(r, p);
         HOLDS(inA == a.contains(p));
         HOLDS(&b == &triangle || inR == b.contains(p));
-        HOLDS(!inR || !a.contains(b) || inA);
-        HOLDS(!(inA || inR) || Inside(u, p));
         HOLDS(Inside(i, p) == (inA && inR));
         HOLDS(!inA || inR || Inside(s, p));
         HOLDS(!Inside(s, p) || inA);
