@@ -6,7 +6,6 @@
 #include <cstdlib>
 #include <map>
 #include <new>
-#include <set>
 #include <string>
 
 namespace oru_test {
@@ -23,13 +22,13 @@ public:
     };
 
     CountingHooks() {
-        Current() = this;
+        sCurrent_ = this;
         ORU::SetAllocationDeallocationFunction(Allocate, Free);
     }
     ~CountingHooks() {
         ORU_private::gAllocationFunction = nullptr;
         ORU_private::gDeallocationFunction = nullptr;
-        Current() = nullptr;
+        sCurrent_ = nullptr;
     }
     CountingHooks(CountingHooks const &) = delete;
     CountingHooks &operator=(CountingHooks const &) = delete;
@@ -37,33 +36,27 @@ public:
     int allocations() const { return allocations_; }
     /// The allocation that runs out of memory, counted from 1.
     void failAt(int allocation) { failAt_ = allocation; }
-    /// The sources that allocated.
-    std::set<std::string> const &files() const { return files_; }
     /// What is not freed yet, by address.
     std::map<void *, Allocation> const &outstanding() const { return outstanding_; }
     /// Releases of what was not allocated here, or under another type.
     int wrongReleases() const { return wrongReleases_; }
 
 private:
-    static CountingHooks *&Current() {
-        static CountingHooks *current = nullptr;
-        return current;
-    }
+    inline static CountingHooks *sCurrent_ = nullptr;
 
     static void *Allocate(std::size_t size, ORU::MemoryType type, char const *file, int line) {
-        Current()->files_.insert(file);
-        if (++Current()->allocations_ == Current()->failAt_)
+        if (++sCurrent_->allocations_ == sCurrent_->failAt_)
             throw std::bad_alloc();
         void *const p = std::malloc(size);
-        Current()->outstanding_[p] = Allocation{size, type, file, line};
+        sCurrent_->outstanding_[p] = Allocation{size, type, file, line};
         return p;
     }
 
     static void Free(void *p, ORU::MemoryType type, char const *, int) {
-        auto &outstanding = Current()->outstanding_;
+        auto &outstanding = sCurrent_->outstanding_;
         auto const found = outstanding.find(p);
         if (found == outstanding.end() || found->second.type != type) {
-            ++Current()->wrongReleases_;
+            ++sCurrent_->wrongReleases_;
             return;
         }
         outstanding.erase(found);
@@ -72,7 +65,6 @@ private:
 
     int allocations_ = 0;
     int failAt_ = 0;
-    std::set<std::string> files_;
     int wrongReleases_ = 0;
     std::map<void *, Allocation> outstanding_;
 };

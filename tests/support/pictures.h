@@ -5,28 +5,17 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdint>
 #include <cstring>
 #include <random>
 
 namespace apps_test {
 
-/// Stored values by pixel and channel, whatever their size.
+/// Stored values by pixel and channel, whatever their size; the low byte comes first.
 inline unsigned int Value(App::Image const &image, std::size_t index) {
-    if (image.bitsPerChannel == 8)
-        return image.pixels[index];
-    std::uint16_t value;
-    std::memcpy(&value, image.pixels.data() + 2 * index, 2);
+    std::size_t const bytes = image.bitsPerChannel / 8;
+    unsigned int value = 0;
+    std::memcpy(&value, image.pixels.data() + bytes * index, bytes);
     return value;
-}
-
-inline void SetValue(App::Image &image, std::size_t index, unsigned int value) {
-    if (image.bitsPerChannel == 8) {
-        image.pixels[index] = static_cast<unsigned char>(value);
-        return;
-    }
-    auto const value16 = static_cast<std::uint16_t>(value);
-    std::memcpy(image.pixels.data() + 2 * index, &value16, 2);
 }
 
 inline std::size_t ValueCount(App::Image const &image) {
@@ -52,42 +41,48 @@ inline App::Image RandomPicture(App::Shape const &shape, unsigned int seed) {
 /// A picture whose pixels go through all the values, another order in each channel.
 inline App::Image EveryValue(unsigned int channels, unsigned int bits) {
     App::Image image({256, bits == 8 ? 1u : 256u, channels, bits});
-    std::size_t const pixels = image.width * image.height;
-    for (std::size_t i = 0; i < ValueCount(image); ++i)
-        SetValue(image, i,
-                 static_cast<unsigned int>(i / channels * (2 * (i % channels) + 1) % pixels));
+    for (std::size_t i = 0; i < ValueCount(image); ++i) {
+        // Odd factors reach every value; what is more than the levels is not copied.
+        std::size_t const value = i / channels * (2 * (i % channels) + 1);
+        std::memcpy(image.pixels.data() + bits / 8 * i, &value, bits / 8);
+    }
     return image;
 }
 
-inline double DecodeSRGB(double code) {
+/// The linear light that a stored value stands for.
+inline double Light(App::Image const &image, std::size_t index) {
+    double const code = Value(image, index) / Levels(image);
     return code <= 0.04045 ? code / 12.92 : std::pow((code + 0.055) / 1.055, 2.4);
 }
 
-inline double EncodeSRGB(double light) {
-    return light <= 0.0031308 ? 12.92 * light : 1.055 * std::pow(light, 1 / 2.4) - 0.055;
+/// The value that stands for an amount of light: clamped, encoded and rounded.
+inline double Stored(double light, double levels) {
+    light = std::clamp(light, 0.0, 1.0);
+    double const code =
+        light <= 0.0031308 ? 12.92 * light : 1.055 * std::pow(light, 1 / 2.4) - 0.055;
+    return std::round(code * levels);
 }
 
-/// A stored value developed: to light, brightened, clamped, and back.
-inline double Developed(double value, double stops, double levels) {
-    double const light = DecodeSRGB(value / levels) * std::exp2(stops);
-    return std::round(EncodeSRGB(std::clamp(light, 0.0, 1.0)) * levels);
-}
-
-/// The largest difference of the developed colours from the exact ones; alpha that differs at all
-/// counts as everything.
-inline double WorstError(App::Image const &original, App::Image const &developed, double stops) {
+/// The largest difference of a developed picture from the exact light, which a function gives by
+/// index. Alpha stays: any difference there counts as everything.
+template<class ExactLight>
+double WorstError(App::Image const &original, App::Image const &developed, ExactLight exactLight) {
     if (original != static_cast<App::Shape const &>(developed))
         return 1e9;
     double worst = 0;
     for (std::size_t i = 0; i < ValueCount(original); ++i) {
-        double const before = Value(original, i);
         double const after = Value(developed, i);
-        if (!IsAlpha(original, i))
-            worst = std::max(worst, std::abs(after - Developed(before, stops, Levels(original))));
-        else if (before != after)
-            return 1e9;
+        worst = std::max(worst, IsAlpha(original, i)
+                                    ? 1e9 * std::abs(after - Value(original, i))
+                                    : std::abs(after - Stored(exactLight(i), Levels(original))));
     }
     return worst;
+}
+
+/// The same of a picture that is only brightened.
+inline double WorstError(App::Image const &original, App::Image const &developed, double stops) {
+    return WorstError(original, developed,
+                      [&](std::size_t i) { return Light(original, i) * std::exp2(stops); });
 }
 
 /// What is promised: 1 of 255, 16 of 65,535.

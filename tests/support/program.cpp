@@ -8,53 +8,11 @@
 #include <algorithm>
 #include <fstream>
 #include <iterator>
-#include <sstream>
 #include <system_error>
 
 namespace apps_test {
 
-namespace {
-
 namespace fs = std::filesystem;
-
-/// One argument as the C run-time of the program takes it apart again. (None here ends in a
-/// backslash or holds a quote.)
-std::wstring Quoted(fs::path const &argument) {
-    return L"\"" + argument.wstring() + L"\"";
-}
-
-/// A file that a child process may write to.
-class CaptureFile {
-public:
-    explicit CaptureFile(fs::path const &path) : path_(path) {
-        SECURITY_ATTRIBUTES inheritable = {sizeof inheritable, nullptr, TRUE};
-        handle_ = ::CreateFileW(path_.c_str(), GENERIC_WRITE, FILE_SHARE_READ, &inheritable,
-                                CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
-    }
-    ~CaptureFile() { ::CloseHandle(handle_); }
-    CaptureFile(CaptureFile const &) = delete;
-    CaptureFile &operator=(CaptureFile const &) = delete;
-
-    HANDLE handle() const { return handle_; }
-    std::string text() const {
-        std::ifstream file(path_, std::ios::binary);
-        return std::string(std::istreambuf_iterator<char>(file), {});
-    }
-
-private:
-    fs::path path_;
-    HANDLE handle_;
-};
-
-} // namespace
-
-std::vector<std::string> Outcome::errorLines() const {
-    std::vector<std::string> lines;
-    std::istringstream text(errors);
-    for (std::string line; std::getline(text, line);)
-        lines.push_back(line);
-    return lines;
-}
 
 fs::path ProgramFolder() {
     wchar_t path[MAX_PATH];
@@ -62,31 +20,50 @@ fs::path ProgramFolder() {
     return fs::path(path).parent_path();
 }
 
-Outcome RunProgram(std::string const &name, std::vector<std::string> const &arguments,
-                   fs::path const &folder) {
-    TemporaryFolder const captures;
-    CaptureFile const output(captures.path() / "output");
-    CaptureFile const errors(captures.path() / "errors");
-
-    std::wstring command = Quoted(ProgramFolder() / name);
-    for (std::string const &argument : arguments)
-        command += L" " + Quoted(App::ToPath(argument));
-
+Process::Process(std::string const &name, std::string const &arguments, fs::path const &folder,
+                 void *output, void *errors) {
+    std::wstring command =
+        L"\"" + (ProgramFolder() / name).wstring() + L"\" " + App::ToPath(arguments).wstring();
     STARTUPINFOW startup = {};
     startup.cb = sizeof startup;
-    startup.dwFlags = STARTF_USESTDHANDLES;
-    startup.hStdOutput = output.handle();
-    startup.hStdError = errors.handle();
+    startup.dwFlags = output ? STARTF_USESTDHANDLES : 0;
+    startup.hStdOutput = output;
+    startup.hStdError = errors;
     PROCESS_INFORMATION process = {};
-    if (!::CreateProcessW(nullptr, command.data(), nullptr, nullptr, TRUE, 0, nullptr,
-                          folder.c_str(), &startup, &process))
-        return Outcome();
-    ::WaitForSingleObject(process.hProcess, INFINITE);
-    DWORD exitCode = 0;
-    ::GetExitCodeProcess(process.hProcess, &exitCode);
+    ::CreateProcessW(nullptr, command.data(), nullptr, nullptr, TRUE, 0, nullptr, folder.c_str(),
+                     &startup, &process);
     ::CloseHandle(process.hThread);
-    ::CloseHandle(process.hProcess);
-    return {static_cast<int>(exitCode), output.text(), errors.text()};
+    handle_ = process.hProcess;
+}
+
+Process::~Process() {
+    ::TerminateProcess(handle_, 99);
+    ::CloseHandle(handle_);
+}
+
+int Process::exitCode() const {
+    constexpr DWORD kMilliseconds = 150000;
+    DWORD code = 0;
+    bool const ended = ::WaitForSingleObject(handle_, kMilliseconds) == WAIT_OBJECT_0;
+    return ended && ::GetExitCodeProcess(handle_, &code) ? static_cast<int>(code) : -1;
+}
+
+Outcome RunProgram(std::string const &name, std::string const &arguments, fs::path const &folder) {
+    TemporaryFolder const captures;
+    auto const fileFor = [&](char const *stream) {
+        SECURITY_ATTRIBUTES inheritable = {sizeof inheritable, nullptr, TRUE};
+        return ::CreateFileW((captures.path() / stream).c_str(), GENERIC_WRITE, FILE_SHARE_READ,
+                             &inheritable, CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
+    };
+    auto const textOf = [&](char const *stream) {
+        std::ifstream file(captures.path() / stream, std::ios::binary);
+        return std::string(std::istreambuf_iterator<char>(file), {});
+    };
+    HANDLE const output = fileFor("output"), errors = fileFor("errors");
+    int const exitCode = Process(name, arguments, folder, output, errors).exitCode();
+    ::CloseHandle(output);
+    ::CloseHandle(errors);
+    return {exitCode, textOf("output"), textOf("errors")};
 }
 
 TemporaryFolder::TemporaryFolder() {

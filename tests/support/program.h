@@ -7,22 +7,36 @@
 
 namespace apps_test {
 
-struct Outcome {
-    int exitCode = -1;
-    std::string output;
-    std::string errors;
-
-    /// The lines of the error output.
-    std::vector<std::string> errorLines() const;
-};
-
 /// The folder of the test and of what is built beside it.
 std::filesystem::path ProgramFolder();
 
-/// Runs a program that stands beside the test.
-/// @param arguments UTF-8
-/// @param folder its current folder
-Outcome RunProgram(std::string const &name, std::vector<std::string> const &arguments,
+/// A program that stands beside the test, running. What still runs when its owner goes is ended.
+class Process {
+public:
+    /// @param arguments as on a command line, in UTF-8
+    /// @param folder its current folder
+    /// @param output, errors handles of its standard streams, if it is to have them
+    Process(std::string const &name, std::string const &arguments,
+            std::filesystem::path const &folder, void *output = nullptr, void *errors = nullptr);
+    ~Process();
+    Process(Process const &) = delete;
+    Process &operator=(Process const &) = delete;
+
+    /// Waits for its end. @return its exit code, -1 when it never began or goes on for minutes
+    int exitCode() const;
+
+private:
+    void *handle_;
+};
+
+struct Outcome {
+    int exitCode;
+    std::string output;
+    std::string errors;
+};
+
+/// Runs a program to its end.
+Outcome RunProgram(std::string const &name, std::string const &arguments,
                    std::filesystem::path const &folder);
 
 /// An empty folder that goes with all its files.

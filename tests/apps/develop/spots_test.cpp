@@ -4,11 +4,11 @@
 #include "apps/develop/developer.h"
 #include "apps/develop/openclruntime.h"
 #include "tests/apps/develop/developfixture.h"
-#include "tests/support/pictures.h"
+#include "tests/support/failure.h"
 
 #include <map>
 #include <random>
-#include <sstream>
+#include <tuple>
 
 using namespace apps_test;
 using App::Image;
@@ -28,21 +28,14 @@ double StopsAt(SpotList const &spots, double x, double y) {
     return sum;
 }
 
-double WorstSpotError(Image const &original, Image const &developed, SpotList const &spots,
-                      double stops) {
-    double worst = 0;
-    for (std::size_t i = 0; i < ValueCount(original); ++i) {
-        std::size_t const pixel = i / original.channels;
-        double const x = static_cast<double>(pixel % original.width) + 0.5;
-        std::size_t const row = pixel / original.width;
-        double const y = static_cast<double>(row) + 0.5;
-        double const exact =
-            IsAlpha(original, i)
-                ? Value(original, i)
-                : Developed(Value(original, i), stops + StopsAt(spots, x, y), Levels(original));
-        worst = std::max(worst, std::abs(exact - Value(developed, i)));
-    }
-    return worst;
+/// The light of a picture brightened everywhere and at its spots, by index.
+auto SpottedLight(Image const &photo, SpotList const &spots, double stops) {
+    return [&photo, &spots, stops](std::size_t i) {
+        std::size_t const pixel = i / photo.channels;
+        double const x = static_cast<double>(pixel % photo.width) + 0.5;
+        double const y = static_cast<double>(pixel / photo.width) + 0.5;
+        return Light(photo, i) * std::exp2(stops + StopsAt(spots, x, y));
+    };
 }
 
 std::map<std::string, SpotList> SpotSets() {
@@ -99,120 +92,72 @@ private:
     std::unique_ptr<Develop::Developer> developer_;
 };
 
-// The full frame is exact, and computing the region over a base gives the same bytes.
+// The full frame is exact, and computing the region over a base gives the same bytes, also where
+// sharpening, on OpenCL and on OpenGL, reaches into the region from around it.
 TEST_F(SpotRegions, EqualFullFrame) {
-    useDevice("none");
-    for (App::Shape const &shape :
-         std::vector<App::Shape>{{91, 62, 3, 8}, {91, 62, 2, 16}, {33, 80, 4, 16}, {64, 1, 1, 8}}) {
+    struct Case {
+        std::string device;
+        App::Shape shape;
+        Develop::Sharpening sharpening;
+    };
+    std::vector<Case> cases = {{"none", {91, 62, 3, 8}, {}},
+                               {"none", {91, 62, 2, 16}, {}},
+                               {"none", {33, 80, 4, 16}, {}},
+                               {"none", {64, 1, 1, 8}, {}}};
+    for (char const *const device : {"none", ""})
+        for (double const sigma : {0.3, 1.7, 9.0})
+            cases.push_back({device, {91, 62, 3, 16}, {1.5, sigma}});
+    for (auto const &[device, shape, sharpening] : cases) {
+        useDevice(device);
         Image const photo = RandomPicture(shape, 1);
         for (auto const &[name, spots] : SpotSets()) {
-            auto const [full, local] = developBothWays(photo, {0.3, {}, spots});
-            EXPECT_EQ(full.pixels, local.pixels) << name;
-            EXPECT_LE(WorstSpotError(photo, full, spots, 0.3), Tolerance(photo))
-                << name << ", " << shape.description();
+            SCOPED_TRACE(name + ", " + shape.description() + ", " + device);
+            auto const [full, local] = developBothWays(photo, {0.3, sharpening, spots});
+            EXPECT_EQ(full.pixels, local.pixels) << "sigma " << sharpening.sigma;
+            if (!sharpening.isOn()) {
+                EXPECT_LE(WorstError(photo, full, SpottedLight(photo, spots, 0.3)),
+                          Tolerance(photo));
+            }
         }
     }
 }
 
-// Sharpening reaches into the region from around it, on OpenCL and on OpenGL.
-TEST_F(SpotRegions, EqualFullFrameWhenSharpened) {
-    Image const photo = RandomPicture({91, 62, 3, 16}, 1);
-    for (char const *const device : {"", "none"}) {
-        useDevice(device);
-        for (double const sigma : {0.3, 1.7, 9.0})
-            for (auto const &[name, spots] : SpotSets()) {
-                auto const [full, local] = developBothWays(photo, {-0.2, {1.5, sigma}, spots});
-                EXPECT_EQ(full.pixels, local.pixels) << name << ", sigma " << sigma;
-            }
-    }
-}
+using Spots = DevelopFixture;
 
-class Spots : public DevelopFixture {
-protected:
-    void writeText(std::string const &name, std::string const &text) {
-        write(name, std::vector<unsigned char>(text.begin(), text.end()));
-    }
-
-    void writeSpots(std::string const &name, SpotList const &spots) {
-        std::ostringstream text;
-        text.precision(17);
-        for (Spot const &spot : spots)
-            text << spot.x << " " << spot.y << " " << spot.radius << " " << spot.stops << "\n";
-        writeText(name, text.str());
-    }
-
-    std::vector<unsigned char> develop(std::string const &output,
-                                       std::vector<std::string> arguments) {
-        for (char const *const argument : {"--exposure", "0.3", "--quiet", "--output"})
-            arguments.emplace_back(argument);
-        arguments.push_back(output);
-        arguments.push_back("photo.png");
-        Outcome const outcome = DevelopFixture::develop(arguments);
-        EXPECT_EQ(outcome.exitCode, 0) << outcome.errors;
-        return read(output + "/photo.png").pixels;
-    }
-};
-
-// The program does the same with files.
+// The program does the same with files, and tells how little it computed.
 TEST_F(Spots, BaseAndFullFrame) {
-    write("photo.png", RandomPicture({91, 62, 3, 8}, 1));
-    writeSpots("spots.txt", SpotSets().at("overlapping"));
-    develop("base", {"--sharpen", "1"});
-    auto const full = develop("full", {"--sharpen", "1", "--spots", "spots.txt"});
-    EXPECT_EQ(full, develop("local", {"--sharpen", "1", "--spots", "spots.txt", "--base",
-                                      "base/photo.png"}));
-    EXPECT_NE(full, read("base/photo.png").pixels);
+    write("photo.png", RandomPicture({100, 50, 3, 16}, 1));
+    write("spots.txt", "20 20 4 1");
+    tellsOf("--sharpen 1 --output base photo.png");
+    tellsOf("--sharpen 1 --output full --spots spots.txt photo.png");
+    std::string const text = tellsOf("--sharpen 1 --output local --spots spots.txt --base "
+                                     "base/photo.png --report photo.png");
+    EXPECT_EQ(read("full/photo.png").pixels, read("local/photo.png").pixels);
+    EXPECT_NE(read("full/photo.png").pixels, read("base/photo.png").pixels);
+    EXPECT_THAT(text, testing::HasSubstr("pixels processed: 2.00 %"));
+    EXPECT_THAT(text, testing::HasSubstr("the full frame takes "));
 }
 
-TEST_F(Spots, TextForms) {
-    write("photo.png", RandomPicture({91, 62, 3, 8}, 1));
-    writeSpots("plain.txt", {{30.5, 20, 12, 1}});
-    writeText("odd.txt", "# a face\r\n\r\n\t 30.5  +2e1\t12 1 # brighter\n   \n#");
-    EXPECT_EQ(develop("a", {"--spots", "plain.txt"}), develop("b", {"--spots", "odd.txt"}));
-}
-
-TEST_F(Spots, MalformedLines) {
-    write("photo.png", RandomPicture({9, 6, 3, 8}, 1));
-    std::map<std::string, std::string> const reasons = {
-        {"1 2 3", "4 numbers are needed"},  {"1 2 3 4 5", "4 numbers are needed"},
-        {"1 2 x 4", "'x' is not a number"}, {"1 2 3 4,", "'4,' is not a number"},
-        {"1 2 -3 4", "radius is negative"}, {"nan 2 3 4", "'nan' is not a number"},
-        {"1e300 2 3 4", "out of range"}};
-    for (auto const &[line, reason] : reasons) {
-        writeText("spots.txt", "1 2 3 1\n# fine so far\n" + line + "\n1 2 3\n");
-        Outcome const outcome = DevelopFixture::develop({"--spots", "spots.txt", "photo.png"});
-        EXPECT_EQ(outcome.exitCode, 1);
-        EXPECT_EQ(outcome.errorLines().size(), 1u) << outcome.errors;
-        EXPECT_TRUE(Reports(outcome, "spots.txt: line 3", reason));
-    }
-    EXPECT_FALSE(std::filesystem::exists(path("out")));
-}
-
-TEST_F(Spots, BadBase) {
-    write("photo.png", RandomPicture({9, 6, 3, 8}, 1));
-    write("other.png", RandomPicture({9, 7, 3, 8}, 1));
-    writeSpots("spots.txt", {{3, 3, 2, 1}});
-    auto const outcomeOf = [this](std::vector<std::string> arguments) {
-        arguments.insert(arguments.begin(), {"--spots", "spots.txt", "--base"});
-        return DevelopFixture::develop(arguments);
+TEST_F(Spots, Texts) {
+    auto const parse = [this](std::string const &text) {
+        write("spots", text);
+        return Develop::ReadSpots(path("spots"));
     };
-    EXPECT_TRUE(Reports(outcomeOf({"other.png", "photo.png"}), "photo.png",
-                        "its base other.png: is 9 x 7, RGB, 8 bit, not 9 x 6, RGB, 8 bit"));
-    EXPECT_TRUE(
-        Reports(outcomeOf({"none.png", "photo.png"}), "photo.png", "none.png: no such file"));
-    EXPECT_TRUE(Reports(outcomeOf({"other.png", "photo.png", "other.png"}), "other.png",
-                        "base of one picture only"));
-    EXPECT_TRUE(Reports(outcomeOf({"out/photo.png", "photo.png"}), "photo.png", "would replace"));
-}
+    SpotList const spots = parse("# a face\r\n\r\n\t 30.5  +2e1\t12 -1 # brighter\n   \n#");
+    ASSERT_EQ(spots.size(), 1u);
+    auto const [x, y, radius, stops] = spots[0];
+    EXPECT_EQ(std::make_tuple(x, y, radius, stops), std::make_tuple(30.5, 20, 12, -1));
 
-TEST_F(Spots, ReportTellsTheShare) {
-    write("photo.png", RandomPicture({100, 50, 3, 8}, 1));
-    writeSpots("spots.txt", {{20, 20, 4, 1}});
-    develop("base", {});
-    Outcome const outcome = DevelopFixture::develop(
-        {"--spots", "spots.txt", "--base", "base/photo.png", "--report", "photo.png"});
-    EXPECT_NE(outcome.output.find("pixels processed: 2.00 %"), std::string::npos) << outcome.output;
-    EXPECT_NE(outcome.output.find("the full frame takes "), std::string::npos) << outcome.output;
+    std::string const count = "4 numbers are needed: centre x, centre y, radius, exposure";
+    std::map<std::string, std::string> const reasons = {{"1 2 3", count},
+                                                        {"1 2 3 4 5", count},
+                                                        {"1 2 x 4", "'x' is not a number"},
+                                                        {"1 2 3 4,", "'4,' is not a number"},
+                                                        {"1 2 -3 4", "the radius is negative"},
+                                                        {"nan 2 3 4", "'nan' is not a number"},
+                                                        {"1e300 2 3 4", "1e300 is out of range"}};
+    for (auto const &[line, reason] : reasons)
+        EXPECT_FAILURE("line 3: " + reason, parse("1 2 3 1\n# fine so far\n" + line + "\n1 2\n"));
 }
 
 } // namespace

@@ -9,6 +9,7 @@
 
 #include <cstring>
 #include <stdexcept>
+#include <tuple>
 
 using oru_test::CountingHooks;
 using oru_test::MessageOf;
@@ -45,20 +46,29 @@ void ExpectClean(CountingHooks const &hooks) {
     EXPECT_EQ(gAlive, 0);
 }
 
-TEST(MemoryHooks, SeeTheTagOfEachAllocation) {
+TEST(MemoryHooks, SeeEachAllocationOnce) {
     CountingHooks hooks;
     for (auto const type : {ORU::MEMORYTYPE_DEFAULT, ORU::MEMORYTYPE_IMAGE}) {
         void *const p = operator new(33, type, "some.cpp", 44);
         auto const &seen = hooks.outstanding().at(p);
-        EXPECT_EQ(seen.size, 33u);
-        EXPECT_EQ(seen.type, type);
-        EXPECT_EQ(seen.file, "some.cpp");
-        EXPECT_EQ(seen.line, 44);
+        EXPECT_EQ(std::tie(seen.size, seen.type, seen.file, seen.line),
+                  std::make_tuple(33u, type, "some.cpp", 44));
         operator delete(p, type, "other.cpp", 1);
     }
-    EXPECT_THROW(ORU::MakeScoped(ORU_NEW Counted(true)), std::runtime_error);
-    EXPECT_THROW(ORU::MakeShared(ORU_NEW Derived(true)), std::runtime_error);
-    EXPECT_EQ(hooks.allocations(), 4);
+    {
+        auto derived = ORU::MakeScoped(ORU_NEW Derived);
+        void const *const start = derived.get();
+        ORU::ScopedPtr<Counted> const base(std::move(derived));
+        EXPECT_NE(start, base.get()) << "the base lies inside the object";
+        std::shared_ptr<Counted> const shared = ORU::MakeShared(ORU_NEW Derived);
+        std::shared_ptr<Counted> const guest(base.get(), ORU::NullDeleter());
+        ORU::ScopedPtr<int const> const constant(ORU_NEW int const(3));
+        EXPECT_EQ(hooks.outstanding().size(), 3u);
+        EXPECT_EQ(gAlive, 4);
+    }
+    ORU::ORUDeleter<Counted>()(nullptr);
+    EXPECT_THROW(ORU::MakeScoped(ORU_NEW Derived(true)), std::runtime_error);
+    EXPECT_EQ(hooks.allocations(), 6);
     ExpectClean(hooks);
 }
 
@@ -80,24 +90,6 @@ TEST(MemoryHooks, AreInstalledOnce) {
     EXPECT_EQ(MessageOf(installCheck), "ORU_private::gMemoryCheckFunction == NULL");
     EXPECT_TRUE(ORU_private::CheckMemoryLegal(nullptr, 0)) << "the hook is not asked";
     ORU_private::gMemoryCheckFunction = nullptr;
-}
-
-TEST(Owners, DestroyAndFreeThroughTheHooksOnce) {
-    CountingHooks hooks;
-    {
-        auto derived = ORU::MakeScoped(ORU_NEW Derived);
-        void const *const start = derived.get();
-        ORU::ScopedPtr<Counted> const base(std::move(derived));
-        EXPECT_NE(start, base.get()) << "the base lies inside the object";
-        std::shared_ptr<Counted> const shared = ORU::MakeShared(ORU_NEW Derived);
-        std::shared_ptr<Counted> const guest(base.get(), ORU::NullDeleter());
-        ORU::ScopedPtr<int const> const constant(ORU_NEW int const(3));
-        EXPECT_EQ(hooks.outstanding().size(), 3u);
-        EXPECT_EQ(gAlive, 4);
-    }
-    ORU::ORUDeleter<Counted>()(nullptr);
-    EXPECT_EQ(hooks.allocations(), 3);
-    ExpectClean(hooks);
 }
 
 /// Allocates, checks the layout, fills every byte the caller may use, frees.

@@ -1,5 +1,6 @@
 // The small value types and helpers: sizes, rectangles, version texts, boundaries.
 #include "oru/core/utility/boundary.h"
+#include "oru/core/utility/composetext.h"
 #include "oru/core/utility/integerrect.h"
 #include "oru/core/utility/versionstring.h"
 
@@ -45,12 +46,12 @@ struct Grouping : std::numpunct<char> {
     std::string do_grouping() const override { return "\3"; }
 };
 
-TEST(VersionString, SplitsWhatDriversSay) {
+TEST(Texts, FollowNoLocaleOfTheHost) {
     std::tuple<char const *, unsigned, unsigned, int, std::string> const versions[] = {
         {"3.3.0 - Build 26.20", 3, 3, 0, "- Build 26.20"},
         {"4.50", 4, 50, -1, ""},
         {"1.2.11", 1, 2, 11, ""},
-        {" 2.1  two blanks", 2, 1, -1, " two blanks"},
+        {" 2.1  Mesa 22.3", 2, 1, -1, " Mesa 22.3"},
         {"2.1.x y", 2, 1, 0, "y"},
         {"4", 4, 4, -1, ""},
         {"1,024.0", 1, 0, -1, ""},
@@ -67,6 +68,7 @@ TEST(VersionString, SplitsWhatDriversSay) {
         ORU::TokenizeVersionString(text, major, minor, release, vendor);
         EXPECT_EQ(std::make_tuple(text, major, minor, release, vendor), version);
     }
+    EXPECT_EQ(ORU::ComposeText(4711, " of ", 0.5), "4711 of 0.5");
     std::locale::global(before);
 }
 
