@@ -1,17 +1,15 @@
 // What tests of OpenCL objects share: the layer on the tests' runtime, contexts, leak checks.
 #pragma once
 
-#include "oru/core/exceptions/internalexception.h"
 #include "oru/oru_ocl/commandqueue.h"
-#include "oru/oru_ocl/exceptionocl.h"
 #include "oru/oru_ocl/extensionmanagerocl.h"
 #include "oru/oru_ocl/programocl.h"
+#include "tests/support/failure.h"
 #include "tests/support/glfixture.h"
 #include "tests/support/testruntime.h"
 
 #include <gtest/gtest.h>
 
-#include <memory>
 #include <numeric>
 #include <string>
 #include <vector>
@@ -19,22 +17,6 @@
 namespace oru_test {
 
 namespace OGL = ORU::OGL;
-
-/// What a call throws: an internal exception's message or the name of an OpenCL error; empty when
-/// it throws nothing.
-template<class Call>
-std::string Thrown(Call call) {
-    try {
-        call();
-    } catch (ORU::OCL::ExceptionOCL const &e) {
-        return ORU::OCL::ExceptionOCL::ErrorToCString(static_cast<int>(e.errorNumber()));
-    } catch (ORU::InternalException const &e) {
-        return e.message();
-    }
-    return "";
-}
-#define EXPECT_THROWN(expected, ...)                                                               \
-    EXPECT_EQ(expected, ::oru_test::Thrown([&] { static_cast<void>(__VA_ARGS__); }))
 
 constexpr auto reads = ORU::OCL::Memory::MEMORY_READ_ONLY;
 constexpr auto writes = ORU::OCL::Memory::MEMORY_WRITE_ONLY;
@@ -123,13 +105,13 @@ protected:
 /// An OpenGL context, current. A base, so that it is there before the OpenCL context.
 class WithGLContext {
 protected:
-    WithGLContext() { glContext->makeCurrent(); }
+    WithGLContext() { glContext.makeCurrent(); }
 
 private:
     OGL::AutoInitializer library_;
 
 protected:
-    std::unique_ptr<OGL::ContextOffscreen> glContext = std::make_unique<OGL::ContextOffscreen>();
+    OGL::ContextOffscreen glContext;
 };
 
 /// An OpenCL context that shares the objects of the current OpenGL context.
@@ -137,16 +119,12 @@ class SharingTest : protected WithGLContext, public QueueTest {
 protected:
     SharingTest() : QueueTest(ORU::OCL::Context(propertiesToShare(), device())) {}
 
-    void TearDown() override {
-        if (OGL::Context::CurrentContext()) {
-            EXPECT_EQ(GLenum(GL_NO_ERROR), ::glGetError());
-        }
-    }
+    void TearDown() override { EXPECT_EQ(GLenum(GL_NO_ERROR), ::glGetError()); }
 
     ORU::OCL::ContextProperties propertiesToShare() const {
         ORU::OCL::ContextProperties properties(platform());
-        properties.setSharedRenderContext(glContext->renderContext());
-        properties.setDisplayContext(glContext->deviceContext());
+        properties.setSharedRenderContext(glContext.renderContext());
+        properties.setDisplayContext(glContext.deviceContext());
         return properties;
     }
 };
