@@ -5,18 +5,11 @@
 #include "oru/oru_ogl/ogl/texture3.h"
 #include "tests/support/computetest.h"
 
-#include <functional>
-
 using namespace ORU::OCL;
 using namespace oru_test;
 
-namespace {
-
-constexpr auto RGBA8 = OGL::Texture::INTERNALFORMAT_RGBA8;
-
-} // namespace
-
 TEST_F(SharingTest, TheRuntimeIsToldTheObject) {
+    auto const RGBA8 = OGL::Texture::INTERNALFORMAT_RGBA8;
     OGL::Buffer buffer(64, OGL::Buffer::TYPE_ARRAY_BUFFER, OGL::Buffer::USAGE_STATIC_DRAW, nullptr);
     OGL::Texture2D texture(RGBA8, 8, 8, true);
     OGL::TextureRECT rectangle(RGBA8, 8, 8);
@@ -38,46 +31,5 @@ TEST_F(SharingTest, TheRuntimeIsToldTheObject) {
                renderbuffer.objectID());
         passes(Image3D(context, access, volume, 3), "clCreateFromGLTexture3D", GL_TEXTURE_3D, 3,
                volume.objectID());
-    }
-}
-
-TEST_F(SharingTest, BufferAndTextureGoThereAndBack) {
-    std::vector<unsigned char> values = Counting<unsigned char>(4 * 4 * 4), read(values.size());
-    auto const bytes = std::int64_t(values.size());
-    OGL::Buffer glBuffer(bytes, OGL::Buffer::TYPE_ARRAY_BUFFER, OGL::Buffer::USAGE_DYNAMIC_DRAW,
-                         values.data());
-    OGL::Texture2D texture(RGBA8, 8, 8, true);
-    Buffer const buffer(context, reads, glBuffer);
-    Image2D const image(context, writes, texture, 1);
-    Program const program = build(R"(
-kernel void copy(global uchar4 *from, write_only image2d_t to) {
-    int2 at = (int2)(get_global_id(0), get_global_id(1));
-    write_imagef(to, at, convert_float4(from[4 * at.y + at.x]) / 255);
-})");
-    Kernel copy = KernelOf(program, "copy", buffer);
-    copy.setArg(1, image);
-    queue.enqueueAcquireGLObjects({buffer, image});
-    queue.enqueueKernel(copy, Range<2>(4, 4), 0, 0);
-    queue.enqueueReleaseGLObjects({buffer, image}).wait();
-    ORU_GL(BindTexture, GL_TEXTURE_2D, texture.objectID());
-    ORU_GL(GetTexImage, GL_TEXTURE_2D, 1, GL_RGBA, GL_UNSIGNED_BYTE, read.data());
-    EXPECT_EQ(values, read);
-}
-
-TEST_F(SharingTest, AContextThatCannotShareIsTold) {
-    ContextProperties properties = propertiesToShare();
-    properties.setSharedRenderContext(reinterpret_cast<HGLRC>(&properties));
-    std::string reason;
-    auto const notify = [](char const *text, void const *, std::size_t, void *data) {
-        *static_cast<std::string *>(data) += text;
-    };
-    Context::NotifyCallback const callback(notify, &reason);
-    std::string expected;
-    for (auto const &make : std::vector<std::function<void()>>{
-             [&] { Context(properties, device(), callback); },
-             [&] { Context(properties, std::vector<Device>{device()}, callback); },
-             [&] { Context(properties, Device::TYPE_ALL, callback); }}) {
-        EXPECT_FAILURE("OCL Exception: UNKNOWN CL ERROR CODE", make());
-        EXPECT_EQ(expected += "The OpenGL context is not current", reason);
     }
 }

@@ -57,8 +57,8 @@ public:
         return entries_[entryPoint].calls;
     }
 
-    /// What it was called with the last time: numbers, texts, addresses of memory, handles and the
-    /// elements of lists of handles. Other pointers are left out.
+    /// What it was called with the last time: numbers, texts, addresses, handles and the elements
+    /// of lists, a missing one as "null". Formats and what the runtime is to fill are left out.
     std::string arguments(std::string const &entryPoint) {
         std::lock_guard const lock(mutex_);
         return entries_[entryPoint].arguments;

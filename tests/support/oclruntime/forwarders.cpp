@@ -39,25 +39,42 @@ FunctionTable const &Functions() {
     return table;
 }
 
-/// The text of an argument as the call book wants it. A list of handles follows its length, which
-/// is in `previous`.
 template<class Argument>
-std::string Recorded(Argument argument, std::size_t &previous) {
+constexpr bool IsHandle =
+    std::is_pointer_v<Argument> &&std::is_class_v<std::remove_pointer_t<Argument>> &&
+    !std::is_const_v<std::remove_pointer_t<Argument>>;
+
+/// The text of an argument as the call book wants it. `previous` is the number before it, which is
+/// the length of a list.
+template<class Argument>
+std::string Recorded([[maybe_unused]] std::string const &name, [[maybe_unused]] Argument argument,
+                     [[maybe_unused]] std::size_t &previous) {
     using Target = std::remove_pointer_t<Argument>;
-    std::string text;
     if constexpr (std::is_integral_v<Argument>) {
         previous = static_cast<std::size_t>(argument);
-        text = TextOf(argument);
-    } else if constexpr (std::is_same_v<Argument, char const *>) {
-        text = TextOf(argument ? argument : "null");
-    } else if constexpr (std::is_void_v<Target> ||
-                         (std::is_class_v<Target> && !std::is_const_v<Target>)) {
-        text = TextOf(argument);
-    } else if constexpr (std::is_pointer_v<Target> && std::is_const_v<Target>) {
-        for (std::size_t i = 0; argument && i < previous; ++i)
+        return TextOf(argument);
+    } else if constexpr (std::is_function_v<Target>) {
+        return TextOf(reinterpret_cast<void const *>(argument));
+    } else if constexpr (std::is_void_v<Target> || IsHandle<Argument>) {
+        return TextOf(argument);
+    } else if constexpr (std::is_same_v<Target, char const>) {
+        return TextOf(argument ? argument : "null");
+    } else if constexpr (std::is_same_v<Target, std::size_t const> ||
+                         (std::is_const_v<Target> && IsHandle<std::remove_const_t<Target>>)) {
+        bool const isPlace = std::is_same_v<Target, std::size_t const> &&
+                             name.rfind("clEnqueue", 0) == 0 && name != "clEnqueueNDRangeKernel";
+        std::string text = argument ? "" : TextOf("null");
+        for (std::size_t i = 0; argument && i < (isPlace ? 3 : previous); ++i)
             text += TextOf(argument[i]);
+        return text;
+    } else if constexpr (std::is_same_v<Target, cl_context_properties const>) {
+        std::string text;
+        for (std::size_t i = 0; argument && argument[i] != 0; ++i)
+            text += TextOf(argument[i]);
+        return text;
+    } else {
+        return "";
     }
-    return text;
 }
 
 /// The result of a call that did nothing.
@@ -103,7 +120,7 @@ auto Call(std::string const &name, Result (CL_API_CALL *FunctionTable::*slot)(Pa
     return [=](Parameters... arguments) -> Result {
         std::size_t previous = 0;
         std::string recorded;
-        ((recorded += Recorded(arguments, previous)), ...);
+        ((recorded += Recorded(name, arguments, previous)), ...);
         if (cl_int const code = TheCallBook().enter(name, recorded))
             return Failed<Result>(code, arguments...);
         auto const function = Functions().*slot;
