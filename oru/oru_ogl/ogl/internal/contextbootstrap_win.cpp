@@ -3,12 +3,13 @@
 
 #include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/ogl/internal/contexts/adapterorigins_win.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL::internal {
 
 ContextBootstrap::ContextBootstrap(DisplayDeviceKey const &key) : Context(key) {
-    auto const origin = DisplayOrigin(key.adapterName, true);
+    auto const origin = AdapterOrigin(key.adapterName);
     window_ = MakeScoped(
         ORU_NEW InternalWindow(static_cast<short>(origin.x), static_cast<short>(origin.y)));
     deviceContext_ = ::GetDC(window_->hWnd());
