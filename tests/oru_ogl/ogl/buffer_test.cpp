@@ -112,8 +112,11 @@ TEST_F(BufferTest, RefusesInOrder) {
 }
 
 TEST_F(BufferTest, TranslatesItsEnumerations) {
-    ExpectTranslation("Buffer type", Buffer::Type2GL, Buffer::GL2Type, 4, GL_ELEMENT_ARRAY_BUFFER);
-    ExpectTranslation("Buffer type", Buffer::Usage2GL, Buffer::GL2Usage, 9, GL_DYNAMIC_COPY);
+    ExpectTranslation("Buffer type", Buffer::Type2GL, Buffer::GL2Type,
+                      "PIXEL_UNPACK_BUFFER PIXEL_PACK_BUFFER ARRAY_BUFFER ELEMENT_ARRAY_BUFFER");
+    ExpectTranslation("Buffer type", Buffer::Usage2GL, Buffer::GL2Usage,
+                      "STREAM_DRAW STREAM_READ STREAM_COPY STATIC_DRAW STATIC_READ STATIC_COPY "
+                      "DYNAMIC_DRAW DYNAMIC_READ DYNAMIC_COPY");
     Buffer odd(16, static_cast<Buffer::Type>(4), Buffer::USAGE_STREAM_DRAW, nullptr);
     EXPECT_TRUE(odd.isUnpackBuffer());
 }

@@ -65,8 +65,8 @@ TEST_F(TextureUnitTest, ActsOnTheActiveUnit) {
         }
     }
     EXPECT_FAILURE("GL_INVALID_ENUM", TextureState::SetActiveTextureUnit(1000));
-    ExpectTranslation("Environment", TextureUnit::Environment2GL, TextureUnit::GL2Environment, 6,
-                      GL_REPLACE);
+    ExpectTranslation("Environment", TextureUnit::Environment2GL, TextureUnit::GL2Environment,
+                      "ADD BLEND COMBINE DECAL MODULATE REPLACE");
 }
 
 TEST_F(TextureUnitTest, ScopeLeavesTheUnitEmptyAndTheOtherActive) {
