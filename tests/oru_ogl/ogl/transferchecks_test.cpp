@@ -20,13 +20,7 @@ char const kUnbound[] = "Texture must be bound";
 
 } // namespace
 
-class TransferChecksTest : public ObjectTest {
-protected:
-    void TearDown() override {
-        EXPECT_EQ(0, Get(GL_CLIENT_ATTRIB_STACK_DEPTH));
-        ObjectTest::TearDown();
-    }
-};
+class TransferChecksTest : public ObjectTest {};
 
 // Each row breaks one rule, and all but the first those after it; the texts of 3-D textures pad the
 // sides' names.
