@@ -61,10 +61,6 @@ public:
     ORU_FOLLOW(Program, (char const *file, unsigned int line), file, line)
 #undef ORU_FOLLOW
 
-    int made() const {
-        return made_;
-    }
-
     /// The names that were not deleted or deleted twice, empty when all is well.
     std::string leaks() const {
         std::ostringstream text;
@@ -79,7 +75,6 @@ private:
     void add(char const *kind, GLsizei n, GLuint const *names) {
         for (GLsizei i = 0; i < n; ++i)
             alive_.insert(Name(kind, names[i]));
-        made_ += n;
     }
     void remove(char const *kind, GLsizei n, GLuint const *names) {
         for (GLsizei i = 0; i < n; ++i) {
@@ -90,10 +85,9 @@ private:
 
     std::set<Name> alive_;
     std::string faults_;
-    int made_ = 0;
 };
 
-/// Every test ends with the names deleted that it made.
+/// Every test ends with the names deleted that it made and the client state popped that it pushed.
 class ObjectTest : public OffscreenTest {
 protected:
     void SetUp() override {
@@ -102,6 +96,7 @@ protected:
     }
     void TearDown() override {
         EXPECT_EQ("", (*ledger_)->leaks());
+        EXPECT_EQ(0, Get(GL_CLIENT_ATTRIB_STACK_DEPTH));
         ledger_.reset();
         OffscreenTest::TearDown();
     }

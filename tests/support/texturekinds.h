@@ -157,18 +157,18 @@ struct Image {
     Image(Sides const &s, std::size_t c, T value = T())
         : size(s), channels(c), texels(Size(s[0]) * Size(s[1]) * Size(s[2]) * c, value) {}
 
-    T *at(int x, int y, int z) {
-        return &texels[(Size(z) * Size(size[1]) + Size(y)) * Size(size[0]) * channels +
-                       Size(x) * channels];
+    /// Where a texel begins.
+    std::size_t index(int x, int y, int z) const {
+        return ((Size(z) * Size(size[1]) + Size(y)) * Size(size[0]) + Size(x)) * channels;
     }
 
-    /// Runs `visit(x, y, z)` for every texel of an image of a size.
-    template<class Visit>
-    static void ForEach(Sides const &size, Visit visit) {
-        for (int z = 0; z < size[2]; ++z)
-            for (int y = 0; y < size[1]; ++y)
-                for (int x = 0; x < size[0]; ++x)
-                    visit(x, y, z);
+    /// Takes a part of another image, from a corner on.
+    void paste(Image const &from, Box const &to, Sides const &corner = {}) {
+        for (int z = 0; z < to.size[2]; ++z)
+            for (int y = 0; y < to.size[1]; ++y)
+                std::copy_n(&from.texels[from.index(corner[0], corner[1] + y, corner[2] + z)],
+                            Size(to.size[0]) * channels,
+                            &texels[index(to.at[0], to.at[1] + y, to.at[2] + z)]);
     }
 
     void upload(Texture &texture, Pixel pixel, int level = 0, Sides const &at = {}) const {

@@ -15,9 +15,8 @@ namespace oru_test {
 template<class Enumeration>
 void ExpectTranslation(std::string const &name, unsigned int (*toGL)(Enumeration),
                        Enumeration (*fromGL)(unsigned int), unsigned int count, GLenum last) {
-    SCOPED_TRACE(name);
     for (unsigned int i = 0; i < count; ++i)
-        EXPECT_EQ(i, fromGL(toGL(static_cast<Enumeration>(i))));
+        EXPECT_EQ(i, fromGL(toGL(static_cast<Enumeration>(i)))) << name;
     EXPECT_EQ(last, toGL(static_cast<Enumeration>(count - 1)));
     std::string const failure = "!\"" + name + " enums are not all properly translated.\"";
     EXPECT_FAILURE(failure, toGL(static_cast<Enumeration>(count)));

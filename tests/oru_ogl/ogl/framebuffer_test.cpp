@@ -86,21 +86,20 @@ TEST_F(FramebufferTest, AttachesAndDetachesEveryKind) {
     framebuffer.bind();
     Texture2D texture(Texture::INTERNALFORMAT_RGBA8, 8, 4, false);
     unsigned int const last = Framebuffer::MaxColorAttachments() - 1;
+    GLenum const first = GL_COLOR_ATTACHMENT0_EXT;
     framebuffer.attach(&texture, 0, last);
-    ExpectAttached(&texture, GL_COLOR_ATTACHMENT0_EXT + last);
     framebuffer.attach(texture.objectID(), GL_TEXTURE_2D, 0, 2);
-    ExpectAttached(&texture, GL_COLOR_ATTACHMENT0_EXT + 2);
-    framebuffer.detach(&texture, last);
-    ExpectAttached(nullptr, GL_COLOR_ATTACHMENT0_EXT + last);
-    framebuffer.detach(GL_TEXTURE_2D, GL_FRAMEBUFFER_EXT, 2);
-    ExpectAttached(nullptr, GL_COLOR_ATTACHMENT0_EXT + 2);
-
     Texture2DArray layers(Texture::INTERNALFORMAT_RGBA8, 8, 4, 3, true);
     framebuffer.attach(&layers, 2, 1, 1);
-    GLenum const second = GL_COLOR_ATTACHMENT0_EXT + 1;
-    ExpectAttached(&layers, second);
-    EXPECT_EQ(2, Attachment(second, GL_FRAMEBUFFER_ATTACHMENT_TEXTURE_LAYER));
-    EXPECT_EQ(1, Attachment(second, GL_FRAMEBUFFER_ATTACHMENT_TEXTURE_LEVEL_EXT));
+    ExpectAttached(&texture, first + last);
+    ExpectAttached(&texture, first + 2);
+    ExpectAttached(&layers, first + 1);
+    EXPECT_EQ(2, Attachment(first + 1, GL_FRAMEBUFFER_ATTACHMENT_TEXTURE_LAYER));
+    EXPECT_EQ(1, Attachment(first + 1, GL_FRAMEBUFFER_ATTACHMENT_TEXTURE_LEVEL_EXT));
+    framebuffer.detach(&texture, last);
+    framebuffer.detach(GL_TEXTURE_2D, GL_FRAMEBUFFER_EXT, 2);
+    ExpectAttached(nullptr, first + last);
+    ExpectAttached(nullptr, first + 2);
 
     std::pair<GLenum, std::vector<GLenum>> const formats[] = {
         {GL_COLOR_ATTACHMENT0_EXT, {GL_RGBA8}},

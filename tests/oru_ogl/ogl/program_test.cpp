@@ -233,6 +233,13 @@ TEST_F(ProgramTest, TellsAttributesAndUniforms) {
 
 TEST_F(ProgramTest, MovedFromObjectsThrow) {
     Program program;
+    VertexShader shader;
+    shader.load(kVertex);
+    Shader const loaded(std::move(shader));
+    EXPECT_TRUE(loaded.isLoaded());
+    // NOLINTNEXTLINE(bugprone-use-after-move)
+    EXPECT_FAILURE("Enforce actualShader_ != NULL", shader.load(""));
+    EXPECT_FAILURE("Enforce coreShader != NULL", program.attach(&shader));
     Load(program);
     Program taken(std::move(program));
     taken.link(true);
@@ -241,19 +248,13 @@ TEST_F(ProgramTest, MovedFromObjectsThrow) {
     EXPECT_FAILURE("Enforce actualProgram_ != NULL", program.setUniform(0, 1.f));
     program = std::move(taken);
     EXPECT_TRUE(program.isLinked());
-
-    VertexShader shader;
-    Shader const other(std::move(shader));
-    // NOLINTNEXTLINE(bugprone-use-after-move)
-    EXPECT_FAILURE("Enforce actualShader_ != NULL", shader.load(""));
-    EXPECT_FAILURE("Enforce coreShader != NULL", program.attach(&shader));
-    EXPECT_FALSE(other.isLoaded());
 }
 
 TEST_F(ProgramTest, HelpersWorkOnGLNames) {
     Program owner;
-    Load(owner, "uniform bool on; uniform vec4 four; uniform mat4 matrix; uniform sampler2D image;"
-                "void main() { gl_FragColor = on ? matrix * four : texture2D(image, vec2(0)); }");
+    Load(owner, "uniform bool on; uniform vec4 four; uniform mat4 matrix, turned;"
+                "uniform sampler2D image; void main() { gl_FragColor ="
+                " on ? matrix * turned * four : texture2D(image, vec2(0)); }");
     owner.link(true);
     owner.enable();
     auto const program = static_cast<GLuint>(Get(GL_CURRENT_PROGRAM));
@@ -263,23 +264,23 @@ TEST_F(ProgramTest, HelpersWorkOnGLNames) {
     EXPECT_TRUE(owner.isEnabled());
 
     using Floats = std::vector<float>;
-    auto const expect = [&](Floats expected, char const *name) {
-        Floats values(expected.size());
-        ORU_GL(GetUniformfv, program, owner.getUniformLocation(name), values.data());
-        EXPECT_EQ(expected, values) << name;
-    };
     Floats const matrix = {0, 1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12, 13, 14, 15};
     Floats const turned = {0, 4, 8, 12, 1, 5, 9, 13, 2, 6, 10, 14, 3, 7, 11, 15};
     SetUniformBool(program, "on", true);
-    expect({1}, "on");
     SetUniformFloat4(program, "four", 1, 2, 3, 4);
-    expect({1, 2, 3, 4}, "four");
     SetUniformSampler2D(program, "image", 7);
-    expect({7}, "image");
     SetUniformMatrix4(program, "matrix", matrix.data(), false);
-    expect(matrix, "matrix");
-    SetUniformMatrix4(program, "matrix", matrix.data(), true);
-    expect(turned, "matrix");
+    SetUniformMatrix4(program, "turned", matrix.data(), true);
+    std::pair<char const *, Floats> const rows[] = {{"on", {1}},
+                                                    {"four", {1, 2, 3, 4}},
+                                                    {"image", {7}},
+                                                    {"matrix", matrix},
+                                                    {"turned", turned}};
+    for (auto const &[name, expected] : rows) {
+        Floats values(expected.size());
+        ORU_GL(GetUniformfv, program, owner.getUniformLocation(name), values.data());
+        EXPECT_EQ(expected, values) << name;
+    }
     SetUniformBool(program, "missing", true); // ignored
     Disable(program);
 }

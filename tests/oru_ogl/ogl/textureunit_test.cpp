@@ -10,9 +10,14 @@ using namespace oru_test;
 
 namespace {
 
+using U = TextureUnit;
+using Operation = void (U::*)() const;
+
+/// Binds a texture in both ways, and enables its target unless it is one of shaders only.
 template<class Kind>
-void ExpectBinding(TextureUnit const &unit, Kind const &texture,
-                   void (TextureUnit::*bindDefault)() const) {
+void ExpectActs(U const &unit, Kind const &texture, Operation bindDefault,
+                Operation enable = nullptr, Operation disable = nullptr,
+                bool (U::*isEnabled)() const = nullptr) {
     unit.bind(&texture);
     EXPECT_TRUE(texture.isBound());
     (unit.*bindDefault)();
@@ -20,24 +25,14 @@ void ExpectBinding(TextureUnit const &unit, Kind const &texture,
     unit.bind(texture.target(), texture.objectID());
     EXPECT_TRUE(texture.isBound());
     (unit.*bindDefault)();
+    if (!enable)
+        return;
+    EXPECT_FALSE((unit.*isEnabled)());
+    (unit.*enable)();
+    EXPECT_TRUE((unit.*isEnabled)() && ::glIsEnabled(texture.target()));
+    (unit.*disable)();
+    EXPECT_FALSE(::glIsEnabled(texture.target()));
 }
-
-struct Enabling {
-    GLenum target;
-    void (TextureUnit::*enable)() const;
-    void (TextureUnit::*disable)() const;
-    bool (TextureUnit::*isEnabled)() const;
-};
-
-#define ORU_ENABLING(Target, gl)                                                                   \
-    {                                                                                              \
-        gl, &TextureUnit::enable##Target, &TextureUnit::disable##Target,                           \
-            &TextureUnit::isEnabled##Target                                                        \
-    }
-Enabling const kEnablings[] = {ORU_ENABLING(1D, GL_TEXTURE_1D), ORU_ENABLING(2D, GL_TEXTURE_2D),
-                               ORU_ENABLING(3D, GL_TEXTURE_3D),
-                               ORU_ENABLING(RECT, GL_TEXTURE_RECTANGLE)};
-#undef ORU_ENABLING
 
 } // namespace
 
@@ -49,20 +44,16 @@ TEST_F(TextureUnitTest, ActsOnTheActiveUnit) {
         TextureState::SetActiveTextureUnit(index);
         EXPECT_EQ(index, TextureState::ActiveTextureUnit());
         EXPECT_EQ(static_cast<GLint>(GL_TEXTURE0 + index), Get(GL_ACTIVE_TEXTURE));
-        TextureUnit const &unit = *TextureUnit::Unit(index);
-        ExpectBinding(unit, Texture1D(format, 4, false), &TextureUnit::bind1DDefault);
-        ExpectBinding(unit, Texture2D(format, 4, 4, false), &TextureUnit::bind2DDefault);
-        ExpectBinding(unit, TextureRECT(format, 4, 4), &TextureUnit::bindRECTDefault);
-        ExpectBinding(unit, Texture3D(format, 4, 4, 4, false), &TextureUnit::bind3DDefault);
-        ExpectBinding(unit, Texture2DArray(format, 4, 4, 4, false),
-                      &TextureUnit::bind2DArrayDefault);
-        for (Enabling const &row : kEnablings) {
-            EXPECT_FALSE((unit.*row.isEnabled)());
-            (unit.*row.enable)();
-            EXPECT_TRUE((unit.*row.isEnabled)() && ::glIsEnabled(row.target));
-            (unit.*row.disable)();
-            EXPECT_FALSE(::glIsEnabled(row.target));
-        }
+        U const &unit = *U::Unit(index);
+        ExpectActs(unit, Texture1D(format, 4, false), &U::bind1DDefault, &U::enable1D,
+                   &U::disable1D, &U::isEnabled1D);
+        ExpectActs(unit, Texture2D(format, 4, 4, false), &U::bind2DDefault, &U::enable2D,
+                   &U::disable2D, &U::isEnabled2D);
+        ExpectActs(unit, TextureRECT(format, 4, 4), &U::bindRECTDefault, &U::enableRECT,
+                   &U::disableRECT, &U::isEnabledRECT);
+        ExpectActs(unit, Texture3D(format, 4, 4, 4, false), &U::bind3DDefault, &U::enable3D,
+                   &U::disable3D, &U::isEnabled3D);
+        ExpectActs(unit, Texture2DArray(format, 4, 4, 4, false), &U::bind2DArrayDefault);
     }
     EXPECT_FAILURE("GL_INVALID_ENUM", TextureState::SetActiveTextureUnit(1000));
     ExpectTranslation("Environment", TextureUnit::Environment2GL, TextureUnit::GL2Environment, 6,

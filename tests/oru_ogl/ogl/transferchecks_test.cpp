@@ -1,6 +1,8 @@
 // What the image transfers refuse, in which order and with which words.
 #include "tests/support/texturekinds.h"
 
+#include "oru/oru_ogl/extensionator/opengltokenname.h"
+
 #include <regex>
 
 using namespace oru_test;
@@ -18,15 +20,10 @@ char const kUnbound[] = "Texture must be bound";
 
 } // namespace
 
-class TransferChecksTest : public ObjectTest {
-protected:
-    void TearDown() override {
-        EXPECT_EQ(0, Get(GL_CLIENT_ATTRIB_STACK_DEPTH));
-        ObjectTest::TearDown();
-    }
-};
+class TransferChecksTest : public ObjectTest {};
 
-// Each row breaks one rule and those after it; the texts of 3-D textures pad the sides' names.
+// Each row breaks one rule, and all but the first those after it; the texts of 3-D textures pad the
+// sides' names.
 TEST_F(TransferChecksTest, PartsAreCheckedInOrder) {
     struct Row {
         int level;
@@ -35,6 +32,7 @@ TEST_F(TransferChecksTest, PartsAreCheckedInOrder) {
         std::string text;  ///< with % for the operation and _ for the padding
     };
     Row const rows[] = {
+        {0, {0, 1, 1}, 1, "error % width_ of zero supplied"},
         {-1, {0, 0, 0}, 1, "error % width_ of zero supplied"},
         {-1, {17, 0, 0}, 2, "error % height of zero supplied"},
         {-1, {17, 9, 0}, 3, "error % depth_ of zero supplied"},
@@ -115,14 +113,29 @@ TEST_F(TransferChecksTest, ReadingIsChecked) {
         EXPECT_FAILURE(kAlignment, Download(*texture, 0, kBytes, 3, memory));
         EXPECT_FAILURE(kAlignment, Download(*texture, 0, kBytes, 16, &buffer, 0));
     }
-    // The size of what is read does not depend on the level.
-    Pixel const floats{Texture::FORMAT_RGBA, Texture::TYPE_FLOAT};
-    auto const size = [&](auto const &texture) {
-        return texture.pixelDataSize(3, floats.format, floats.type);
-    };
-    EXPECT_EQ(256u, size(Texture1D(Texture::INTERNALFORMAT_RED, 16, false)));
-    EXPECT_EQ(2048u, size(Texture2D(Texture::INTERNALFORMAT_RED, 16, 8, false)));
-    EXPECT_EQ(8192u, size(Texture2DArray(Texture::INTERNALFORMAT_RED, 16, 8, 4, false)));
+}
+
+// Components of one, two and four bytes, whatever the level; other types have no size here.
+TEST_F(TransferChecksTest, PixelDataIsSizedByItsType) {
+    Texture1D const line(Texture::INTERNALFORMAT_RED, 16, false);
+    Texture2D const plane(Texture::INTERNALFORMAT_RED, 16, 8, false);
+    Texture2DArray const stack(Texture::INTERNALFORMAT_RED, 16, 8, 4, false);
+    std::string const bytes = "110220040000000000002";
+    for (unsigned int i = 0; i < bytes.size(); ++i) {
+        auto const type = static_cast<Texture::Type>(i);
+        auto const size = [&](auto const &texture) {
+            return texture.pixelDataSize(3, Texture::FORMAT_RGBA, type);
+        };
+        std::size_t const row = 64 * Size(bytes[i] - '0');
+        if (row == 0) {
+            EXPECT_FAILURE("pixelDataSize: Unknown type " +
+                               std::string(ORUOGLTokenName(Texture::Type2GL(type))),
+                           size(plane));
+        } else {
+            EXPECT_EQ((std::array{row, row * 8, row * 8 * 4}),
+                      (std::array{size(line), size(plane), size(stack)}));
+        }
+    }
 }
 
 TEST_F(TransferChecksTest, UnpackStateIsCheckedAndSet) {

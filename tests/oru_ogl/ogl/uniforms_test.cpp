@@ -4,8 +4,8 @@
 #include "oru/oru_ogl/ogl/internal/programimplcore.h"
 #include "oru/oru_ogl/ogl/programogl.h"
 
+#include <algorithm>
 #include <functional>
-#include <numeric>
 #include <type_traits>
 
 using namespace ORU::OGL;
@@ -20,21 +20,17 @@ enum Form { LOCATION, NAME, LOCATION_UNSAFE, NAME_UNSAFE, FORMS };
 /// A setter with values, and what the program must hold then.
 template<class AnyProgram>
 struct Case {
-    char const *call;
     std::string type;      ///< of the uniform, in GLSL
     int elements;          ///< of an array, 0 for none
     unsigned int asserted; ///< the GL type that the guarded form asserts, 0 for none
     Floats element;        ///< the last element's components
-    std::function<void(AnyProgram &, int, char const *)> set[FORMS];
+    std::function<void(AnyProgram &, Form, int, char const *)> set;
 };
 
 // Values of no two alike, so that an exchanged pair shows.
-int const kInts[] = {2, 3, 5, 7, 11, 13, 17, 19, 23, 29, 31, 37};
-auto const kValues = [] {
-    Floats values(32);
-    std::iota(values.begin(), values.end(), 1.5f);
-    return values;
-}();
+int const kInts[] = {2,  3,  5,  7,  11, 13, 17, 19, 23, 29,  31,  37,  41,  43,  47,  53,
+                     59, 61, 67, 71, 73, 79, 83, 89, 97, 101, 103, 107, 109, 113, 127, 131};
+Floats const kValues(std::begin(kInts), std::end(kInts));
 float const *const kFloats = kValues.data();
 
 template<class... Values>
@@ -55,16 +51,13 @@ std::vector<Case<AnyProgram>> Cases() {
     unsigned char const two = 2, zero = 0, nine = 9, one = 1;
 #define ORU_CASE(type, elements, asserted, expected, setter, ...)                                  \
     {                                                                                              \
-#setter "(" #__VA_ARGS__ ")", type, elements, asserted, expected, {                        \
-            [=](AnyProgram &p, int location, char const *) { p.setter(location, __VA_ARGS__); },   \
-                [=](AnyProgram &p, int, char const *name) { p.setter(name, __VA_ARGS__); },        \
-                [=](AnyProgram &p, int location, char const *) {                                   \
-                    p.setter##_Unsafe(location, __VA_ARGS__);                                      \
-                },                                                                                 \
-                [=](AnyProgram &p, int, char const *name) {                                        \
-                    p.setter##_Unsafe(name, __VA_ARGS__);                                          \
-                }                                                                                  \
-        }                                                                                          \
+        type, elements, asserted, expected,                                                        \
+            [=](AnyProgram &p, Form form, int location, char const *name) {                        \
+                form == LOCATION          ? p.setter(location, __VA_ARGS__)                        \
+                : form == NAME            ? p.setter(name, __VA_ARGS__)                            \
+                : form == LOCATION_UNSAFE ? p.setter##_Unsafe(location, __VA_ARGS__)               \
+                                          : p.setter##_Unsafe(name, __VA_ARGS__);                  \
+            }                                                                                      \
     }
 // One to four of the values, in a uniform of as many components.
 #define ORU_VALUES(scalar, vector, asserted, a, b, c, d)                                           \
@@ -72,8 +65,9 @@ std::vector<Case<AnyProgram>> Cases() {
         ORU_CASE(vector "2", 0, asserted##_VEC2, ToFloats(a, b), setUniform, a, b),                \
         ORU_CASE(vector "3", 0, asserted##_VEC3, ToFloats(a, b, c), setUniform, a, b, c),          \
         ORU_CASE(vector "4", 0, asserted##_VEC4, ToFloats(a, b, c, d), setUniform, a, b, c, d)
-#define ORU_ARRAY(type, components, setter, data)                                                  \
-    ORU_CASE(type, 3, 0, Floats(data + 2 * components, data + 3 * components), setter, 3, data)
+#define ORU_ARRAYS(ints, floats, n, setter)                                                        \
+    ORU_CASE(ints, 3, 0, Floats(kInts + 2 * n, kInts + 3 * n), setter, 3, kInts),                  \
+        ORU_CASE(floats, 3, 0, Floats(kFloats + 2 * n, kFloats + 3 * n), setter, 3, kFloats)
 // One matrix, and two that are turned over.
 #define ORU_MATRIX(type, n, asserted, single, several)                                             \
     ORU_CASE(type, 0, asserted, Floats(kFloats, kFloats + n * n), single, kFloats, zero),          \
@@ -84,24 +78,20 @@ std::vector<Case<AnyProgram>> Cases() {
         ORU_VALUES("int", "ivec", GL_BOOL, two, zero, nine, one),
         ORU_VALUES("int", "ivec", GL_INT, -5, 6, 7, 8),
         ORU_VALUES("float", "vec", GL_FLOAT, 0.5f, -2.f, 3.f, 4.f),
-        ORU_CASE("sampler1D", 0, GL_SAMPLER_1D, (Floats{3}), setUniformSampler1D, 3),
-        ORU_CASE("sampler2D", 0, GL_SAMPLER_2D, (Floats{4}), setUniformSampler2D, 4),
-        ORU_CASE("sampler2DRect", 0, GL_SAMPLER_2D_RECT, (Floats{5}), setUniformSampler2DRECT, 5),
-        ORU_CASE("sampler3D", 0, GL_SAMPLER_3D, (Floats{6}), setUniformSampler3D, 6),
-        ORU_ARRAY("int", 1, setUniform, kInts),
-        ORU_ARRAY("float", 1, setUniform, kFloats),
-        ORU_ARRAY("ivec2", 2, setUniform2, kInts),
-        ORU_ARRAY("vec2", 2, setUniform2, kFloats),
-        ORU_ARRAY("ivec3", 3, setUniform3, kInts),
-        ORU_ARRAY("vec3", 3, setUniform3, kFloats),
-        ORU_ARRAY("ivec4", 4, setUniform4, kInts),
-        ORU_ARRAY("vec4", 4, setUniform4, kFloats),
+        ORU_CASE("sampler1D", 0, GL_SAMPLER_1D, Floats{3}, setUniformSampler1D, 3),
+        ORU_CASE("sampler2D", 0, GL_SAMPLER_2D, Floats{4}, setUniformSampler2D, 4),
+        ORU_CASE("sampler2DRect", 0, GL_SAMPLER_2D_RECT, Floats{5}, setUniformSampler2DRECT, 5),
+        ORU_CASE("sampler3D", 0, GL_SAMPLER_3D, Floats{6}, setUniformSampler3D, 6),
+        ORU_ARRAYS("int", "float", 1, setUniform),
+        ORU_ARRAYS("ivec2", "vec2", 2, setUniform2),
+        ORU_ARRAYS("ivec3", "vec3", 3, setUniform3),
+        ORU_ARRAYS("ivec4", "vec4", 4, setUniform4),
         ORU_MATRIX("mat2", 2, GL_FLOAT_MAT2, setUniformMatrix2, setUniformMatrices2),
         ORU_MATRIX("mat3", 3, GL_FLOAT_MAT3, setUniformMatrix3, setUniformMatrices3),
         ORU_MATRIX("mat4", 4, GL_FLOAT_MAT4, setUniformMatrix4, setUniformMatrices4),
     };
 #undef ORU_MATRIX
-#undef ORU_ARRAY
+#undef ORU_ARRAYS
 #undef ORU_VALUES
 #undef ORU_CASE
 }
@@ -116,14 +106,16 @@ template<class Cases>
 std::string Source(Cases const &cases) {
     std::string uniforms = "#version 120\n#extension GL_ARB_texture_rectangle : enable\n", sum;
     for (std::size_t i = 0; i < cases.size(); ++i) {
-        auto const &c = cases[i];
+        auto const &[type, elements, asserted, element, set] = cases[i];
         std::string const name = "u" + std::to_string(i);
-        uniforms += "uniform " + c.type + " " + name + Index(c.elements, c.elements) + ";\n";
-        std::string use = name + Index(c.elements, c.elements - 1);
-        if (c.type.find("sampler") == 0)
-            use = "texture" + c.type.substr(7) + "(" + use +
-                  (c.type[7] == '1' ? ", 0.0)" : ", vec" + c.type.substr(7, 1) + "(0))");
-        sum += " + float(" + use + (c.type.find("mat") == 0 ? "[0][0])" : ")");
+        uniforms += "uniform " + type + " " + name + Index(elements, elements) + ";\n";
+        std::string use = name + Index(elements, elements - 1);
+        if (type.find("mat") == 0)
+            use += "[0]";
+        if (type.find("sampler") == 0)
+            use = "texture" + type.substr(7) + "(" + use +
+                  (type[7] == '1' ? ", 0.0)" : ", vec" + type.substr(7, 1) + "(0))");
+        sum += " + float(" + use + ")";
     }
     return uniforms + "void main() { gl_FragColor = vec4(0.0" + sum + "); }";
 }
@@ -132,10 +124,10 @@ std::string Source(Cases const &cases) {
 class Body : public ProgramImplCore {
 public:
     using ProgramImplCore::setUniform;
-    mutable std::vector<unsigned int> asserted;
+    mutable std::vector<int> asserted;
     void assertActiveUniformType(int location, unsigned int type,
                                  unsigned int count) const override {
-        asserted = {static_cast<unsigned int>(location), type, count};
+        asserted = {location, static_cast<int>(type), static_cast<int>(count)};
     }
 };
 
@@ -153,12 +145,12 @@ void ExpectSetters(Form form) {
     bool const isNamed = form == NAME || form == NAME_UNSAFE;
     for (std::size_t i = 0; i < cases.size(); ++i) {
         auto const &c = cases[i];
-        SCOPED_TRACE(testing::Message() << c.call << " form " << form);
         std::string const name = "u" + std::to_string(i);
-        std::string const last = name + Index(c.elements, c.elements - 1);
+        SCOPED_TRACE(testing::Message() << name << ", " << c.type << ", in form " << form);
         int const location = program.getUniformLocation(name.c_str());
-        auto const set = [&](int at) { c.set[form](program, at, name.c_str()); };
+        auto const set = [&](int at) { c.set(program, form, at, name.c_str()); };
         auto const read = [&] {
+            std::string const last = name + Index(c.elements, c.elements - 1);
             Floats values(16);
             ORU_GL(GetUniformfv, static_cast<GLuint>(Get(GL_CURRENT_PROGRAM)),
                    program.getUniformLocation(last.c_str()), values.data());
@@ -171,7 +163,7 @@ void ExpectSetters(Form form) {
         {
             Pushed<CountingForwarder> calls;
             set(location);
-            // A setter by name asks twice whether the program is current, one of matrices once.
+            // By name it is asked twice whether the program is current, for matrices once.
             int const queries = form == LOCATION          ? 1
                                 : form != NAME || isArray ? 0
                                 : isMatrix                ? 1
@@ -186,9 +178,8 @@ void ExpectSetters(Form form) {
         }
         EXPECT_EQ(c.element, read());
         if constexpr (std::is_same_v<AnyProgram, Body>) {
-            std::vector<unsigned int> asserted = {
-                static_cast<unsigned int>(location), c.asserted,
-                static_cast<unsigned int>(std::max(c.elements, 1))};
+            std::vector<int> asserted = {location, static_cast<int>(c.asserted),
+                                         std::max(c.elements, 1)};
             if (isArray || form >= LOCATION_UNSAFE)
                 asserted.clear();
             EXPECT_EQ(asserted, program.asserted);
