@@ -1,5 +1,4 @@
 """Emits the OpenCL function table, the extension enumeration and the device-property types."""
-import itertools
 import re
 import textwrap
 
@@ -90,17 +89,16 @@ def parameter_name(parameter):
 
 def entry_points(entries):
     lines = []
-    for group, members in itertools.groupby(entries, lambda entry: entry[1]):
-        lines.append(f"#ifndef ORU_TEST_WITHOUT_{group}")
-        for name, _, result, parameters in members:
-            names = [callback or plain for callback, plain in
-                     (parameter_name(parameter) for parameter in parameters.split("; ") if parameter)]
-            lines.append(f"ORU_CL_ENTRY({result}, {name},\n"
-                         f"    ({parameters.replace('; ', ', ')}),\n    ({', '.join(names)}))")
-        lines.append("#endif")
+    for name, _, result, parameters in entries:
+        names = [callback or plain for callback, plain in
+                 (parameter_name(parameter) for parameter in parameters.split("; ") if parameter)]
+        lines.append(f"#ifndef ORU_TEST_WITHOUT_{name}\n"
+                     f"ORU_CL_ENTRY({result}, {name},\n"
+                     f"    ({parameters.replace('; ', ', ')}),\n    ({', '.join(names)}))\n"
+                     "#endif")
     body = "\n".join(lines)
     return f"""// What the tests' runtime exports; define ORU_CL_ENTRY(Result, Name, Parameters, Arguments)
-// before, and ORU_TEST_WITHOUT_ with a group's name to leave the group out.
+// before, and ORU_TEST_WITHOUT_ with a name to leave it out.
 {body}
 #undef ORU_CL_ENTRY
 """

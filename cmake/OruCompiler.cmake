@@ -6,17 +6,18 @@ set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)
 set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
 
-# One folder for programs and the library: a Windows program finds a DLL beside itself.
-set(CMAKE_RUNTIME_OUTPUT_DIRECTORY "${PROJECT_BINARY_DIR}/bin")
+# One folder for programs and the library: a Windows program finds a DLL beside itself. Inside another project
+# that project decides.
+if(PROJECT_IS_TOP_LEVEL OR NOT CMAKE_RUNTIME_OUTPUT_DIRECTORY)
+    set(CMAKE_RUNTIME_OUTPUT_DIRECTORY "${PROJECT_BINARY_DIR}/bin")
+endif()
 
 # Windows headers: no min and max macros, nothing rarely used, the wide functions.
 add_compile_definitions(NOMINMAX WIN32_LEAN_AND_MEAN UNICODE _UNICODE _WIN32_WINNT=0x0A00)
 
 if(MSVC)
     add_compile_options(/W4 /permissive- /utf-8 /bigobj /Zc:__cplusplus)
-    # 4251, 4275: the standard library's classes in exported ones, which library and host compile alike.
-    # 4324: padding that an alignas asks for.
-    add_compile_options(/wd4251 /wd4275 /wd4324)
+    add_compile_options(/wd4324) # padding that an alignas asks for
     add_compile_definitions(_CRT_SECURE_NO_WARNINGS) # std::getenv
     if(ORU_WARNINGS_AS_ERRORS)
         add_compile_options(/WX)
@@ -45,8 +46,7 @@ add_compile_options(
     "-ffile-prefix-map=${PROJECT_BINARY_DIR}/="
     "-ffile-prefix-map=${source_from_build}=")
 
-# Static run-times: nothing but the library has to be deployed.
-add_link_options(-static -Wl,--no-insert-timestamp)
+add_link_options(-Wl,--no-insert-timestamp)
 
 find_program(ORU_CCACHE ccache)
 if(ORU_CCACHE AND CMAKE_HOST_UNIX)

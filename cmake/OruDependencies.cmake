@@ -18,6 +18,16 @@ endfunction()
 oru_find_headers(deps::boost boost/format.hpp)
 oru_find_headers(deps::opencl CL/cl.h)
 
+# The registry's headers stand beside MinGW's gl.h; Microsoft's SDK has only gl.h.
+find_path(ORU_KHRONOS_INCLUDE_DIR KHR/khrplatform.h)
+if(NOT ORU_KHRONOS_INCLUDE_DIR OR NOT EXISTS "${ORU_KHRONOS_INCLUDE_DIR}/GL/glext.h")
+    message(FATAL_ERROR "GL/glext.h, GL/wglext.h and KHR/khrplatform.h of the Khronos registry were not found. "
+        "Install them (vcpkg: opengl-registry) or set ORU_KHRONOS_INCLUDE_DIR to their folder.")
+endif()
+if(MSVC)
+    include_directories(SYSTEM "${ORU_KHRONOS_INCLUDE_DIR}")
+endif()
+
 if(ORU_BUILD_TESTS)
     find_package(GTest CONFIG REQUIRED)
 endif()

@@ -1,6 +1,9 @@
 // The profiles of OpenCL.
 #pragma once
 
+// windows.h has a macro of this name. Include it before this header, or the name means the macro.
+#undef PROFILE_EMBEDDED
+
 namespace ORU::OCL::Enum {
 
 /// How much of OpenCL a platform or device offers.

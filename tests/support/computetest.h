@@ -1,17 +1,15 @@
 // What tests of OpenCL objects share: the layer on the tests' runtime, contexts, leak checks.
 #pragma once
 
-#include "oru/core/exceptions/internalexception.h"
 #include "oru/oru_ocl/commandqueue.h"
-#include "oru/oru_ocl/exceptionocl.h"
 #include "oru/oru_ocl/extensionmanagerocl.h"
 #include "oru/oru_ocl/programocl.h"
+#include "tests/support/failure.h"
 #include "tests/support/glfixture.h"
 #include "tests/support/testruntime.h"
 
 #include <gtest/gtest.h>
 
-#include <memory>
 #include <numeric>
 #include <string>
 #include <vector>
@@ -20,35 +18,15 @@ namespace oru_test {
 
 namespace OGL = ORU::OGL;
 
-/// What a call throws: an internal exception's message or the name of an OpenCL error; empty when
-/// it throws nothing.
-template<class Call>
-std::string Thrown(Call call) {
-    try {
-        call();
-    } catch (ORU::OCL::ExceptionOCL const &e) {
-        return ORU::OCL::ExceptionOCL::ErrorToCString(static_cast<int>(e.errorNumber()));
-    } catch (ORU::InternalException const &e) {
-        return e.message();
-    }
-    return "";
-}
-#define EXPECT_THROWN(expected, ...)                                                               \
-    EXPECT_EQ(expected, ::oru_test::Thrown([&] { static_cast<void>(__VA_ARGS__); }))
-
 constexpr auto reads = ORU::OCL::Memory::MEMORY_READ_ONLY;
 constexpr auto writes = ORU::OCL::Memory::MEMORY_WRITE_ONLY;
 constexpr auto both = ORU::OCL::Memory::MEMORY_READ_WRITE;
 constexpr cl_image_format rgba8 = {CL_RGBA, CL_UNORM_INT8};
 
-/// What `getInfo` of a memory object answers.
-template<class T, class Object, class Query>
-T Get(Object const &object, Query query) {
-    T value{};
-    std::size_t size = 0;
-    object.getInfo(query, sizeof value, &value, &size);
-    EXPECT_EQ(sizeof value, size);
-    return value;
+/// The address of a callback without captures, for the text of a call.
+template<class Callback>
+void const *AddressOf(Callback const &callback) {
+    return reinterpret_cast<void const *>(+callback);
 }
 
 /// Every test must leave no handle behind. The layer stays open until the process ends, since only
@@ -70,10 +48,7 @@ protected:
         return instance;
     }
 
-    static ORU::OCL::Platform platform() {
-        runtime(); // opens the layer, also for what is made before the fixture
-        return ORU::OCL::platforms().front();
-    }
+    static ORU::OCL::Platform platform() { return ORU::OCL::platforms().front(); }
     static ORU::OCL::Device device() {
         return platform().devices(ORU::OCL::Device::TYPE_ALL).front();
     }
@@ -85,9 +60,6 @@ protected:
 /// A test with a context and an in-order queue.
 class QueueTest : public ComputeTest {
 protected:
-    explicit QueueTest(ORU::OCL::Context const &made = makeContext())
-        : context(made), queue(context, device(), false, false) {}
-
     ORU::OCL::Program build(std::string const &source, std::string const &options = "") const {
         ORU::OCL::Program program(context, source);
         program.build(options);
@@ -116,39 +88,20 @@ protected:
         return values;
     }
 
-    ORU::OCL::Context context;
-    ORU::OCL::CommandQueue queue;
+    ORU::OCL::Context context = makeContext();
+    ORU::OCL::CommandQueue queue{context, device(), false, false};
 };
 
-/// An OpenGL context, current. A base, so that it is there before the OpenCL context.
-class WithGLContext {
+/// With an OpenGL context, current.
+class SharingTest : public QueueTest {
 protected:
-    WithGLContext() { glContext->makeCurrent(); }
+    SharingTest() { glContext_.makeCurrent(); }
+
+    void TearDown() override { EXPECT_EQ(GLenum(GL_NO_ERROR), ::glGetError()); }
 
 private:
     OGL::AutoInitializer library_;
-
-protected:
-    std::unique_ptr<OGL::ContextOffscreen> glContext = std::make_unique<OGL::ContextOffscreen>();
-};
-
-/// An OpenCL context that shares the objects of the current OpenGL context.
-class SharingTest : protected WithGLContext, public QueueTest {
-protected:
-    SharingTest() : QueueTest(ORU::OCL::Context(propertiesToShare(), device())) {}
-
-    void TearDown() override {
-        if (OGL::Context::CurrentContext()) {
-            EXPECT_EQ(GLenum(GL_NO_ERROR), ::glGetError());
-        }
-    }
-
-    ORU::OCL::ContextProperties propertiesToShare() const {
-        ORU::OCL::ContextProperties properties(platform());
-        properties.setSharedRenderContext(glContext->renderContext());
-        properties.setDisplayContext(glContext->deviceContext());
-        return properties;
-    }
+    OGL::ContextOffscreen glContext_;
 };
 
 /// 0, 1, 2 and so on.

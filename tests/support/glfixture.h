@@ -1,5 +1,7 @@
-// What tests on a real context share: the fixture, a decorator that counts calls, name bookkeeping.
+// What tests on a real context share: the fixture, a decorator that counts calls.
 #pragma once
+
+#include "tests/support/pushed.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/extensionator/openglforwarder.h"
@@ -54,22 +56,6 @@ public:
 
 private:
     std::map<std::string, int> counts_;
-};
-
-/// Pushes a decorator for a scope.
-template<class Decorator>
-class Pushed {
-public:
-    Pushed() { ORU::OGL::OpenGLInterceptor::Instance()->addInterceptor(&decorator_); }
-    ~Pushed() { ORU::OGL::OpenGLInterceptor::Instance()->popInterceptor(); }
-    Pushed(Pushed const &) = delete;
-    Pushed &operator=(Pushed const &) = delete;
-
-    Decorator *operator->() { return &decorator_; }
-    Decorator &operator*() { return decorator_; }
-
-private:
-    Decorator decorator_;
 };
 
 /// Every test runs in an open library with an offscreen context current, and must leave no GL error

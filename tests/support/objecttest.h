@@ -20,6 +20,13 @@ inline GLint Get(GLenum name) {
     return value;
 }
 
+inline std::vector<GLint> Get(std::vector<GLenum> const &names) {
+    std::vector<GLint> values;
+    for (GLenum const name : names)
+        values.push_back(Get(name));
+    return values;
+}
+
 /// Follows the names of GL objects from generation to deletion.
 class NameLedger : public ORU::OGL::OpenGLForwarder {
 public:

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "oru/oru_ocl/ocllibrary.h"
-#include "tests/support/oclruntime/control.h"
+#include "tests/support/oclruntime/callbook.h"
 
 #include <string>
 
@@ -19,22 +19,19 @@ public:
         ::GetModuleFileNameA(nullptr, program, MAX_PATH);
         std::string const path = program;
         folder_ = path.substr(0, path.find_last_of('\\') + 1) + name + '\\';
-        HMODULE const module = ::LoadLibraryA((folder_ + "OpenCL.dll").c_str());
-        if (!module)
-            return;
-        auto const control = reinterpret_cast<RuntimeControlFunction>(
-            reinterpret_cast<void *>(::GetProcAddress(module, "OruTestRuntimeControl")));
-        control_ = control();
+        if (HMODULE const module = ::LoadLibraryA((folder_ + "OpenCL.dll").c_str()))
+            book_ = reinterpret_cast<CallBook *(*)()>(
+                reinterpret_cast<void *>(::GetProcAddress(module, "OruTestCallBook")))();
     }
 
     /// What `Library::IsOpenCLAvailable` takes.
     std::string const &folder() const { return folder_; }
 
-    RuntimeControl const *operator->() const { return control_; }
+    CallBook *operator->() const { return book_; }
 
 private:
     std::string folder_;
-    RuntimeControl const *control_ = nullptr;
+    CallBook *book_ = nullptr;
 };
 
 } // namespace oru_test

@@ -92,6 +92,16 @@ struct BoundTexture {
     Texture *operator->() const { return texture.get(); }
 };
 
+/// Filters and wrap modes of the texture bound to a target, as many of these as it has sides.
+inline std::vector<GLint> Sampling(GLenum target, std::size_t sides) {
+    GLenum const names[] = {GL_TEXTURE_MIN_FILTER, GL_TEXTURE_MAG_FILTER, GL_TEXTURE_WRAP_S,
+                            GL_TEXTURE_WRAP_T, GL_TEXTURE_WRAP_R};
+    std::vector<GLint> values(2 + sides);
+    for (std::size_t i = 0; i < values.size(); ++i)
+        ORU_GL(GetTexParameteriv, target, names[i], &values[i]);
+    return values;
+}
+
 /// `subImage` of whichever class, from memory or (with an offset behind it) from a buffer.
 template<class... Source>
 void Upload(Texture &texture, int level, Box const &box, Pixel pixel,

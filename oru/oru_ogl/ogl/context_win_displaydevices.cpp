@@ -1,6 +1,8 @@
 // Display devices of Windows: adapters and their outputs, by DXGI.
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/ogl/context.h"
+#include "oru/oru_ogl/ogl/internal/contexts/adapterorigins_win.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <boost/format.hpp>
@@ -78,18 +80,6 @@ DisplayDeviceKey MakeKey(ComPtr<IDXGIAdapter> const &adapter, DXGI_OUTPUT_DESC c
                             (boost::format("%1%") % description.DeviceId).str());
 }
 
-/// The key of the first wanted output of any adapter.
-template<class Wanted>
-bool FindKey(Wanted wanted, DisplayDeviceKey &key) {
-    return VisitAdapters([&](ComPtr<IDXGIAdapter> const &adapter) {
-        DXGI_OUTPUT_DESC output;
-        if (!FindOutput(adapter, wanted, output))
-            return false;
-        key = MakeKey(adapter, output);
-        return true;
-    });
-}
-
 DisplayDeviceKey AdapterDisplayKey(UINT adapterIndex) {
     ComPtr<IDXGIFactory1> const dxgiFactory = CreateFactory();
     ComPtr<IDXGIAdapter> adapter;
@@ -131,6 +121,31 @@ std::string WindowOutputName(HWND window) {
     return ToUTF8(outputDesc.DeviceName);
 }
 
+ambra::lumo::TVec2<int> OriginOf(DXGI_OUTPUT_DESC const &output) {
+    return {static_cast<int>(output.DesktopCoordinates.left),
+            static_cast<int>(output.DesktopCoordinates.top)};
+}
+
+/// Remembers where an adapter's desktop begins, for the contexts that are made next.
+void RememberOrigin(ComPtr<IDXGIAdapter> const &adapter) {
+    DXGI_OUTPUT_DESC output;
+    if (FindOutput(adapter, IsAttached, output))
+        internal::AdapterOrigins::Remember(ToUTF8(Describe(adapter).Description), OriginOf(output));
+}
+
+/// The key of the first wanted output of any adapter.
+template<class Wanted>
+bool FindKey(Wanted wanted, DisplayDeviceKey &key) {
+    return VisitAdapters([&](ComPtr<IDXGIAdapter> const &adapter) {
+        DropExceptions([&] { RememberOrigin(adapter); }); // nobody asked for it
+        DXGI_OUTPUT_DESC output;
+        if (!FindOutput(adapter, wanted, output))
+            return false;
+        key = MakeKey(adapter, output);
+        return true;
+    });
+}
+
 /// The output at the desktop's origin, attached or not.
 DisplayDeviceKey FindPrimary() {
     DisplayDeviceKey key;
@@ -140,6 +155,29 @@ DisplayDeviceKey FindPrimary() {
     if (!FindKey(isAtOrigin, key))
         ORU_THROW_INTERNAL("Unable to determine primary display");
     return key;
+}
+
+/// The position of the adapter's first attached output, which is remembered.
+ambra::lumo::TVec2<int> FindOrigin(std::string const &adapterName, bool defaultToZeroOnFailure) {
+    ambra::lumo::TVec2<int> origin(0, 0);
+    bool found = false;
+    try {
+        found = VisitAdapters([&](ComPtr<IDXGIAdapter> const &adapter) {
+            DXGI_OUTPUT_DESC output;
+            if (ToUTF8(Describe(adapter).Description) != adapterName ||
+                !FindOutput(adapter, IsAttached, output))
+                return false;
+            origin = OriginOf(output);
+            internal::AdapterOrigins::Remember(adapterName, origin);
+            return true;
+        });
+    } catch (...) {
+        ORU_ASSERT(defaultToZeroOnFailure);
+        return origin;
+    }
+    if (!found)
+        ORU_THROW_INTERNAL("Adapter not found");
+    return origin;
 }
 
 } // namespace
@@ -174,10 +212,7 @@ bool Context::DisplayDevice(std::size_t index, DisplayDeviceKey &key) {
 DisplayDeviceKey Context::DisplayDeviceFromWindow(HWND const &window) {
     std::string const name = WindowOutputName(window);
     DisplayDeviceKey key;
-    auto const hasName = [&name](DXGI_OUTPUT_DESC const &o) {
-        return ToUTF8(o.DeviceName) == name;
-    };
-    if (!FindKey(hasName, key))
+    if (!FindKey([&](DXGI_OUTPUT_DESC const &o) { return ToUTF8(o.DeviceName) == name; }, key))
         ORU_THROW_INTERNAL("Unable to determine device for specified window");
     return key;
 }
@@ -189,25 +224,13 @@ DisplayDeviceKey const &Context::PrimaryDisplayDevice() {
 
 ambra::lumo::TVec2<int> Context::DisplayOrigin(std::string const &adapterName,
                                                bool defaultToZeroOnFailure) {
-    ambra::lumo::TVec2<int> origin(0, 0);
-    bool found = false;
-    try {
-        found = VisitAdapters([&](ComPtr<IDXGIAdapter> const &adapter) {
-            DXGI_OUTPUT_DESC output;
-            if (ToUTF8(Describe(adapter).Description) != adapterName ||
-                !FindOutput(adapter, IsAttached, output))
-                return false;
-            origin = ambra::lumo::TVec2<int>(static_cast<int>(output.DesktopCoordinates.left),
-                                             static_cast<int>(output.DesktopCoordinates.top));
-            return true;
-        });
-    } catch (...) {
-        ORU_ASSERT(defaultToZeroOnFailure);
-        return origin;
-    }
-    if (!found)
-        ORU_THROW_INTERNAL("Adapter not found");
-    return origin;
+    return FindOrigin(adapterName, defaultToZeroOnFailure);
+}
+
+ambra::lumo::TVec2<int> internal::AdapterOrigin(std::string const &adapterName) {
+    if (auto const known = AdapterOrigins::Find(adapterName))
+        return *known;
+    return FindOrigin(adapterName, true);
 }
 
 } // namespace ORU::OGL

@@ -4,6 +4,7 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/internalwindow.h"
+#include "oru/oru_ogl/ogl/internal/contexts/adapterorigins_win.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {
@@ -27,7 +28,7 @@ ContextOffscreen::ContextOffscreen(Context const *share) : Context(KeyOf(share))
 
 void ContextOffscreen::create(Context const *share) {
     window_ =
-        MakeScoped(ORU_NEW InternalWindow(DisplayOrigin(displayDeviceKey().adapterName, true)));
+        MakeScoped(ORU_NEW InternalWindow(internal::AdapterOrigin(displayDeviceKey().adapterName)));
     initialize(::GetDC(window_->hWnd()), BufferFormat(8, 8, 8, 0, 0, 0, false), BUFFERING_SINGLE,
                MULTISAMPLING_NONE, share);
     publish(share);

@@ -1,100 +1,85 @@
 // Where records come from: one per device, one per foreign context, none before the library is
 // open.
-#include "tests/support/glfixture.h"
-#include "tests/support/testwindow.h"
+#include "tests/support/contexts.h"
+#include "tests/support/failure.h"
 
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
-#include "oru/oru_ogl/ogl/contextwrapped_win.h"
-#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
+#include "oru/oru_ogl/extensionator/glcall.h"
 
 #include <atomic>
 #include <cstdint>
 #include <cstring>
+#include <functional>
 #include <set>
+#include <sstream>
 #include <thread>
 #include <vector>
 
 using namespace ORU::OGL;
-using oru_test::MessageOf;
+using namespace oru_test;
 
 namespace {
 
-/// A context that the host makes with plain calls, current for its lifetime.
-class HostContext {
-public:
-    HostContext() {
-        PIXELFORMATDESCRIPTOR descriptor = {};
-        descriptor.nSize = sizeof descriptor;
-        descriptor.nVersion = 1;
-        descriptor.dwFlags = PFD_DRAW_TO_WINDOW | PFD_SUPPORT_OPENGL;
-        descriptor.iPixelType = PFD_TYPE_RGBA;
-        ::SetPixelFormat(dc_, ::ChoosePixelFormat(dc_, &descriptor), &descriptor);
-        rc_ = ::wglCreateContext(dc_);
-        EXPECT_TRUE(::wglMakeCurrent(dc_, rc_));
-    }
-    ~HostContext() {
-        ::wglMakeCurrent(nullptr, nullptr);
-        ::wglDeleteContext(rc_);
-        ::ReleaseDC(window_.hwnd(), dc_);
-    }
-    HostContext(HostContext const &) = delete;
-    HostContext &operator=(HostContext const &) = delete;
-
-    HDC dc() const { return dc_; }
-    HGLRC rc() const { return rc_; }
-
-private:
-    oru_test::TestWindow window_;
-    HDC dc_ = ::GetDC(window_.hwnd());
-    HGLRC rc_ = nullptr;
-};
-
 char const kNotInitialized[] = "OGL Library must be initialized to use Instance()";
+
+/// Runs the work on a few threads that begin it at the same moment, each with its own number.
+void OnThreads(std::size_t count, std::function<void(std::size_t)> const &work) {
+    std::atomic<std::size_t> waiting{count};
+    std::vector<std::thread> threads;
+    threads.reserve(count);
+    for (std::size_t i = 0; i < count; ++i)
+        threads.emplace_back([&, i] {
+            --waiting;
+            while (waiting > 0)
+                std::this_thread::yield();
+            work(i);
+        });
+    for (std::thread &thread : threads)
+        thread.join();
+}
 
 } // namespace
 
 TEST(LibraryStart, OpensOnceAndClosesOnce) {
-    EXPECT_EQ("sIsInitialized_", MessageOf([] { Library::Terminate(); }));
+    EXPECT_FAILURE("sIsInitialized_", Library::Terminate());
     {
         AutoInitializer library;
-        EXPECT_EQ("!sIsInitialized_",
-                  MessageOf([] { Library::Initialize(Library::InitOptions()); }));
+        EXPECT_FAILURE("!sIsInitialized_", Library::Initialize(Library::InitOptions()));
         EXPECT_EQ(nullptr, ExtensionManager::Instance());
         library.release();
     }
     EXPECT_TRUE(Library::IsInitialized());
     Library::Terminate();
     EXPECT_FALSE(Library::IsInitialized());
-    EXPECT_EQ(kNotInitialized,
-              MessageOf([] { ExtensionManager::Instance(static_cast<Context const *>(nullptr)); }));
+    EXPECT_FAILURE(kNotInitialized,
+                   ExtensionManager::Instance(static_cast<Context const *>(nullptr)));
 }
 
 TEST(LibraryStart, HandsOptionsToNewContexts) {
     AutoInitializer library;
     ExtensionManager::InitOptions options;
+    auto const current = [] { return ExtensionManager::CurrentInitOptions().openGLProfile(); };
     options.setOpenGLProfile(OPENGLPROFILE_CORE);
     {
         ExtensionManager::ScopedInitOptions const outer(options);
         {
             ExtensionManager::ScopedInitOptions const inner(ExtensionManager::InitOptions{});
-            EXPECT_EQ(OPENGLPROFILE_DEFAULT,
-                      ExtensionManager::CurrentInitOptions().openGLProfile());
+            EXPECT_EQ(OPENGLPROFILE_DEFAULT, current());
         }
-        ContextOffscreen context;
+        ContextOffscreen const context;
         EXPECT_EQ(OPENGLPROFILE_CORE, context.openGLProfile());
         EXPECT_EQ(OPENGLPROFILE_CORE,
                   ExtensionManager::Instance(&context)->initOptions().openGLProfile());
     }
-    EXPECT_EQ(OPENGLPROFILE_DEFAULT, ExtensionManager::CurrentInitOptions().openGLProfile());
+    EXPECT_EQ(OPENGLPROFILE_DEFAULT, current());
 }
 
 TEST(DeviceRecord, IsBuiltOnceForAllContextsOfADevice) {
     AutoInitializer library;
-    oru_test::ContextCounter const created;
-    int const before = oru_test::ContextCounter::Made();
+    Pushed<ContextCounter> const counter;
     ContextOffscreen first, second, third(&first);
-    EXPECT_EQ(4, oru_test::ContextCounter::Made() - before) << "one of them to build the record";
-    EXPECT_EQ(nullptr, ::wglGetCurrentContext());
+    EXPECT_EQ(4, ContextCounter::Made()) << "one of them to build the record";
+    EXPECT_EQ(3u, ContextCounter::Alive());
 
     ExtensionManager *const record = ExtensionManager::Instance(first.displayDeviceKey());
     for (Context const *context : {&first, &second, &third}) {
@@ -105,7 +90,7 @@ TEST(DeviceRecord, IsBuiltOnceForAllContextsOfADevice) {
         EXPECT_EQ(&record->table(), &ExtensionManager::CurrentTable());
     }
     ExtensionManager::UnRegisterContext(second);
-    EXPECT_EQ("bFound", MessageOf([&] { ExtensionManager::UnRegisterContext(second); }));
+    EXPECT_FAILURE("bFound", ExtensionManager::UnRegisterContext(second));
     EXPECT_EQ(nullptr, ExtensionManager::Instance(second.renderContext()));
     ExtensionManager::RegisterContext(second);
     EXPECT_EQ(record, ExtensionManager::Instance(second.renderContext()));
@@ -117,39 +102,18 @@ TEST(DeviceRecord, IsOneForThreadsThatBuildItAtOnce) {
         AutoInitializer library;
         DisplayDeviceKey key;
         ASSERT_TRUE(Context::DisplayDevice(0, key));
-        std::atomic<int> waiting{8};
         std::vector<ExtensionManager *> records(8);
-        std::vector<std::thread> threads;
-        threads.reserve(8);
-        for (auto &record : records)
-            threads.emplace_back([&] {
-                --waiting;
-                while (waiting > 0)
-                    std::this_thread::yield();
-                record = ExtensionManager::Instance(key);
-            });
-        for (std::thread &thread : threads)
-            thread.join();
-        std::set<ExtensionManager *> const distinct(records.begin(), records.end());
-        ASSERT_EQ(1u, distinct.size());
-        EXPECT_TRUE((*distinct.begin())->isSupported(GL_VERSION_2_0));
+        OnThreads(records.size(),
+                  [&](std::size_t i) { records[i] = ExtensionManager::Instance(key); });
+        ASSERT_EQ(1u, std::set<ExtensionManager *>(records.begin(), records.end()).size());
+        EXPECT_TRUE(records[0]->isSupported(GL_VERSION_2_0));
     }
-}
-
-TEST(DeviceRecord, RestoresTheCurrentContext) {
-    AutoInitializer library;
-    HostContext host;
-    DisplayDeviceKey key;
-    ASSERT_TRUE(Context::DisplayDevice(0, key));
-    ASSERT_NE(nullptr, ExtensionManager::Instance(key));
-    EXPECT_EQ(host.rc(), ::wglGetCurrentContext());
-    EXPECT_EQ(host.dc(), ::wglGetCurrentDC());
 }
 
 TEST(ForeignRecord, IsBuiltAtTheFirstCallAndOnce) {
     HostContext host;
-    EXPECT_EQ(kNotInitialized, MessageOf([] { ExtensionManager::CurrentTable(); }));
-    EXPECT_EQ(kNotInitialized, MessageOf([] { ORU_GL(UseProgram, 0u); }));
+    EXPECT_FAILURE(kNotInitialized, ExtensionManager::CurrentTable());
+    EXPECT_FAILURE(kNotInitialized, ORU_GL(UseProgram, 0u));
 
     AutoInitializer library;
     EXPECT_EQ(nullptr, ExtensionManager::Instance());
@@ -160,10 +124,14 @@ TEST(ForeignRecord, IsBuiltAtTheFirstCallAndOnce) {
     EXPECT_EQ(&record->table(), &ExtensionManager::CurrentTable());
     EXPECT_EQ(record, ExtensionManager::InstanceGuaranteed(host.rc()));
 
-    // Adopting it leaves the record it has; its display device is found all the same.
+    // Adopting it leaves the record it has; its display device is found all the same, and that
+    // device's record, which is another one, built without taking the host's context away.
     ContextWrapped const adopted;
     EXPECT_EQ(record, ExtensionManager::Instance(host.rc()));
     EXPECT_FALSE(adopted.displayDeviceKey().deviceID.empty());
+    EXPECT_NE(record, ExtensionManager::Instance(&adopted));
+    EXPECT_EQ(host.rc(), ::wglGetCurrentContext());
+    EXPECT_EQ(host.dc(), ::wglGetCurrentDC());
 }
 
 TEST(ForeignRecord, IsEmptyWithoutAContext) {
@@ -178,32 +146,22 @@ TEST(ForeignRecord, IsEmptyWithoutAContext) {
 // More contexts than the read-only index of the registry has places (264): the map behind it
 // answers for the rest. The handles are none of a real context, so nothing limits their number.
 TEST(ContextRegistry, FindsMoreContextsThanItsIndexHolds) {
-    struct Fake : Context {
-        Fake(std::uintptr_t handle, Context const &like)
-            : Context(reinterpret_cast<HGLRC>(handle)) {
-            setDisplayDeviceKey(like.displayDeviceKey());
-        }
-    };
     AutoInitializer library;
     ContextOffscreen const real;
     ExtensionManager *const record = ExtensionManager::Instance(&real);
-    std::vector<std::unique_ptr<Fake>> contexts;
+    std::vector<std::unique_ptr<Exposed<Context>>> contexts;
     for (std::uintptr_t i = 1; i <= 400; ++i) {
-        contexts.push_back(std::make_unique<Fake>(i << 16, real));
+        contexts.push_back(
+            std::make_unique<Exposed<Context>>(reinterpret_cast<HGLRC>(i << 16)));
+        contexts.back()->setDisplayDeviceKey(real.displayDeviceKey());
         ExtensionManager::RegisterContext(*contexts.back());
     }
-    std::vector<std::thread> threads;
-    threads.reserve(4);
-    for (int t = 0; t < 4; ++t)
-        threads.emplace_back([&] {
-            int wrong = 0;
-            for (auto const &context : contexts)
-                wrong +=
-                    &ExtensionManager::CurrentTable(context->renderContext()) != &record->table();
-            EXPECT_EQ(0, wrong);
-        });
-    for (std::thread &thread : threads)
-        thread.join();
+    OnThreads(4, [&](std::size_t) {
+        int wrong = 0;
+        for (auto const &context : contexts)
+            wrong += &ExtensionManager::CurrentTable(context->renderContext()) != &record->table();
+        EXPECT_EQ(0, wrong);
+    });
     for (auto const &context : contexts) {
         ExtensionManager::UnRegisterContext(*context);
         EXPECT_EQ(nullptr, ExtensionManager::Instance(context->renderContext()));

@@ -1,5 +1,6 @@
 // Texture units, their state, and the scope that draws with one texture.
 #include "tests/support/texturekinds.h"
+#include "tests/support/translations.h"
 
 #include "oru/oru_ogl/ogl/texturebindscope.h"
 #include "oru/oru_ogl/ogl/texturestate.h"
@@ -9,16 +10,10 @@ using namespace oru_test;
 
 namespace {
 
-/// The unit's private question, reached by an explicit instantiation, which may name it.
-template<bool (TextureUnit::*Member)() const>
-struct Opened {
-    friend bool IsActive(TextureUnit const &unit) { return (unit.*Member)(); }
-};
-template struct Opened<&TextureUnit::verifyActiveTexture>;
-bool IsActive(TextureUnit const &unit);
-
-void ExpectBound(TextureUnit const &unit, Texture const &texture,
-                 void (TextureUnit::*bindDefault)() const) {
+template<class Kind>
+void ExpectBinding(TextureUnit const &unit, Kind const &texture,
+                   void (TextureUnit::*bindDefault)() const) {
+    unit.bind(&texture);
     EXPECT_TRUE(texture.isBound());
     (unit.*bindDefault)();
     EXPECT_EQ(0u, texture.getBoundID());
@@ -27,107 +22,86 @@ void ExpectBound(TextureUnit const &unit, Texture const &texture,
     (unit.*bindDefault)();
 }
 
+struct Enabling {
+    GLenum target;
+    void (TextureUnit::*enable)() const;
+    void (TextureUnit::*disable)() const;
+    bool (TextureUnit::*isEnabled)() const;
+};
+
+#define ORU_ENABLING(Target, gl)                                                                   \
+    {                                                                                              \
+        gl, &TextureUnit::enable##Target, &TextureUnit::disable##Target,                           \
+            &TextureUnit::isEnabled##Target                                                        \
+    }
+Enabling const kEnablings[] = {ORU_ENABLING(1D, GL_TEXTURE_1D), ORU_ENABLING(2D, GL_TEXTURE_2D),
+                               ORU_ENABLING(3D, GL_TEXTURE_3D),
+                               ORU_ENABLING(RECT, GL_TEXTURE_RECTANGLE)};
+#undef ORU_ENABLING
+
 } // namespace
 
 class TextureUnitTest : public ObjectTest {};
 
 TEST_F(TextureUnitTest, ActsOnTheActiveUnit) {
-    Texture1D const one(Texture::INTERNALFORMAT_RGBA8, 4, false);
-    Texture2D const two(Texture::INTERNALFORMAT_RGBA8, 4, 4, false);
-    TextureRECT const rectangle(Texture::INTERNALFORMAT_RGBA8, 4, 4);
-    Texture3D const three(Texture::INTERNALFORMAT_RGBA8, 4, 4, 4, false);
-    Texture2DArray const array(Texture::INTERNALFORMAT_RGBA8, 4, 4, 4, false);
+    auto const format = Texture::INTERNALFORMAT_RGBA8;
     for (unsigned int const index : {3u, 0u}) {
         TextureState::SetActiveTextureUnit(index);
         EXPECT_EQ(index, TextureState::ActiveTextureUnit());
-        EXPECT_TRUE(IsActive(*TextureUnit::Unit(index)));
-        EXPECT_FALSE(IsActive(*TextureUnit::Unit(3 - index)));
+        EXPECT_EQ(static_cast<GLint>(GL_TEXTURE0 + index), Get(GL_ACTIVE_TEXTURE));
         TextureUnit const &unit = *TextureUnit::Unit(index);
-        unit.bind(&one);
-        unit.bind(&two);
-        unit.bind(&rectangle);
-        unit.bind(&three);
-        unit.bind(&array);
-        ExpectBound(unit, one, &TextureUnit::bind1DDefault);
-        ExpectBound(unit, two, &TextureUnit::bind2DDefault);
-        ExpectBound(unit, rectangle, &TextureUnit::bindRECTDefault);
-        ExpectBound(unit, three, &TextureUnit::bind3DDefault);
-        ExpectBound(unit, array, &TextureUnit::bind2DArrayDefault);
-#define ORU_CHECK(Target, gl)                                                                      \
-    EXPECT_FALSE(unit.isEnabled##Target());                                                        \
-    unit.enable##Target();                                                                         \
-    EXPECT_TRUE(unit.isEnabled##Target() && ::glIsEnabled(gl));                                    \
-    unit.disable##Target();                                                                        \
-    EXPECT_FALSE(::glIsEnabled(gl));
-        ORU_CHECK(1D, GL_TEXTURE_1D)
-        ORU_CHECK(2D, GL_TEXTURE_2D)
-        ORU_CHECK(3D, GL_TEXTURE_3D)
-        ORU_CHECK(RECT, GL_TEXTURE_RECTANGLE)
-#undef ORU_CHECK
+        ExpectBinding(unit, Texture1D(format, 4, false), &TextureUnit::bind1DDefault);
+        ExpectBinding(unit, Texture2D(format, 4, 4, false), &TextureUnit::bind2DDefault);
+        ExpectBinding(unit, TextureRECT(format, 4, 4), &TextureUnit::bindRECTDefault);
+        ExpectBinding(unit, Texture3D(format, 4, 4, 4, false), &TextureUnit::bind3DDefault);
+        ExpectBinding(unit, Texture2DArray(format, 4, 4, 4, false),
+                      &TextureUnit::bind2DArrayDefault);
+        for (Enabling const &row : kEnablings) {
+            EXPECT_FALSE((unit.*row.isEnabled)());
+            (unit.*row.enable)();
+            EXPECT_TRUE((unit.*row.isEnabled)() && ::glIsEnabled(row.target));
+            (unit.*row.disable)();
+            EXPECT_FALSE(::glIsEnabled(row.target));
+        }
     }
     EXPECT_FAILURE("GL_INVALID_ENUM", TextureState::SetActiveTextureUnit(1000));
-}
-
-TEST_F(TextureUnitTest, SetsEveryEnvironment) {
-    unsigned int const modes[] = {0x0104, 0x0BE2, 0x8570, 0x2101, 0x2100, 0x1E01};
-    for (unsigned int i = 0; i < 6; ++i) {
-        auto const environment = static_cast<TextureUnit::Environment>(i);
-        EXPECT_EQ(modes[i], TextureUnit::Environment2GL(environment));
-        EXPECT_EQ(environment, TextureUnit::GL2Environment(modes[i]));
-        TextureUnit::Unit(0)->setEnv(environment);
-        GLint mode = 0;
-        ORU_GL(GetTexEnviv, GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE, &mode);
-        EXPECT_EQ(static_cast<GLint>(modes[i]), mode);
-    }
-    std::string const failure = "!\"Environment enums are not all properly translated.\"";
-    EXPECT_FAILURE(failure, TextureUnit::GL2Environment(GL_LINEAR));
-    EXPECT_FAILURE(failure, TextureUnit::Environment2GL(static_cast<TextureUnit::Environment>(6)));
+    ExpectTranslation("Environment", TextureUnit::Environment2GL, TextureUnit::GL2Environment, 6,
+                      GL_REPLACE);
 }
 
 TEST_F(TextureUnitTest, ScopeLeavesTheUnitEmptyAndTheOtherActive) {
-    Texture2D texture(Texture::INTERNALFORMAT_RGBA8, 4, 4, false);
-    TextureUnit::Unit(0)->bind(&texture);
-    texture.setFilter(Texture::FILTER_LINEAR, Texture::FILTER_LINEAR);
-    texture.setWrap(Texture::WRAPMODE_REPEAT, Texture::WRAPMODE_REPEAT);
+    BoundTexture const texture(
+        std::make_unique<Texture2D>(Texture::INTERNALFORMAT_RGBA8, 4, 4, false));
+    auto &plane = dynamic_cast<Texture2D &>(*texture);
+    plane.setFilter(Texture::FILTER_LINEAR, Texture::FILTER_LINEAR);
+    plane.setWrap(Texture::WRAPMODE_REPEAT, Texture::WRAPMODE_REPEAT);
     TextureUnit::Unit(0)->bind2DDefault();
     TextureState::SetActiveTextureUnit(2);
     {
-        Texture2DBindScope const scope(&texture, 0, true);
+        Texture2DBindScope const scope(&plane, 0, true);
         EXPECT_EQ(0u, TextureState::ActiveTextureUnit());
-        EXPECT_TRUE(texture.isBound() && TextureUnit::Unit(0)->isEnabled2D());
+        EXPECT_TRUE(plane.isBound() && TextureUnit::Unit(0)->isEnabled2D());
         GLint mode = 0;
         ORU_GL(GetTexEnviv, GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE, &mode);
         EXPECT_EQ(GL_REPLACE, mode);
     }
     EXPECT_EQ(2u, TextureState::ActiveTextureUnit());
     TextureState::SetActiveTextureUnit(0);
-    EXPECT_EQ(0u, texture.getBoundID());
+    EXPECT_EQ(0u, plane.getBoundID());
     EXPECT_FALSE(TextureUnit::Unit(0)->isEnabled2D());
-    TextureUnit::Unit(0)->bind(&texture);
-    std::pair<GLenum, GLint> const kept[] = {{GL_TEXTURE_MIN_FILTER, GL_NEAREST},
-                                             {GL_TEXTURE_MAG_FILTER, GL_NEAREST},
-                                             {GL_TEXTURE_WRAP_S, GL_CLAMP_TO_EDGE},
-                                             {GL_TEXTURE_WRAP_T, GL_CLAMP_TO_EDGE}};
-    for (auto const &[parameter, expected] : kept) {
-        GLint value = 0;
-        ORU_GL(GetTexParameteriv, GL_TEXTURE_2D, parameter, &value);
-        EXPECT_EQ(expected, value);
-    }
-    TextureUnit::Unit(0)->bind2DDefault();
-}
+    texture.bind();
+    EXPECT_EQ((std::vector<GLint>{GL_NEAREST, GL_NEAREST, GL_CLAMP_TO_EDGE, GL_CLAMP_TO_EDGE}),
+              Sampling(GL_TEXTURE_2D, 2));
 
-TEST_F(TextureUnitTest, ScopeMayBeInactiveOrFail) {
+    // Inactive, or without a texture, or on a unit that there is not: the active one stays.
+    TextureState::SetActiveTextureUnit(1);
     {
-        Pushed<CountingForwarder> counter;
+        Pushed<CountingForwarder> calls;
         Texture2DBindScope const scope(nullptr, 3, false);
-        EXPECT_EQ(0, counter->total());
+        EXPECT_EQ(0, calls->total());
     }
     EXPECT_FAILURE("theTexture", Texture2DBindScope const scope(nullptr, 3, true));
-
-    // There is no such unit; the active one stays.
-    TextureState::SetActiveTextureUnit(1);
-    Texture2D texture(Texture::INTERNALFORMAT_RGBA8, 4, 4, false);
-    EXPECT_FAILURE("GL_INVALID_ENUM", Texture2DBindScope const scope(&texture, 1000, true));
+    EXPECT_FAILURE("GL_INVALID_ENUM", Texture2DBindScope const scope(&plane, 1000, true));
     EXPECT_EQ(1u, TextureState::ActiveTextureUnit());
     TextureState::SetActiveTextureUnit(0);
 }

@@ -3,6 +3,7 @@
 #include "tests/support/texturekinds.h"
 
 #include "oru/core/utility/boundary.h"
+#include "oru/oru_ogl/extensionator/opengltokenname.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
 
 #include <cstring>
@@ -15,7 +16,6 @@ namespace {
 
 Pixel const kBytes{Texture::FORMAT_RGBA, Texture::TYPE_UNSIGNED_BYTE};
 Pixel const kRed{Texture::FORMAT_RED, Texture::TYPE_UNSIGNED_BYTE};
-Pixel const kShorts{Texture::FORMAT_RG, Texture::TYPE_UNSIGNED_SHORT};
 
 /// What a texel of a base format keeps of a colour, as glGetTexImage gives it back for GL_RGBA.
 std::array<float, 4> Kept(std::string const &format, float const *c) {
@@ -63,6 +63,63 @@ bool AreNear(std::vector<unsigned char> const &a, std::vector<unsigned char> con
     return true;
 }
 
+using Bytes = Image<unsigned char>;
+
+/// Writes a part of a level, from rows of memory with gaps or from a buffer with the same, and a
+/// copy of the part into `image`.
+void UploadPart(TextureKind const &kind, Texture &texture, int level, Bytes &image,
+                unsigned int alignment, bool buffered) {
+    Box box = {{}, kind.cut({3, 2, 2})};
+    std::copy_n(Sides{1, 2, 1}.begin(), kind.sides, box.at.begin());
+    PixelUnpackParameters params;
+    params.setAlignment(alignment);
+    params.setRowLength(9);
+    std::size_t const row = ORU::IncrementToBoundaryPtr(9, static_cast<int>(alignment));
+    std::vector<unsigned char> source(8 + row * 4);
+    std::iota(source.begin(), source.end(), static_cast<unsigned char>(100));
+    Bytes::ForEach(box.size, [&](int x, int y, int z) {
+        *image.at(box.at[0] + x, box.at[1] + y, box.at[2] + z) =
+            source[8 + Size(z * 2 + y) * row + Size(x)];
+    });
+    if (buffered) {
+        Buffer buffer(static_cast<std::int64_t>(source.size()), Buffer::TYPE_ARRAY_BUFFER,
+                      Buffer::USAGE_STREAM_DRAW, source.data());
+        Upload(texture, level, box, kRed, params, &buffer, std::size_t(8));
+        EXPECT_TRUE(buffer.isUnpackBuffer());
+        EXPECT_EQ(0u, buffer.getBoundID());
+    } else {
+        Upload(texture, level, box, kRed, params, static_cast<void const *>(&source[8]));
+    }
+    EXPECT_EQ(0, Get(GL_UNPACK_ROW_LENGTH));
+}
+
+/// Expects an image in rows of an alignment, in memory or in a buffer, behind a gap.
+void ExpectRows(TextureKind const &kind, Texture const &texture, int level, Bytes const &image,
+                unsigned int alignment, bool buffered) {
+    std::size_t const width = Size(image.size[0]), gap = 7,
+                      row = ORU::IncrementToBoundaryPtr(width, static_cast<int>(alignment));
+    std::vector<unsigned char> expected(gap + image.texels.size() / width * row, 0xEE);
+    std::vector<unsigned char> read(expected);
+    for (std::size_t i = 0; i < image.texels.size(); ++i)
+        expected[gap + i / width * row + i % width] = image.texels[i];
+    if (buffered) {
+        auto const size = static_cast<std::int64_t>(read.size());
+        Buffer occupant(4, Buffer::TYPE_PIXEL_PACK_BUFFER, Buffer::USAGE_STREAM_READ, nullptr);
+        Buffer buffer(size, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STREAM_READ, read.data());
+        occupant.bind();
+        ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, 4);
+        Download(texture, level, kRed, alignment, &buffer, static_cast<int>(gap));
+        EXPECT_TRUE(occupant.isBound());
+        EXPECT_EQ(kind.sides == 1 ? 1 : 4, Get(GL_PACK_ALIGNMENT)) << "left so by one side only";
+        buffer.bind();
+        buffer.getSubData(0, size, read.data());
+        Buffer::BindDefaultPackBuffer();
+    } else {
+        Download(texture, level, kRed, alignment, static_cast<void *>(&read[gap]));
+    }
+    EXPECT_EQ(expected, read);
+}
+
 } // namespace
 
 class TransferTest : public ObjectTest {};
@@ -101,28 +158,42 @@ TEST_F(TransferTest, EveryInternalFormatKeepsItsChannels) {
 }
 
 // Every client format with every type is taken or refused as OpenGL has it, and comes back byte for
-// byte through a float texture.
+// byte through a float texture; its size is told unless the type is packed or an integer of 32
+// bits.
 TEST_F(TransferTest, EveryClientLayoutComesBackByteForByte) {
     char const typeBytes[] = "110224441122222244442"; // of a component, or of a packed pixel
     std::mt19937 random{20};
     for (unsigned int f = Texture::FORMAT_RED; f <= Texture::FORMAT_LUMINANCE_ALPHA; ++f) {
         auto const format = static_cast<Texture::Format>(f);
-        BoundTexture const texture(std::make_unique<Texture2D>(
+        auto made = std::make_unique<Texture2D>(
             format == Texture::FORMAT_ALPHA  ? Texture::INTERNALFORMAT_ALPHA32F_ARB
             : f >= Texture::FORMAT_LUMINANCE ? Texture::INTERNALFORMAT_LUMINANCE_ALPHA32F_ARB
                                              : Texture::INTERNALFORMAT_RGBA32F_ARB,
-            5, 3, false));
+            5, 3, false);
+        Texture2D const &plane = *made;
+        BoundTexture const texture(std::move(made));
         for (unsigned int t = 0; t <= Texture::TYPE_HALF_FLOAT; ++t) {
             auto const type = static_cast<Texture::Type>(t);
-            if (t == Texture::TYPE_BITMAP)
-                continue;
             SCOPED_TRACE(testing::Message() << "format " << f << " type " << t);
+            bool const isInteger = t == Texture::TYPE_INT || t == Texture::TYPE_UNSIGNED_INT;
             bool const packed = t > Texture::TYPE_FLOAT && t < Texture::TYPE_HALF_FLOAT;
             bool const ofThree = t <= Texture::TYPE_UNSIGNED_SHORT_5_6_5_REV;
             bool const ofFour = format == Texture::FORMAT_RGBA || format == Texture::FORMAT_BGRA;
             bool const valid = !packed || (ofThree ? format == Texture::FORMAT_RGB : ofFour);
-            Image<unsigned char> image({5, 3, 1}, Size(typeBytes[t] - '0') *
-                                                      (packed ? 1 : Texture::Channels(format)));
+            Bytes image({5, 3, 1},
+                        Size(typeBytes[t] - '0') * (packed ? 1 : Texture::Channels(format)));
+            std::size_t size = 0;
+            auto const measure = [&] { size = plane.pixelDataSize(1, format, type); };
+            if (packed || isInteger || t == Texture::TYPE_BITMAP) {
+                EXPECT_FAILURE("pixelDataSize: Unknown type " +
+                                   std::string(ORUOGLTokenName(Texture::Type2GL(type))),
+                               measure());
+            } else {
+                measure();
+                EXPECT_EQ(image.texels.size(), size);
+            }
+            if (t == Texture::TYPE_BITMAP)
+                continue;
             for (unsigned char &byte : image.texels) // in all types positive, normal and finite
                 byte = static_cast<unsigned char>(4 + random() % 0x74);
             EXPECT_FAILURE(valid ? "" : "GL_INVALID_OPERATION",
@@ -132,7 +203,7 @@ TEST_F(TransferTest, EveryClientLayoutComesBackByteForByte) {
                 continue;
             }
             std::vector<unsigned char> const read = image.read(*texture, {format, type});
-            if (t == Texture::TYPE_INT || t == Texture::TYPE_UNSIGNED_INT)
+            if (isInteger)
                 EXPECT_TRUE(AreNear(image.texels, read));
             else
                 EXPECT_EQ(image.texels, read);
@@ -140,114 +211,21 @@ TEST_F(TransferTest, EveryClientLayoutComesBackByteForByte) {
     }
 }
 
-// Rows of memory with gaps, skipped parts and alignments, from memory and from a buffer, into every
-// kind; no unpack state is left behind.
-TEST_F(TransferTest, EveryMemoryLayoutReachesEveryKind) {
+// Levels of every kind, from memory and from a buffer, into memory and into a buffer.
+TEST_F(TransferTest, EveryMemoryLayoutGoesThereAndBack) {
     for (TextureKind const &kind : kTextureKinds) {
         for (unsigned int i = 0; i < 8; ++i) {
-            unsigned int const alignment = 1u << i / 2;
-            SCOPED_TRACE(testing::Message() << kind.name << " alignment " << alignment);
-            Box box = {{}, kind.cut({3, 2, 2})};
-            std::copy_n(Sides{1, 2, 1}.begin(), kind.sides, box.at.begin());
-            // The driver here swaps too few bytes when anything is skipped.
-            bool const swap = alignment == 2;
-            Sides skip = {};
-            if (!swap)
-                std::copy_n(Sides{2, 1, 1}.begin(), kind.sides, skip.begin());
-
-            // Pixels of two 16-bit components: a row of 7 takes 28 bytes, or 32.
-            std::size_t const row = ORU::IncrementToBoundaryPtr(28, static_cast<int>(alignment));
-            std::vector<std::uint16_t> source(row * 6 * 5 / 2);
-            std::iota(source.begin(), source.end(), std::uint16_t(1000));
-            PixelUnpackParameters params;
-            params.setAlignment(alignment);
-            params.setRowLength(7);
-            params.setImageHeight(6);
-            params.setSkipPixels(Size(skip[0]));
-            params.setSkipRows(Size(skip[1]));
-            params.setSkipImages(Size(skip[2]));
-            if (swap)
-                params.enableSwapBytes();
-
-            Image<std::uint16_t> expected(kind.cut({6, 5, 4}), 2, 77);
-            BoundTexture const texture(
-                kind.make(Texture::INTERNALFORMAT_RG16, expected.size, false));
-            expected.upload(*texture, kShorts);
-            Image<std::uint16_t>::ForEach(box.size, [&](int x, int y, int z) {
-                std::size_t const line = Size(z + skip[2]) * 6 + Size(y + skip[1]);
-                for (std::size_t c = 0; c < 2; ++c) {
-                    std::uint16_t v = source[line * row / 2 + Size(x + skip[0]) * 2 + c];
-                    if (swap)
-                        v = static_cast<std::uint16_t>(v << 8 | v >> 8);
-                    expected.at(box.at[0] + x, box.at[1] + y, box.at[2] + z)[c] = v;
-                }
-            });
-            if (i % 2) {
-                source.insert(source.begin(), 4, 0);
-                Buffer buffer(static_cast<std::int64_t>(source.size() * 2),
-                              Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STREAM_DRAW, source.data());
-                Upload(*texture, 0, box, kShorts, params, &buffer, std::size_t(8));
-                EXPECT_TRUE(buffer.isUnpackBuffer());
-                EXPECT_EQ(0u, buffer.getBoundID());
-            } else {
-                Upload(*texture, 0, box, kShorts, params, static_cast<void const *>(&source[0]));
-            }
-            EXPECT_EQ(0, Get(GL_UNPACK_ROW_LENGTH));
-            EXPECT_EQ(expected.texels, expected.read(*texture, kShorts));
-        }
-    }
-}
-
-// Rows of 5 bytes come back padded to the alignment, and into a buffer at an offset.
-TEST_F(TransferTest, EveryKindIsReadWithAlignmentAndIntoABuffer) {
-    for (TextureKind const &kind : kTextureKinds) {
-        SCOPED_TRACE(kind.name);
-        Image<unsigned char> image(kind.cut({5, 3, 2}), 1);
-        BoundTexture const texture(kind.make(Texture::INTERNALFORMAT_RED, image.size, false));
-        std::iota(image.texels.begin(), image.texels.end(), static_cast<unsigned char>(1));
-        image.upload(*texture, kRed);
-        std::size_t const rows = image.texels.size() / 5;
-        for (unsigned int const alignment : {1u, 2u, 4u, 8u}) {
-            std::size_t const row = ORU::IncrementToBoundaryPtr(5, static_cast<int>(alignment));
-            std::vector<unsigned char> expected(rows * row, 0xEE), read(expected);
-            for (std::size_t i = 0; i < rows; ++i)
-                std::copy_n(&image.texels[i * 5], 5, &expected[i * row]);
-            Download(*texture, 0, kRed, alignment, static_cast<void *>(read.data()));
-            EXPECT_EQ(expected, read) << "alignment " << alignment;
-        }
-
-        Buffer occupant(4, Buffer::TYPE_PIXEL_PACK_BUFFER, Buffer::USAGE_STREAM_READ, nullptr);
-        occupant.bind();
-        std::vector<unsigned char> expected(64, 0x11), read(64);
-        Buffer buffer(64, Buffer::TYPE_PIXEL_UNPACK_BUFFER, Buffer::USAGE_STREAM_READ,
-                      expected.data());
-        Download(*texture, 0, kRed, kind.sides == 1 ? 4 : 1, &buffer, 7);
-        EXPECT_TRUE(occupant.isBound());
-        EXPECT_EQ(kind.sides == 1 ? 1 : 4, Get(GL_PACK_ALIGNMENT)) << "left so by one side only";
-        ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, 4);
-        std::copy(image.texels.begin(), image.texels.end(), expected.begin() + 7);
-        buffer.bind();
-        buffer.getSubData(0, 64, read.data());
-        EXPECT_EQ(expected, read);
-        Buffer::BindDefaultPackBuffer();
-    }
-}
-
-TEST_F(TransferTest, WritesAndReadsMipLevels) {
-    for (TextureKind const &kind : kTextureKinds) {
-        if (!kind.mipmaps())
-            continue;
-        SCOPED_TRACE(kind.name);
-        Sides size = kind.cut({8, 4, 2});
-        BoundTexture const texture(kind.make(Texture::INTERNALFORMAT_RGBA8, size, true));
-        std::vector<Image<unsigned char>> levels;
-        for (int level = 0; level < 4; ++level, size = kind.halved(size)) {
-            levels.emplace_back(size, 4, static_cast<unsigned char>(40 * level + 9));
-            levels.back().upload(*texture, kBytes, level);
-        }
-        for (int level = 0; level < 4; ++level) {
-            auto const &expected = levels[static_cast<std::size_t>(level)];
-            EXPECT_EQ(expected.texels, expected.read(*texture, kBytes, level)) << level;
+            unsigned int const alignment = 1u << i % 4;
+            bool const buffered = i >= 4;
+            SCOPED_TRACE(testing::Message() << kind.name << " " << alignment << " " << buffered);
+            int const level = kind.mipmaps() ? static_cast<int>(i % 2) : 0;
+            Sides const whole = kind.cut({19, 10, 8});
+            Bytes image(level ? kind.halved(whole) : whole, 1);
+            std::iota(image.texels.begin(), image.texels.end(), static_cast<unsigned char>(0));
+            BoundTexture const texture(kind.make(Texture::INTERNALFORMAT_RED, whole, true));
+            image.upload(*texture, kRed, level);
+            UploadPart(kind, *texture, level, image, alignment, buffered);
+            ExpectRows(kind, *texture, level, image, alignment, buffered);
         }
     }
 }
@@ -260,7 +238,7 @@ TEST_F(TransferTest, MakesA3DTextureWithItsContents) {
     BoundTexture const texture(std::make_unique<Texture3D>(
         Texture::INTERNALFORMAT_RED, 0, 2, 2, 2, kRed.format, kRed.type, pixels.data(), params));
     EXPECT_EQ((std::vector<unsigned char>{1, 2, 3, 4, 5, 6, 7, 8}),
-              Image<unsigned char>({2, 2, 2}, 1).read(*texture, kRed));
+              Bytes({2, 2, 2}, 1).read(*texture, kRed));
     EXPECT_FAILURE("GL_INVALID_VALUE", Texture3D(Texture::INTERNALFORMAT_RED, -1, 2, 2, 2,
                                                  kRed.format, kRed.type, pixels.data(), params));
     EXPECT_EQ(0, Get(GL_CLIENT_ATTRIB_STACK_DEPTH));
@@ -269,7 +247,7 @@ TEST_F(TransferTest, MakesA3DTextureWithItsContents) {
 
 // From a framebuffer with a known picture: the copied rectangle, and nothing beside it.
 TEST_F(TransferTest, CopiesFromTheFramebuffer) {
-    Image<unsigned char> picture({8, 6, 1}, 4);
+    Bytes picture({8, 6, 1}, 4);
     std::iota(picture.texels.begin(), picture.texels.end(), static_cast<unsigned char>(0));
     Texture2D source(Texture::INTERNALFORMAT_RGBA8, 8, 6, false);
     ORU_GL(BindTexture, GL_TEXTURE_2D, source.objectID());
@@ -280,15 +258,17 @@ TEST_F(TransferTest, CopiesFromTheFramebuffer) {
     framebuffer.attach(&source, 0, 0);
     for (TextureKind const &kind : kTextureKinds) {
         SCOPED_TRACE(kind.name);
-        Image<unsigned char> expected(kind.cut({8, 6, 3}), 4, 50);
-        BoundTexture const texture(kind.make(Texture::INTERNALFORMAT_RGBA8, expected.size, false));
-        expected.upload(*texture, kBytes);
-        Copy(*texture, 0, {2, 1, 2}, 4, 2);
-        Image<unsigned char>::ForEach({4, kind.sides > 1 ? 2 : 1, 1}, [&](int x, int y, int) {
+        int const level = kind.mipmaps() ? 1 : 0;
+        Sides const whole = kind.cut({16, 12, 6});
+        Bytes expected(level ? kind.halved(whole) : whole, 4, 50);
+        BoundTexture const texture(kind.make(Texture::INTERNALFORMAT_RGBA8, whole, true));
+        expected.upload(*texture, kBytes, level);
+        Copy(*texture, level, {2, 1, 2}, 4, 2);
+        Bytes::ForEach({4, kind.sides > 1 ? 2 : 1, 1}, [&](int x, int y, int) {
             std::copy_n(picture.at(x + 1, y + 3, 0), 4,
                         expected.at(x + 2, kind.sides > 1 ? y + 1 : 0, kind.sides > 2 ? 2 : 0));
         });
-        EXPECT_EQ(expected.texels, expected.read(*texture, kBytes));
+        EXPECT_EQ(expected.texels, expected.read(*texture, kBytes, level));
     }
     framebuffer.unbind();
 }

@@ -1,7 +1,7 @@
 // What the image transfers refuse, in which order and with which words.
 #include "tests/support/texturekinds.h"
 
-#include "oru/oru_ogl/extensionator/opengltokenname.h"
+#include <regex>
 
 using namespace oru_test;
 
@@ -13,10 +13,18 @@ void const *const kNothing = nullptr;
 
 char const kMapped[] = "Pixel Buffer Object cannot be memory mapped during data transfer";
 char const kAlignment[] = "Invalid row byte alignment (must be of 1, 2, 4, or 8).";
+char const kNoIndices[] = "COLOR_INDEX not allowed here!";
+char const kUnbound[] = "Texture must be bound";
 
 } // namespace
 
-class TransferChecksTest : public ObjectTest {};
+class TransferChecksTest : public ObjectTest {
+protected:
+    void TearDown() override {
+        EXPECT_EQ(0, Get(GL_CLIENT_ATTRIB_STACK_DEPTH));
+        ObjectTest::TearDown();
+    }
+};
 
 // Each row breaks one rule and those after it; the texts of 3-D textures pad the sides' names.
 TEST_F(TransferChecksTest, PartsAreCheckedInOrder) {
@@ -35,29 +43,26 @@ TEST_F(TransferChecksTest, PartsAreCheckedInOrder) {
         {2, {16, 9, 5}, 2, "height(9) is greater than height of image (8) "},
         {2, {16, 8, 5}, 3, "depth(5) is greater than depth_ of image (4) "},
     };
-    auto const with = [](std::string text, char const *operation, char const *padding) {
-        if (auto const at = text.find('%'); at != std::string::npos)
-            text.replace(at, 1, operation);
-        if (auto const at = text.find('_'); at != std::string::npos)
-            text.replace(at, 1, padding);
-        return text;
+    auto const with = [](std::string const &text, char const *operation, char const *padding) {
+        std::string const filled = std::regex_replace(text, std::regex("%"), operation);
+        return std::regex_replace(filled, std::regex("_"), padding);
     };
     Buffer buffer(16, Buffer::TYPE_PIXEL_UNPACK_BUFFER, Buffer::USAGE_STREAM_DRAW, nullptr);
     for (TextureKind const &kind : kTextureKinds) {
         BoundTexture const texture(kind.make(Texture::INTERNALFORMAT_RGBA8, {16, 8, 4}, false));
         Pushed<CountingForwarder> counter;
-        for (Row const &row : rows) {
-            if (row.sides > kind.sides)
+        for (auto const &[level, size, sides, text] : rows) {
+            if (sides > kind.sides)
                 continue;
-            SCOPED_TRACE(std::string(kind.name) + ": " + row.text);
-            std::string const upload = with(row.text, "subimage", kind.sides == 3 ? " " : "");
-            Box const box = {{}, row.size};
-            EXPECT_FAILURE(upload, Upload(*texture, row.level, box, kBytes, kTight, kNothing));
-            EXPECT_FAILURE(
-                upload, Upload(*texture, row.level, box, kBytes, kTight, &buffer, std::size_t(99)));
-            if (row.sides < 3) {
-                EXPECT_FAILURE(with(row.text, "copySubimage", ""),
-                               Copy(*texture, row.level, {}, Size(row.size[0]), Size(row.size[1])));
+            SCOPED_TRACE(kind.name);
+            std::string const upload = with(text, "subimage", kind.sides == 3 ? " " : "");
+            Box const box = {{}, size};
+            EXPECT_FAILURE(upload, Upload(*texture, level, box, kBytes, kTight, kNothing));
+            EXPECT_FAILURE(upload,
+                           Upload(*texture, level, box, kBytes, kTight, &buffer, std::size_t(99)));
+            if (sides < 3) {
+                EXPECT_FAILURE(with(text, "copySubimage", ""),
+                               Copy(*texture, level, {}, Size(size[0]), Size(size[1])));
             }
         }
         EXPECT_EQ(0, counter->total()) << "the checks come before any GL call";
@@ -72,24 +77,24 @@ TEST_F(TransferChecksTest, BuffersAreChecked) {
         auto const upload = [&](Buffer *source, std::size_t offset) {
             Upload(*texture, 0, {{}, {4, 4, 4}}, kBytes, kTight, source, offset);
         };
+        auto const download = [&] { Download(*texture, 0, kBytes, 1, &buffer, 0); };
         EXPECT_FAILURE("offset(1024) is greater than pixel buffer object size1024",
                        upload(&buffer, 1024));
         EXPECT_FAILURE("Enforce buffer != NULL", upload(nullptr, 0));
         buffer.bind();
         buffer.map(GL_WRITE_ONLY);
         EXPECT_FAILURE(kMapped, upload(&buffer, 0));
-        EXPECT_FAILURE(kMapped, Download(*texture, 0, kBytes, 1, &buffer, 0));
+        EXPECT_FAILURE(kMapped, download());
         EXPECT_TRUE(buffer.isArrayBuffer()) << "a refused transfer converts nothing";
         buffer.unmap();
-        EXPECT_FAILURE("Buffer::convertToUnpackBuffer cannot convert buffer target while bound",
-                       upload(&buffer, 0));
-        EXPECT_FAILURE("Buffer::convertToPackBuffer cannot convert buffer target while bound",
-                       Download(*texture, 0, kBytes, 1, &buffer, 0));
+        std::string const bound = " cannot convert buffer target while bound";
+        EXPECT_FAILURE("Buffer::convertToUnpackBuffer" + bound, upload(&buffer, 0));
+        EXPECT_FAILURE("Buffer::convertToPackBuffer" + bound, download());
         Buffer::BindDefaultArrayBuffer();
     }
-    EXPECT_EQ(0, Get(GL_CLIENT_ATTRIB_STACK_DEPTH));
 }
 
+// One side is read without checks.
 TEST_F(TransferChecksTest, ReadingIsChecked) {
     char data[256] = {};
     void *const memory = data;
@@ -98,50 +103,50 @@ TEST_F(TransferChecksTest, ReadingIsChecked) {
         SCOPED_TRACE(kind.name);
         if (kind.sides == 1)
             continue;
-        auto const texture = kind.make(Texture::INTERNALFORMAT_RGBA8, {4, 4, 4}, false);
+        BoundTexture const texture(kind.make(Texture::INTERNALFORMAT_RGBA8, {4, 4, 4}, false));
         if (kind.sides == 2) {
-            EXPECT_FAILURE("Texture must be bound", Download(*texture, 0, kIndices, 3, memory));
-            EXPECT_FAILURE("Texture must be bound", Download(*texture, 0, kIndices, 3, &buffer, 0));
-            ORU_GL(BindTexture, kind.target, texture->objectID());
-            EXPECT_FAILURE("COLOR_INDEX not allowed here!",
-                           Download(*texture, 0, kIndices, 3, &buffer, 0));
+            EXPECT_FAILURE(kNoIndices, Download(*texture, 0, kIndices, 3, &buffer, 0));
+            ORU_GL(BindTexture, kind.target, 0u);
+            EXPECT_FAILURE(kUnbound, Download(*texture, 0, kIndices, 3, memory));
+            EXPECT_FAILURE(kUnbound, Download(*texture, 0, kIndices, 3, &buffer, 0));
+            texture.bind();
         }
-        EXPECT_FAILURE("COLOR_INDEX not allowed here!", Download(*texture, 0, kIndices, 3, memory));
+        EXPECT_FAILURE(kNoIndices, Download(*texture, 0, kIndices, 3, memory));
         EXPECT_FAILURE(kAlignment, Download(*texture, 0, kBytes, 3, memory));
         EXPECT_FAILURE(kAlignment, Download(*texture, 0, kBytes, 16, &buffer, 0));
-        ORU_GL(BindTexture, kind.target, 0u);
     }
-    EXPECT_EQ(0, Get(GL_CLIENT_ATTRIB_STACK_DEPTH));
+    // The size of what is read does not depend on the level.
+    Pixel const floats{Texture::FORMAT_RGBA, Texture::TYPE_FLOAT};
+    auto const size = [&](auto const &texture) {
+        return texture.pixelDataSize(3, floats.format, floats.type);
+    };
+    EXPECT_EQ(256u, size(Texture1D(Texture::INTERNALFORMAT_RED, 16, false)));
+    EXPECT_EQ(2048u, size(Texture2D(Texture::INTERNALFORMAT_RED, 16, 8, false)));
+    EXPECT_EQ(8192u, size(Texture2DArray(Texture::INTERNALFORMAT_RED, 16, 8, 4, false)));
 }
 
-// Components of one, two and four bytes, whatever the level; other types have no size here.
-TEST_F(TransferChecksTest, PixelDataIsSizedByItsType) {
-    Texture1D const line(Texture::INTERNALFORMAT_RED, 16, false);
-    Texture2D const plane(Texture::INTERNALFORMAT_RED, 16, 8, false);
-    Texture2DArray const stack(Texture::INTERNALFORMAT_RED, 16, 8, 4, false);
-    char const bytes[] = "110220040000000000002";
-    for (unsigned int i = 0; i <= Texture::TYPE_HALF_FLOAT; ++i) {
-        auto const type = static_cast<Texture::Type>(i);
-        std::size_t const row = 64 * static_cast<std::size_t>(bytes[i] - '0');
-        if (row == 0) {
-            EXPECT_FAILURE("pixelDataSize: Unknown type " +
-                               std::string(ORUOGLTokenName(Texture::Type2GL(type))),
-                           plane.pixelDataSize(3, Texture::FORMAT_RGBA, type));
-            continue;
-        }
-        EXPECT_EQ(row, line.pixelDataSize(3, Texture::FORMAT_RGBA, type));
-        EXPECT_EQ(row * 8, plane.pixelDataSize(3, Texture::FORMAT_RGBA, type));
-        EXPECT_EQ(row * 8 * 4, stack.pixelDataSize(3, Texture::FORMAT_RGBA, type));
-    }
-}
-
-TEST_F(TransferChecksTest, AlignmentsAreChecked) {
+TEST_F(TransferChecksTest, UnpackStateIsCheckedAndSet) {
     PixelUnpackParameters params;
     EXPECT_FAILURE("!\"Unsupported aligment in PixelUnpackParameters::setAlignment!\"",
                    params.setAlignment(3u));
     params.setAlignment(static_cast<PixelUnpackParameters::Alignment>(4));
     EXPECT_FAILURE("Enum value not recognized", params.apply());
-    kTight.apply();
+    params.setAlignment(2u);
+    params.setRowLength(3);
+    params.setSkipRows(4);
+    params.setSkipPixels(5);
+    params.setImageHeight(6);
+    params.setSkipImages(7);
+    params.enableSwapBytes();
+    for (int const swap : {1, 0}) {
+        params.apply();
+        EXPECT_EQ((std::vector<GLint>{swap, 1 - swap, 3, 4, 5, 6, 7, 2}),
+                  Get({GL_UNPACK_SWAP_BYTES, GL_UNPACK_LSB_FIRST, GL_UNPACK_ROW_LENGTH,
+                       GL_UNPACK_SKIP_ROWS, GL_UNPACK_SKIP_PIXELS, GL_UNPACK_IMAGE_HEIGHT,
+                       GL_UNPACK_SKIP_IMAGES, GL_UNPACK_ALIGNMENT}));
+        params.disableSwapBytes();
+        params.makeFirstLSB();
+    }
 
     struct Helpers : Texture2D {
         using Texture::PopPixelTransferModes;
@@ -151,5 +156,5 @@ TEST_F(TransferChecksTest, AlignmentsAreChecked) {
     Helpers::PushAndSetTransferByteAlignment(8);
     EXPECT_EQ(8, Get(GL_UNPACK_ALIGNMENT));
     Helpers::PopPixelTransferModes();
-    EXPECT_EQ(1, Get(GL_UNPACK_ALIGNMENT));
+    EXPECT_EQ(2, Get(GL_UNPACK_ALIGNMENT));
 }

@@ -6,37 +6,45 @@
 
 #include <functional>
 #include <numeric>
+#include <type_traits>
 
 using namespace ORU::OGL;
 using namespace oru_test;
 
 namespace {
 
+using Floats = std::vector<float>;
+
 enum Form { LOCATION, NAME, LOCATION_UNSAFE, NAME_UNSAFE, FORMS };
 
 /// A setter with values, and what the program must hold then.
 template<class AnyProgram>
 struct Case {
-    char const *name;
-    char const *type;           ///< of the uniform, in GLSL
-    int elements;               ///< of an array, 0 for none
-    unsigned int asserted;      ///< the GL type that the guarded form asserts, 0 for none
-    std::vector<float> element; ///< the last element's components
+    char const *call;
+    std::string type;      ///< of the uniform, in GLSL
+    int elements;          ///< of an array, 0 for none
+    unsigned int asserted; ///< the GL type that the guarded form asserts, 0 for none
+    Floats element;        ///< the last element's components
     std::function<void(AnyProgram &, int, char const *)> set[FORMS];
 };
 
 // Values of no two alike, so that an exchanged pair shows.
 int const kInts[] = {2, 3, 5, 7, 11, 13, 17, 19, 23, 29, 31, 37};
 auto const kValues = [] {
-    std::vector<float> values(32);
+    Floats values(32);
     std::iota(values.begin(), values.end(), 1.5f);
     return values;
 }();
 float const *const kFloats = kValues.data();
 
+template<class... Values>
+Floats ToFloats(Values... values) {
+    return {static_cast<float>(values)...};
+}
+
 /// The n × n matrix at `data`, turned over.
-std::vector<float> Transposed(float const *data, int n) {
-    std::vector<float> result;
+Floats Transposed(float const *data, int n) {
+    Floats result;
     for (int i = 0; i < n * n; ++i)
         result.push_back(data[i % n * n + i / n]);
     return result;
@@ -44,7 +52,6 @@ std::vector<float> Transposed(float const *data, int n) {
 
 template<class AnyProgram>
 std::vector<Case<AnyProgram>> Cases() {
-    using Floats = std::vector<float>;
     unsigned char const two = 2, zero = 0, nine = 9, one = 1;
 #define ORU_CASE(type, elements, asserted, expected, setter, ...)                                  \
     {                                                                                              \
@@ -59,107 +66,141 @@ std::vector<Case<AnyProgram>> Cases() {
                 }                                                                                  \
         }                                                                                          \
     }
+// One to four of the values, in a uniform of as many components.
+#define ORU_VALUES(scalar, vector, asserted, a, b, c, d)                                           \
+    ORU_CASE(scalar, 0, asserted, ToFloats(a), setUniform, a),                                     \
+        ORU_CASE(vector "2", 0, asserted##_VEC2, ToFloats(a, b), setUniform, a, b),                \
+        ORU_CASE(vector "3", 0, asserted##_VEC3, ToFloats(a, b, c), setUniform, a, b, c),          \
+        ORU_CASE(vector "4", 0, asserted##_VEC4, ToFloats(a, b, c, d), setUniform, a, b, c, d)
+#define ORU_ARRAY(type, components, setter, data)                                                  \
+    ORU_CASE(type, 3, 0, Floats(data + 2 * components, data + 3 * components), setter, 3, data)
+// One matrix, and two that are turned over.
+#define ORU_MATRIX(type, n, asserted, single, several)                                             \
+    ORU_CASE(type, 0, asserted, Floats(kFloats, kFloats + n * n), single, kFloats, zero),          \
+        ORU_CASE(type, 2, asserted, Transposed(kFloats + n * n, n), several, 2, kFloats, one)
     return {
-        ORU_CASE("bool", 0, GL_BOOL, (Floats{1}), setUniform, true),
-        ORU_CASE("bvec2", 0, GL_BOOL_VEC2, (Floats{0, 1}), setUniform, false, true),
-        ORU_CASE("bvec3", 0, GL_BOOL_VEC3, (Floats{1, 0, 1}), setUniform, true, false, true),
-        ORU_CASE("bvec4", 0, GL_BOOL_VEC4, (Floats{0, 0, 1, 0}), setUniform, false, false, true,
-                 false),
-        ORU_CASE("bool", 0, GL_BOOL, (Floats{1}), setUniform, two),
-        ORU_CASE("bvec2", 0, GL_BOOL_VEC2, (Floats{0, 1}), setUniform, zero, nine),
-        ORU_CASE("bvec3", 0, GL_BOOL_VEC3, (Floats{1, 0, 1}), setUniform, two, zero, nine),
-        ORU_CASE("bvec4", 0, GL_BOOL_VEC4, (Floats{0, 1, 0, 1}), setUniform, zero, one, zero, nine),
+        ORU_VALUES("bool", "bvec", GL_BOOL, true, false, true, true),
         // The bytes themselves, in an integer.
-        ORU_CASE("int", 0, GL_BOOL, (Floats{9}), setUniform, nine),
-        ORU_CASE("ivec4", 0, GL_BOOL_VEC4, (Floats{2, 0, 9, 1}), setUniform, two, zero, nine, one),
-        ORU_CASE("int", 0, GL_INT, (Floats{-5}), setUniform, -5),
-        ORU_CASE("ivec2", 0, GL_INT_VEC2, (Floats{-5, 6}), setUniform, -5, 6),
-        ORU_CASE("ivec3", 0, GL_INT_VEC3, (Floats{-5, 6, 7}), setUniform, -5, 6, 7),
-        ORU_CASE("ivec4", 0, GL_INT_VEC4, (Floats{-5, 6, 7, 8}), setUniform, -5, 6, 7, 8),
-        ORU_CASE("float", 0, GL_FLOAT, (Floats{0.5f}), setUniform, 0.5f),
-        ORU_CASE("vec2", 0, GL_FLOAT_VEC2, (Floats{0.5f, -2}), setUniform, 0.5f, -2.f),
-        ORU_CASE("vec3", 0, GL_FLOAT_VEC3, (Floats{0.5f, -2, 3}), setUniform, 0.5f, -2.f, 3.f),
-        ORU_CASE("vec4", 0, GL_FLOAT_VEC4, (Floats{0.5f, -2, 3, 4}), setUniform, 0.5f, -2.f, 3.f,
-                 4.f),
+        ORU_VALUES("int", "ivec", GL_BOOL, two, zero, nine, one),
+        ORU_VALUES("int", "ivec", GL_INT, -5, 6, 7, 8),
+        ORU_VALUES("float", "vec", GL_FLOAT, 0.5f, -2.f, 3.f, 4.f),
         ORU_CASE("sampler1D", 0, GL_SAMPLER_1D, (Floats{3}), setUniformSampler1D, 3),
         ORU_CASE("sampler2D", 0, GL_SAMPLER_2D, (Floats{4}), setUniformSampler2D, 4),
         ORU_CASE("sampler2DRect", 0, GL_SAMPLER_2D_RECT, (Floats{5}), setUniformSampler2DRECT, 5),
         ORU_CASE("sampler3D", 0, GL_SAMPLER_3D, (Floats{6}), setUniformSampler3D, 6),
-        ORU_CASE("int", 3, 0, (Floats{5}), setUniform, 3, kInts),
-        ORU_CASE("float", 3, 0, (Floats{3.5f}), setUniform, 3, kFloats),
-        ORU_CASE("ivec2", 3, 0, (Floats{11, 13}), setUniform2, 3, kInts),
-        ORU_CASE("vec2", 3, 0, (Floats{5.5f, 6.5f}), setUniform2, 3, kFloats),
-        ORU_CASE("ivec3", 3, 0, (Floats{17, 19, 23}), setUniform3, 3, kInts),
-        ORU_CASE("vec3", 3, 0, (Floats{7.5f, 8.5f, 9.5f}), setUniform3, 3, kFloats),
-        ORU_CASE("ivec4", 3, 0, (Floats{23, 29, 31, 37}), setUniform4, 3, kInts),
-        ORU_CASE("vec4", 3, 0, (Floats{9.5f, 10.5f, 11.5f, 12.5f}), setUniform4, 3, kFloats),
-        ORU_CASE("mat2", 0, GL_FLOAT_MAT2, (Floats(kFloats, kFloats + 4)), setUniformMatrix2,
-                 kFloats, zero),
-        ORU_CASE("mat3", 0, GL_FLOAT_MAT3, (Floats(kFloats, kFloats + 9)), setUniformMatrix3,
-                 kFloats, zero),
-        ORU_CASE("mat4", 0, GL_FLOAT_MAT4, (Floats(kFloats, kFloats + 16)), setUniformMatrix4,
-                 kFloats, zero),
-        ORU_CASE("mat2", 2, GL_FLOAT_MAT2, Transposed(kFloats + 4, 2), setUniformMatrices2, 2,
-                 kFloats, one),
-        ORU_CASE("mat3", 2, GL_FLOAT_MAT3, Transposed(kFloats + 9, 3), setUniformMatrices3, 2,
-                 kFloats, one),
-        ORU_CASE("mat4", 2, GL_FLOAT_MAT4, Transposed(kFloats + 16, 4), setUniformMatrices4, 2,
-                 kFloats, one),
+        ORU_ARRAY("int", 1, setUniform, kInts),
+        ORU_ARRAY("float", 1, setUniform, kFloats),
+        ORU_ARRAY("ivec2", 2, setUniform2, kInts),
+        ORU_ARRAY("vec2", 2, setUniform2, kFloats),
+        ORU_ARRAY("ivec3", 3, setUniform3, kInts),
+        ORU_ARRAY("vec3", 3, setUniform3, kFloats),
+        ORU_ARRAY("ivec4", 4, setUniform4, kInts),
+        ORU_ARRAY("vec4", 4, setUniform4, kFloats),
+        ORU_MATRIX("mat2", 2, GL_FLOAT_MAT2, setUniformMatrix2, setUniformMatrices2),
+        ORU_MATRIX("mat3", 3, GL_FLOAT_MAT3, setUniformMatrix3, setUniformMatrices3),
+        ORU_MATRIX("mat4", 4, GL_FLOAT_MAT4, setUniformMatrix4, setUniformMatrices4),
     };
+#undef ORU_MATRIX
+#undef ORU_ARRAY
+#undef ORU_VALUES
 #undef ORU_CASE
 }
 
-std::string NameOf(std::size_t i) {
-    return "u" + std::to_string(i);
-}
-
-/// The element that a case looks at.
-template<class Case>
-std::string LastOf(Case const &c, std::string const &name) {
-    return c.elements ? name + "[" + std::to_string(c.elements - 1) + "]" : name;
+/// The number in brackets, for arrays.
+std::string Index(int elements, int number) {
+    return elements ? "[" + std::to_string(number) + "]" : "";
 }
 
 /// A fragment shader in which every case has a uniform of its own, and none is left out as unused.
 template<class Cases>
 std::string Source(Cases const &cases) {
-    std::string uniforms = "#version 120\n#extension GL_ARB_texture_rectangle : enable\n", use;
+    std::string uniforms = "#version 120\n#extension GL_ARB_texture_rectangle : enable\n", sum;
     for (std::size_t i = 0; i < cases.size(); ++i) {
-        std::string const type = cases[i].type, name = NameOf(i), value = LastOf(cases[i], name);
-        int const elements = cases[i].elements;
-        uniforms += "uniform " + type + " " + name +
-                    (elements ? "[" + std::to_string(elements) + "];\n" : ";\n");
-        if (type.find("sampler") == 0) {
-            std::string const kind = type.substr(7);
-            use += "sum += texture" + kind + "(" + value + ", " +
-                   (kind == "1D"   ? "0.0"
-                    : kind == "3D" ? "vec3(0)"
-                                   : "vec2(0)") +
-                   ").r;\n";
-        } else {
-            use += "sum += float(" + value +
-                   (type.find("mat") == 0 ? "[0][0]"
-                    : type.back() <= '9'  ? ".x"
-                                          : "") +
-                   ");\n";
-        }
+        auto const &c = cases[i];
+        std::string const name = "u" + std::to_string(i);
+        uniforms += "uniform " + c.type + " " + name + Index(c.elements, c.elements) + ";\n";
+        std::string use = name + Index(c.elements, c.elements - 1);
+        if (c.type.find("sampler") == 0)
+            use = "texture" + c.type.substr(7) + "(" + use +
+                  (c.type[7] == '1' ? ", 0.0)" : ", vec" + c.type.substr(7, 1) + "(0))");
+        sum += " + float(" + use + (c.type.find("mat") == 0 ? "[0][0])" : ")");
     }
-    return uniforms + "void main() { float sum = 0.0;\n" + use + "gl_FragColor = vec4(sum); }";
+    return uniforms + "void main() { gl_FragColor = vec4(0.0" + sum + "); }";
 }
 
-template<class AnyProgram, class Cases>
-void Build(AnyProgram &program, Cases const &cases) {
+/// Notes what it is asked to assert.
+class Body : public ProgramImplCore {
+public:
+    using ProgramImplCore::setUniform;
+    mutable std::vector<unsigned int> asserted;
+    void assertActiveUniformType(int location, unsigned int type,
+                                 unsigned int count) const override {
+        asserted = {static_cast<unsigned int>(location), type, count};
+    }
+};
+
+/// Every setter in one form: its calls, what it asserts and sets, and what it refuses.
+template<class AnyProgram>
+void ExpectSetters(Form form) {
+    auto const cases = Cases<AnyProgram>();
     std::string const source = Source(cases);
     char const *const text = source.c_str();
-    program.loadFragmentShader(1, &text, nullptr);
-    program.link(true);
-}
-
-std::vector<float> Read(Program const &program, std::string const &name, std::size_t size) {
-    std::vector<float> values(16);
-    ORU_GL(GetUniformfv, static_cast<GLuint>(Get(GL_CURRENT_PROGRAM)),
-           program.getUniformLocation(name.c_str()), values.data());
-    values.resize(size);
-    return values;
+    AnyProgram program, other;
+    for (AnyProgram *const each : {&program, &other}) {
+        each->loadFragmentShader(1, &text, nullptr);
+        each->link(true);
+    }
+    bool const isNamed = form == NAME || form == NAME_UNSAFE;
+    for (std::size_t i = 0; i < cases.size(); ++i) {
+        auto const &c = cases[i];
+        SCOPED_TRACE(testing::Message() << c.call << " form " << form);
+        std::string const name = "u" + std::to_string(i);
+        std::string const last = name + Index(c.elements, c.elements - 1);
+        int const location = program.getUniformLocation(name.c_str());
+        auto const set = [&](int at) { c.set[form](program, at, name.c_str()); };
+        auto const read = [&] {
+            Floats values(16);
+            ORU_GL(GetUniformfv, static_cast<GLuint>(Get(GL_CURRENT_PROGRAM)),
+                   program.getUniformLocation(last.c_str()), values.data());
+            values.resize(c.element.size());
+            return values;
+        };
+        program.enable();
+        EXPECT_EQ(Floats(c.element.size()), read());
+        bool const isArray = c.asserted == 0, isMatrix = c.type.find("mat") == 0;
+        {
+            Pushed<CountingForwarder> calls;
+            set(location);
+            // A setter by name asks twice whether the program is current, one of matrices once.
+            int const queries = form == LOCATION          ? 1
+                                : form != NAME || isArray ? 0
+                                : isMatrix                ? 1
+                                                          : 2;
+            EXPECT_EQ(isNamed ? 1 : 0, calls->count("GetUniformLocation"));
+            EXPECT_EQ(queries, calls->count("GetIntegerv"));
+            EXPECT_EQ(queries + (isNamed ? 2 : 1), calls->total());
+            calls->reset();
+            if (form == LOCATION_UNSAFE)
+                set(-1);
+            EXPECT_EQ(0, calls->total());
+        }
+        EXPECT_EQ(c.element, read());
+        if constexpr (std::is_same_v<AnyProgram, Body>) {
+            std::vector<unsigned int> asserted = {
+                static_cast<unsigned int>(location), c.asserted,
+                static_cast<unsigned int>(std::max(c.elements, 1))};
+            if (isArray || form >= LOCATION_UNSAFE)
+                asserted.clear();
+            EXPECT_EQ(asserted, program.asserted);
+            program.asserted.clear();
+        }
+        // An array set by name goes to the program that is current, as what is set unsafely.
+        other.enable();
+        bool const asks = form == LOCATION || (form == NAME && !isArray);
+        EXPECT_FAILURE(asks ? "Program must be enabled to set uniform parameter" : "",
+                       set(location));
+    }
+    other.disable();
 }
 
 } // namespace
@@ -167,72 +208,8 @@ std::vector<float> Read(Program const &program, std::string const &name, std::si
 class UniformsTest : public ObjectTest {};
 
 TEST_F(UniformsTest, EverySetterInEveryForm) {
-    auto const cases = Cases<Program>();
     for (int form = 0; form < FORMS; ++form) {
-        Program program, other;
-        Build(program, cases);
-        Build(other, cases);
-        for (std::size_t i = 0; i < cases.size(); ++i) {
-            auto const &c = cases[i];
-            SCOPED_TRACE(std::string(c.name) + " form " + std::to_string(form));
-            std::string const name = NameOf(i), last = LastOf(c, name);
-            int const location = program.getUniformLocation(name.c_str());
-            auto const set = [&] { c.set[form](program, location, name.c_str()); };
-            program.enable();
-            EXPECT_EQ(std::vector<float>(c.element.size()), Read(program, last, c.element.size()));
-            EXPECT_FAILURE("", set());
-            EXPECT_EQ(c.element, Read(program, last, c.element.size()));
-            // An array set by name goes to the program that is current, as what is set unsafely.
-            other.enable();
-            bool const asks = form == LOCATION || (form == NAME && c.asserted != 0);
-            EXPECT_FAILURE(asks ? "Program must be enabled to set uniform parameter" : "", set());
-        }
-        other.disable();
+        ExpectSetters<Program>(static_cast<Form>(form));
+        ExpectSetters<Body>(static_cast<Form>(form));
     }
-}
-
-TEST_F(UniformsTest, CallsAndAssertionsOfEachForm) {
-    /// Notes what it is asked to assert.
-    class Body : public ProgramImplCore {
-    public:
-        using ProgramImplCore::setUniform;
-        mutable std::vector<unsigned int> asserted;
-        void assertActiveUniformType(int location, unsigned int type,
-                                     unsigned int count) const override {
-            asserted = {static_cast<unsigned int>(location), type, count};
-        }
-    };
-    auto const cases = Cases<Body>();
-    Body body;
-    Build(body, cases);
-    body.enable();
-    for (std::size_t i = 0; i < cases.size(); ++i) {
-        auto const &c = cases[i];
-        SCOPED_TRACE(c.name);
-        std::string const name = NameOf(i);
-        int const location = body.getUniformLocation(name.c_str());
-        unsigned int const count = c.elements ? static_cast<unsigned int>(c.elements) : 1;
-        std::vector<unsigned int> asserted;
-        if (c.asserted)
-            asserted = {static_cast<unsigned int>(location), c.asserted, count};
-        Pushed<CountingForwarder> calls;
-        auto const expect = [&](Form form, int at, std::vector<unsigned int> const &assertion,
-                                int lookUps, int queries, int total) {
-            body.asserted.clear();
-            calls->reset();
-            c.set[form](body, at, name.c_str());
-            EXPECT_EQ(assertion, body.asserted) << form;
-            EXPECT_EQ(lookUps, calls->count("GetUniformLocation")) << form;
-            EXPECT_EQ(queries, calls->count("GetIntegerv")) << form;
-            EXPECT_EQ(total, calls->total()) << form;
-        };
-        expect(LOCATION, location, asserted, 0, 1, 2);
-        bool const matrix = std::string(c.type).find("mat") == 0; // asks by location only
-        int const queries = !c.asserted ? 0 : matrix ? 1 : 2;
-        expect(NAME, location, asserted, 1, queries, queries + 2);
-        expect(LOCATION_UNSAFE, location, {}, 0, 0, 1);
-        expect(LOCATION_UNSAFE, -1, {}, 0, 0, 0);
-        expect(NAME_UNSAFE, location, {}, 1, 0, 2);
-    }
-    body.disable();
 }

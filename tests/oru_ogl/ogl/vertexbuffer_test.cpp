@@ -15,29 +15,28 @@ using namespace oru_test;
 namespace {
 
 using Field = VertexBuffer::Field;
-using Pixels = std::vector<float>;
+using Floats = std::vector<float>;
 
 unsigned int const kCount = 5; ///< vertices, each a point on a pixel of its own
 
-unsigned char const *Bytes(std::vector<float> const &values) {
+unsigned char const *Bytes(Floats const &values) {
     return reinterpret_cast<unsigned char const *>(values.data());
-}
-
-/// The x coordinates of the centres of kCount pixels in a row.
-Pixels Places() {
-    Pixels places;
-    for (unsigned int i = 0; i < kCount; ++i)
-        places.push_back((static_cast<float>(i) + 0.5f) / kCount * 2 - 1);
-    return places;
 }
 
 VertexBuffer::AttributeType Type(unsigned int components) {
     return static_cast<VertexBuffer::AttributeType>(components);
 }
 
+/// Of so many vertices, all different.
+Floats Values(unsigned int components, float first) {
+    Floats values(std::size_t{kCount} * components);
+    std::iota(values.begin(), values.end(), first);
+    return values;
+}
+
 /// What OpenGL gives the shader for an attribute of fewer components, and the untouched rest.
-Pixels Expected(Pixels const &values, unsigned int components, unsigned int vertices = kCount) {
-    Pixels pixels(std::size_t{4} * kCount, -1.f);
+Floats Expected(Floats const &values, unsigned int components, unsigned int vertices = kCount) {
+    Floats pixels(std::size_t{4} * kCount, -1.f);
     for (unsigned int i = 0; i < 4 * vertices; ++i) {
         unsigned int const component = i % 4;
         pixels[i] = component < components ? values[i / 4 * components + component]
@@ -47,131 +46,110 @@ Pixels Expected(Pixels const &values, unsigned int components, unsigned int vert
     return pixels;
 }
 
-Pixels Values(unsigned int components, float first = 100.25f) {
-    Pixels values(std::size_t{kCount} * components);
-    std::iota(values.begin(), values.end(), first);
-    return values;
-}
-
+/// Points at the centres of kCount pixels in a row.
 VertexBuffer Points(unsigned int components) {
     VertexBuffer buffer({Field("value", Type(components), VertexBuffer::EXPECTEDUSAGE_DYNAMIC_DRAW),
                          Field("place", VertexBuffer::ATTRIBUTETYPE_FLOAT,
                                VertexBuffer::EXPECTEDUSAGE_STATIC_DRAW)},
                         kCount, VertexBuffer::PRIMITIVETYPE_POINTS);
-    buffer.setField("place", Bytes(Places()), false, 0, 0);
+    Floats const places = {-0.8f, -0.4f, 0.f, 0.4f, 0.8f};
+    buffer.setField("place", Bytes(places), false, 0, 0);
     return buffer;
+}
+
+void Build(Program &program, char const *vertex, char const *fragment) {
+    program.loadVertexShader(1, &vertex, nullptr);
+    program.loadFragmentShader(1, &fragment, nullptr);
+    program.link(true);
+}
+
+unsigned int NameOf(Program &program) {
+    program.enable();
+    auto const name = static_cast<unsigned int>(Get(GL_CURRENT_PROGRAM));
+    program.disable();
+    return name;
+}
+
+/// Draws with a program into a row of pixels and gives them, four floats each.
+Floats Drawn(VertexBuffer &buffer, Program &program, std::size_t count = kCount) {
+    auto const width = static_cast<GLsizei>(kCount);
+    Renderbuffer row(GL_RGBA32F, width, 1);
+    Framebuffer framebuffer;
+    framebuffer.bind();
+    framebuffer.attach(&row, 0);
+    ORU_GL(Viewport, 0, 0, width, 1);
+    ORU_GL(ClearColor, -1.f, -1.f, -1.f, -1.f);
+    ORU_GL(Clear, GL_COLOR_BUFFER_BIT);
+    program.enable();
+    buffer.drawPrimitives(count);
+    program.disable();
+    EXPECT_EQ(0, Get(GL_VERTEX_ARRAY_BINDING));
+    Floats pixels(std::size_t{4} * kCount);
+    ORU_GL(ReadPixels, 0, 0, width, 1, GL_RGBA, GL_FLOAT, pixels.data());
+    framebuffer.unbind();
+    return pixels;
 }
 
 } // namespace
 
-class VertexBufferTest : public ObjectTest {
-protected:
-    void TearDown() override {
-        program_.reset();
-        ObjectTest::TearDown();
-    }
+class VertexBufferTest : public ObjectTest {};
 
-    /// By default a program that writes an attribute into the pixels it is drawn at, exactly.
-    void build(char const *vertex = "attribute float place; attribute vec4 value;"
-                                    "varying vec4 colour; void main() { colour = value;"
-                                    " gl_Position = vec4(place, 0, 0, 1); }",
-               char const *fragment = "varying vec4 colour;"
-                                      "void main() { gl_FragColor = colour; }") {
-        program_.emplace();
-        program_->loadVertexShader(1, &vertex, nullptr);
-        program_->loadFragmentShader(1, &fragment, nullptr);
-        program_->link(true);
-    }
-
-    unsigned int programID() {
-        program_->enable();
-        auto const name = static_cast<unsigned int>(Get(GL_CURRENT_PROGRAM));
-        program_->disable();
-        return name;
-    }
-
-    /// Draws with the program into a row of pixels and gives them, four floats each.
-    Pixels drawn(VertexBuffer &buffer, std::size_t count = kCount) {
-        Renderbuffer row(GL_RGBA32F, kCount, 1);
-        Framebuffer framebuffer;
-        framebuffer.bind();
-        framebuffer.attach(&row, 0);
-        ORU_GL(Viewport, 0, 0, static_cast<GLsizei>(kCount), 1);
-        ORU_GL(ClearColor, -1.f, -1.f, -1.f, -1.f);
-        ORU_GL(Clear, GL_COLOR_BUFFER_BIT);
-        program_->enable();
-        buffer.drawPrimitives(count);
-        program_->disable();
-        EXPECT_EQ(0, Get(GL_VERTEX_ARRAY_BINDING));
-        Pixels pixels(std::size_t{4} * kCount);
-        ORU_GL(ReadPixels, 0, 0, static_cast<GLsizei>(kCount), 1, GL_RGBA, GL_FLOAT, pixels.data());
-        framebuffer.unbind();
-        return pixels;
-    }
-
-    std::optional<Program> program_;
-};
-
+// Every type, gathered from vertices that lie together or apart, with either way to set it up.
 TEST_F(VertexBufferTest, DrawsFieldsOfEveryType) {
-    build();
+    // Writes an attribute into the pixels it is drawn at, exactly.
+    Program program;
+    Build(program,
+          "attribute float place; attribute vec4 value; varying vec4 colour;"
+          "void main() { colour = value; gl_Position = vec4(place, 0, 0, 1); }",
+          "varying vec4 colour; void main() { gl_FragColor = colour; }");
     for (unsigned int components = 1; components <= 4; ++components) {
-        SCOPED_TRACE(components);
-        Pixels const values = Values(components);
-        VertexBuffer buffer = Points(components);
         EXPECT_EQ(4 * components, Field("", Type(components), {}).byteSize());
-        buffer.setupWithProgram(&*program_);
-        buffer.marshallData();
-        EXPECT_EQ(Expected(Pixels(values.size()), components), drawn(buffer)) << "zeros until set";
-        buffer.setField("value", Bytes(values), false, 0, 0);
-        buffer.marshallData();
-        EXPECT_EQ(Expected(values, components), drawn(buffer));
-        buffer.marshallData(3);
-        EXPECT_EQ(Expected(values, components, 2), drawn(buffer, 2));
-        EXPECT_EQ(Pixels(std::size_t{4} * kCount, -1.f), drawn(buffer, 0));
-    }
-}
+        for (unsigned int const step : {0u, components, 5u}) {
+            SCOPED_TRACE(testing::Message() << components << " in " << step);
+            Floats values = Values(components, 100.25f);
+            Floats source(values);
+            if (step == 5) {
+                source.assign(std::size_t{step} * kCount, 77.f);
+                for (std::size_t i = 0; i < values.size(); ++i)
+                    source[i / components * step + i % components] = values[i];
+            }
+            VertexBuffer buffer = Points(components);
+            if (step)
+                buffer.setupWithProgram(&program);
+            else
+                buffer.setupWithProgram(NameOf(program));
+            buffer.marshallData();
+            EXPECT_EQ(Expected(Floats(values.size()), components), Drawn(buffer, program))
+                << "zeros until set";
+            buffer.setField("value", Bytes(source), false, 4 * step, 0);
+            buffer.marshallData();
+            EXPECT_EQ(Expected(values, components), Drawn(buffer, program));
 
-TEST_F(VertexBufferTest, GathersFromPaddedVertices) {
-    build();
-    for (unsigned int components = 1; components <= 4; ++components) {
-        SCOPED_TRACE(components);
-        Pixels values = Values(components);
-        std::size_t const step = 5;
-        Pixels padded(step * kCount, 77.f);
-        for (std::size_t i = 0; i < values.size(); ++i)
-            padded[i / components * step + i % components] = values[i];
-        VertexBuffer buffer = Points(components);
-        buffer.setField(0, Bytes(padded), step * 4, 0);
-        buffer.setupWithProgram(programID());
-        buffer.marshallData();
-        EXPECT_EQ(Expected(values, components), drawn(buffer));
-        Pixels const others = Values(components, 7); // the first three lie together
-        buffer.setField(0, Bytes(others), 4 * components, 3);
-        buffer.marshallData();
-        std::copy_n(others.begin(), 3 * components, values.begin());
-        EXPECT_EQ(Expected(values, components), drawn(buffer));
+            std::iota(values.begin(), values.begin() + 2 * components, 7.f);
+            buffer.setField(0, Bytes(values), 0, 2);
+            buffer.marshallData(3);
+            EXPECT_EQ(Expected(values, components, 3), Drawn(buffer, program, 3));
+            EXPECT_EQ(Floats(std::size_t{4} * kCount, -1.f), Drawn(buffer, program, 0));
+        }
     }
 }
 
 TEST_F(VertexBufferTest, CopiesHaveNoOpenGLObjects) {
-    build();
-    VertexBuffer buffer = Points(1);
-    Pixels const values = Values(1);
-    buffer.setField("value", Bytes(values), false, 0, 0);
-    buffer.setupWithProgram(&*program_);
-    buffer.marshallData();
-    VertexBuffer copy(buffer), assigned;
+    Program program;
+    Build(program, "attribute float p; void main() { gl_Position = vec4(p); }", "void main() {}");
+    VertexBuffer buffer(
+        {Field("p", VertexBuffer::ATTRIBUTETYPE_FLOAT, VertexBuffer::EXPECTEDUSAGE_STATIC_DRAW)},
+        kCount, VertexBuffer::PRIMITIVETYPE_LINES);
+    buffer.setupWithProgram(&program);
+    VertexBuffer const copy(buffer);
+    VertexBuffer assigned;
     EXPECT_EQ(0u, assigned.vertexCount());
-    assigned = buffer;
-    EXPECT_FAILURE("vertexBuffer_ != 0", copy.marshallData());
-    EXPECT_FAILURE("vertexBuffer_ != 0", assigned.marshallData());
+    assigned = copy;
     EXPECT_EQ(kCount, assigned.vertexCount());
-    EXPECT_EQ(VertexBuffer::PRIMITIVETYPE_POINTS, assigned.primitiveType());
-    copy.setupWithProgram(&*program_);
-    copy.marshallData();
-    EXPECT_EQ(Expected(values, 1), drawn(copy));
+    EXPECT_EQ(VertexBuffer::PRIMITIVETYPE_LINES, assigned.primitiveType());
+    EXPECT_FAILURE("vertexBuffer_ != 0", assigned.marshallData());
     VertexBuffer taken(std::move(buffer)); // with its objects
-    EXPECT_EQ(Expected(values, 1), drawn(taken));
+    EXPECT_FAILURE("", taken.marshallData());
     taken = std::move(assigned);
     EXPECT_FAILURE("vertexBuffer_ != 0", taken.marshallData());
 }
@@ -186,7 +164,8 @@ TEST_F(VertexBufferTest, RefusesWhatItCannotDraw) {
     EXPECT_FAILURE("vertexBuffer_ != 0", buffer.marshallData());
     EXPECT_FAILURE("Enforce oglProgram != NULL",
                    buffer.setupWithProgram(static_cast<Program *>(nullptr)));
-    build("void main() { gl_Position = vec4(0); }", "void main() {}");
-    EXPECT_FAILURE("f.resolvedSlot_ >= 0", buffer.setupWithProgram(&*program_));
-    EXPECT_FAILURE("f.resolvedSlot_ >= 0", buffer.setupWithProgram(programID()));
+    Program other; // without the attributes
+    Build(other, "void main() { gl_Position = vec4(0); }", "void main() {}");
+    EXPECT_FAILURE("f.resolvedSlot_ >= 0", buffer.setupWithProgram(&other));
+    EXPECT_FAILURE("f.resolvedSlot_ >= 0", buffer.setupWithProgram(NameOf(other)));
 }

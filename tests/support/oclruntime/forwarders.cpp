@@ -5,11 +5,8 @@
 #define CL_USE_DEPRECATED_OPENCL_1_0_APIS
 #define CL_USE_DEPRECATED_OPENCL_1_1_APIS
 #define CL_USE_DEPRECATED_OPENCL_1_2_APIS
-#include "tests/support/oclruntime/callbook.h"
-#include "tests/support/oclruntime/control.h"
 #include "tests/support/oclruntime/runtime.h"
 
-#include <string_view>
 #include <type_traits>
 
 #include <windows.h>
@@ -31,8 +28,53 @@ FunctionTable LoadSystem() {
     return table;
 }
 
-constexpr bool StartsWith(std::string_view name, std::string_view prefix) {
-    return name.substr(0, prefix.size()) == prefix;
+/// What is called: the system's entry points, some of them replaced.
+FunctionTable const &Functions() {
+    static FunctionTable const table = [] {
+        FunctionTable functions = System();
+        ReplaceQueries(functions);
+        ReplaceSharing(functions);
+        return functions;
+    }();
+    return table;
+}
+
+template<class Argument>
+constexpr bool IsHandle =
+    std::is_pointer_v<Argument> &&std::is_class_v<std::remove_pointer_t<Argument>> &&
+    !std::is_const_v<std::remove_pointer_t<Argument>>;
+
+/// The text of an argument as the call book wants it. `previous` is the number before it, which is
+/// the length of a list.
+template<class Argument>
+std::string Recorded([[maybe_unused]] std::string const &name, [[maybe_unused]] Argument argument,
+                     [[maybe_unused]] std::size_t &previous) {
+    using Target = std::remove_pointer_t<Argument>;
+    if constexpr (std::is_integral_v<Argument>) {
+        previous = static_cast<std::size_t>(argument);
+        return TextOf(argument);
+    } else if constexpr (std::is_function_v<Target>) {
+        return TextOf(reinterpret_cast<void const *>(argument));
+    } else if constexpr (std::is_void_v<Target> || IsHandle<Argument>) {
+        return TextOf(argument);
+    } else if constexpr (std::is_same_v<Target, char const>) {
+        return TextOf(argument ? argument : "null");
+    } else if constexpr (std::is_same_v<Target, std::size_t const> ||
+                         (std::is_const_v<Target> && IsHandle<std::remove_const_t<Target>>)) {
+        bool const isPlace = std::is_same_v<Target, std::size_t const> &&
+                             name.rfind("clEnqueue", 0) == 0 && name != "clEnqueueNDRangeKernel";
+        std::string text = argument ? "" : TextOf("null");
+        for (std::size_t i = 0; argument && i < (isPlace ? 3 : previous); ++i)
+            text += TextOf(argument[i]);
+        return text;
+    } else if constexpr (std::is_same_v<Target, cl_context_properties const>) {
+        std::string text;
+        for (std::size_t i = 0; argument && argument[i] != 0; ++i)
+            text += TextOf(argument[i]);
+        return text;
+    } else {
+        return "";
+    }
 }
 
 /// The result of a call that did nothing.
@@ -50,121 +92,72 @@ Result Failed([[maybe_unused]] cl_int code, [[maybe_unused]] Arguments... argume
     }
 }
 
-/// Whether an enqueued command may use an argument.
-template<class Argument>
-bool Usable([[maybe_unused]] Argument argument) {
-    if constexpr (std::is_same_v<Argument, cl_mem> || std::is_same_v<Argument, cl_kernel>)
-        return MayUse(argument);
-    else
-        return true;
-}
-
 template<class Handle, class... Kinds>
 constexpr bool IsOneOf = (std::is_same_v<Handle, Kinds> || ...);
 template<class Handle>
 constexpr bool IsCounted = IsOneOf<Handle, cl_context, cl_command_queue, cl_mem, cl_sampler,
                                    cl_program, cl_kernel, cl_event>;
 
-bool Count(void const *handle, int change) {
-    return handle && CallBook::Instance().count(handle, change);
-}
-
-[[maybe_unused]] void NoteKernels(cl_program, cl_uint count, cl_kernel *kernels, cl_uint *) {
-    for (cl_uint i = 0; kernels && i < count; ++i)
-        Count(kernels[i], 1);
-}
-
-/// Notes the reference that goes with an argument: the handle's own one, or a received event's.
-template<int Change, class Argument>
-void NoteArgument([[maybe_unused]] Argument argument) {
-    if constexpr (std::is_same_v<Argument, cl_event *>)
-        Count(argument ? *argument : nullptr, 1);
-    else if constexpr (Change != 0 && IsCounted<Argument>)
-        if (Count(argument, Change))
-            Forget(argument);
-}
-
-/// What became of the caller's references by a call that succeeded.
-template<class Name, class Result, class... Arguments>
-void Note([[maybe_unused]] Result result, [[maybe_unused]] Arguments... arguments) {
-    constexpr std::string_view name = Name::text();
-    constexpr int change = StartsWith(name, "clRetain") - StartsWith(name, "clRelease");
-    if constexpr (IsCounted<Result>)
-        Count(result, 1);
-    else if constexpr (name == "clCreateKernelsInProgram")
-        NoteKernels(arguments...);
-    else
-        (NoteArgument<change>(arguments), ...);
+/// Notes the references that an argument of a successful call brought: `change` to a handle, one to
+/// a received event, one to each received kernel.
+template<class Argument>
+void NoteReferences([[maybe_unused]] Argument argument, int change, std::size_t &previous) {
+    if constexpr (std::is_integral_v<Argument>) {
+        previous = static_cast<std::size_t>(argument);
+    } else if constexpr (IsCounted<Argument>) {
+        if (change != 0)
+            TheCallBook().count(argument, change);
+    } else if constexpr (IsCounted<std::remove_pointer_t<Argument>>) {
+        std::size_t const received = std::is_same_v<Argument, cl_event *> ? 1 : previous;
+        for (std::size_t i = 0; argument && i < received; ++i)
+            TheCallBook().count(argument[i], 1);
+    }
 }
 
 /// What an export does.
-template<class Name, class Result, class... Parameters>
-auto Call(Result (CL_API_CALL *FunctionTable::*slot)(Parameters...)) {
-    return [slot](Parameters... arguments) -> Result {
-        constexpr std::string_view name = Name::text();
-        if (cl_int const code = CallBook::Instance().enter(Name::text()))
+template<class Result, class... Parameters>
+auto Call(std::string const &name, Result (CL_API_CALL *FunctionTable::*slot)(Parameters...)) {
+    return [=](Parameters... arguments) -> Result {
+        std::size_t previous = 0;
+        std::string recorded;
+        ((recorded += Recorded(name, arguments, previous)), ...);
+        if (cl_int const code = TheCallBook().enter(name, recorded))
             return Failed<Result>(code, arguments...);
-        auto const function = Replacements().*slot ? Replacements().*slot : System().*slot;
-        bool allowed = function && (faces.hasImages || !StartsWith(name, "clCreateImage"));
-        if constexpr (StartsWith(name, "clEnqueue"))
-            allowed = allowed && (Usable(arguments) && ...);
-        if (!allowed)
+        auto const function = Functions().*slot;
+        if (!function)
             return Failed<Result>(CL_INVALID_OPERATION, arguments...);
         Result const result = function(arguments...);
-        bool succeeded = true;
-        if constexpr (std::is_same_v<Result, cl_int>)
-            succeeded = result == CL_SUCCESS;
-        if (succeeded)
-            Note<Name>(result, arguments...);
+        if constexpr (IsCounted<Result>)
+            TheCallBook().count(result, 1);
+        if constexpr (std::is_same_v<Result, cl_int>) {
+            int const change = (name.rfind("clRetain", 0) == 0) - (name.rfind("clRelease", 0) == 0);
+            if (result == CL_SUCCESS)
+                (NoteReferences(arguments, change, previous), ...);
+        }
         return result;
     };
 }
 
 } // namespace
 
+CallBook &TheCallBook() {
+    static CallBook book;
+    return book;
+}
+
 FunctionTable const &System() {
     static FunctionTable const table = LoadSystem();
     return table;
 }
 
-FunctionTable const &Replacements() {
-    static FunctionTable const table = [] {
-        FunctionTable replacements;
-        ReplaceQueries(replacements);
-        ReplaceSharing(replacements);
-        return replacements;
-    }();
-    return table;
-}
-
 #define ORU_CL_ENTRY(Result, Name, Parameters, Arguments)                                          \
-    namespace {                                                                                    \
-    struct NameOf_##Name {                                                                         \
-        static constexpr char const *text() { return #Name; }                                      \
-    };                                                                                             \
-    }                                                                                              \
     extern "C" CL_API_ENTRY Result CL_API_CALL Name Parameters {                                   \
-        return Call<NameOf_##Name>(&FunctionTable::Name) Arguments;                                \
+        return Call(#Name, &FunctionTable::Name) Arguments;                                        \
     }
 #include "tests/support/oclruntime/entrypoints.inc"
 
 } // namespace oru_test::runtime
 
-extern "C" __declspec(dllexport) oru_test::RuntimeControl const *OruTestRuntimeControl() {
-    using namespace oru_test::runtime;
-    static oru_test::RuntimeControl const control = {
-        [](char const *entryPoint, unsigned int call, cl_int code) {
-            CallBook::Instance().fail(entryPoint, call, code);
-        },
-        [] { CallBook::Instance().reset(); },
-        [](char const *entryPoint) { return CallBook::Instance().calls(entryPoint); },
-        [] { return CallBook::Instance().liveHandles(); },
-        [](void const *handle) { return CallBook::Instance().references(handle); },
-        [](char const *version) {
-            faces.version = version ? std::optional<std::string>(version) : std::nullopt;
-        },
-        [](bool some) { faces.hasPlatforms = some; },
-        [](bool supported) { faces.hasImages = supported; },
-    };
-    return &control;
+extern "C" __declspec(dllexport) oru_test::CallBook *OruTestCallBook() {
+    return &oru_test::runtime::TheCallBook();
 }

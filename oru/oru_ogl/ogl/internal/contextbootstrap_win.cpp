@@ -4,12 +4,13 @@
 #include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/ogl/internal/contexts/adapterorigins_win.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL::internal {
 
 ContextBootstrap::ContextBootstrap(DisplayDeviceKey const &key) : Context(key) {
-    window_ = MakeScoped(ORU_NEW InternalWindow(DisplayOrigin(key.adapterName, true)));
+    window_ = MakeScoped(ORU_NEW InternalWindow(AdapterOrigin(key.adapterName)));
     deviceContext_ = ::GetDC(window_->hWnd());
 
     // Only a context that is current when this one is made can offer the function.

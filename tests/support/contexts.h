@@ -1,0 +1,134 @@
+// What the context tests share: contexts of the host, windowed and opened ones, and their count.
+#pragma once
+
+#include "tests/support/pushed.h"
+#include "tests/support/testwindow.h"
+
+#include "oru/oru_ogl/extensionator/wgl/wglforwarder.h"
+#include "oru/oru_ogl/libraryogl.h"
+#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+#include "oru/oru_ogl/ogl/contextwindowed_win.h"
+#include "oru/oru_ogl/ogl/contextwrapped_win.h"
+#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <set>
+
+namespace oru_test {
+
+/// A context whose protected members a test may call.
+template<class Kind>
+class Exposed : public Kind {
+public:
+    template<class... Arguments>
+    explicit Exposed(Arguments const &...arguments) : Kind(arguments...) {}
+
+    using Kind::addShareContext;
+    using Kind::ChoosePixelFormat;
+    using Kind::createRenderingContext;
+    using Kind::DisplayDeviceFromWindow;
+    using Kind::DisplayOrigin;
+    using Kind::initialize;
+    using Kind::PrimaryDisplayDevice;
+    using Kind::setDisplayDeviceKey;
+    using Kind::setPixelFormat;
+    using Kind::shareLists;
+    using Kind::UnregisterShareContext;
+};
+
+/// A context of the library in a window of the host.
+inline ORU::OGL::ContextWindowed
+Windowed(TestWindow const &window, ORU::OGL::Context const *share = nullptr,
+         ORU::OGL::BufferFormat const &format = ORU::OGL::BufferFormat::FORMAT_RGBA8_D24,
+         int samples = 1,
+         ORU::OGL::Context::Buffering buffering = ORU::OGL::Context::BUFFERING_DOUBLE) {
+    return ORU::OGL::ContextWindowed(window.hwnd(), format, buffering,
+                                     static_cast<ORU::OGL::Context::Multisampling>(samples), share);
+}
+
+/// A rendering context that the host makes with plain calls, current for its lifetime.
+class HostContext {
+public:
+    explicit HostContext(HGLRC share = nullptr) {
+        PIXELFORMATDESCRIPTOR descriptor = {};
+        descriptor.nSize = sizeof descriptor;
+        descriptor.nVersion = 1;
+        descriptor.dwFlags = PFD_DRAW_TO_WINDOW | PFD_SUPPORT_OPENGL;
+        descriptor.iPixelType = PFD_TYPE_RGBA;
+        ::SetPixelFormat(dc_, ::ChoosePixelFormat(dc_, &descriptor), &descriptor);
+        rc_ = ::wglCreateContext(dc_);
+        EXPECT_TRUE(!share || ::wglShareLists(share, rc_));
+        EXPECT_TRUE(::wglMakeCurrent(dc_, rc_));
+    }
+    ~HostContext() {
+        ::wglMakeCurrent(nullptr, nullptr);
+        ::wglDeleteContext(rc_);
+        ::ReleaseDC(window_.hwnd(), dc_);
+    }
+    HostContext(HostContext const &) = delete;
+    HostContext &operator=(HostContext const &) = delete;
+
+    HDC dc() const { return dc_; }
+    HGLRC rc() const { return rc_; }
+
+private:
+    TestWindow window_;
+    HDC dc_ = ::GetDC(window_.hwnd());
+    HGLRC rc_ = nullptr;
+};
+
+/// Follows the rendering contexts that the library makes, by either function, and deletes. Only one
+/// is pushed at a time, on one thread and before the library first makes a context.
+class ContextCounter : public ORU::OGL::WGLForwarder {
+public:
+    ContextCounter() {
+        sMade = 0;
+        sAlive.clear();
+        sGone.clear();
+    }
+
+    HGLRC wcgmCreateContext(char const *file, unsigned int line, HDC dc) override {
+        return Counted(WGLForwarder::wcgmCreateContext(file, line, dc));
+    }
+    BOOL wcgmDeleteContext(char const *file, unsigned int line, HGLRC rc) override {
+        sGone.insert(sAlive.extract(rc));
+        return WGLForwarder::wcgmDeleteContext(file, line, rc);
+    }
+    PROC wcgmGetProcAddress(char const *file, unsigned int line, char const *name) override {
+        PROC const real = WGLForwarder::wcgmGetProcAddress(file, line, name);
+        if (!real || std::string(name) != "wglCreateContextAttribsARB")
+            return real;
+        sCreate =
+            reinterpret_cast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(reinterpret_cast<void *>(real));
+        return reinterpret_cast<PROC>(reinterpret_cast<void *>(&CreateContextAttribs));
+    }
+
+    static int Made() { return sMade; }
+    static std::size_t Alive() { return sAlive.size(); }
+    /// Contexts that are gone and have a record all the same.
+    static auto Remembered() {
+        return std::count_if(sGone.begin(), sGone.end(), [](HGLRC rc) {
+            return ORU::OGL::ExtensionManager::Instance(rc) != nullptr;
+        });
+    }
+
+private:
+    static HGLRC Counted(HGLRC made) {
+        sMade += made ? 1 : 0;
+        if (made)
+            sAlive.insert(made);
+        sGone.erase(made); // a handle may be used again
+        return made;
+    }
+    static HGLRC WINAPI CreateContextAttribs(HDC dc, HGLRC share, int const *attributes) {
+        return Counted(sCreate(dc, share, attributes));
+    }
+
+    static inline int sMade = 0;
+    static inline std::set<HGLRC> sAlive, sGone;
+    static inline PFNWGLCREATECONTEXTATTRIBSARBPROC sCreate = nullptr;
+};
+
+} // namespace oru_test
