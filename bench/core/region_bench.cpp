@@ -95,7 +95,7 @@ void Register(std::string const &kinds) {
                                      });
 }
 
-[[maybe_unused]] bool const gRegistered = [] {
+[[maybe_unused]] bool const kRegistered = [] {
     Register<BoundingRect, BoundingRect>("RectRect");
     Register<BoundingRect, BoundingRegion>("RectHandle");
     Register<BoundingRegion, BoundingRegion>("HandleHandle");

@@ -12,22 +12,27 @@ import re
 import sys
 
 CHECKS = {"ORU_ASSERT": "", "ORU_ENFORCE": "Enforce ", "ORU_ASSERT_SUCCEEDED": "", "ORU_ASSERT_TEXT": "",
-          "ORU_ENFORCE_TEXT": "Enforce ", "ORU_THROW_INTERNAL": "", "ORU_TRANSLATION_FAILURE": ""}
+          "ORU_ENFORCE_TEXT": "Enforce ", "ORU_THROW_INTERNAL": "", "ORU_TRANSLATION_FAILURE": "",
+          "ORU_ENUM_FAILURE": "", "ThrowInternal": ""}
+TEXT_AT = {"ORU_ASSERT_TEXT": 0, "ORU_ENFORCE_TEXT": 0, "ThrowInternal": 2}  # the argument that is the text
 CALL = re.compile(r"(?<!define )\b(" + "|".join(CHECKS) + r")\(")
 LITERAL = re.compile(r'"((?:[^"\\]|\\.)*)"')
 
 
-def argument(text, begin):
-    """The text from `begin` to the parenthesis that closes the call."""
-    depth, at = 1, begin
+def arguments_of(text, begin):
+    """The arguments of the call whose parenthesis opens before `begin`."""
+    depth, at, found = 1, begin, []
     while depth:
         literal = LITERAL.match(text, at)
         if literal:
             at = literal.end()
             continue
         depth += {"(": 1, ")": -1}.get(text[at], 0)
+        if depth == 0 or (depth == 1 and text[at] == ","):
+            found.append(text[begin:at])
+            begin = at + 1
         at += 1
-    return text[begin:at - 1]
+    return found
 
 
 def composed(code):
@@ -46,14 +51,14 @@ def texts(folder):
     for path in sorted([*folder.rglob("*.cpp"), *folder.rglob("*.h")]):
         if path.name == "checks.h":
             continue  # where the checks themselves are defined
-        source = re.sub(r"//.*", "", path.read_text(encoding="utf-8"))
+        source = re.sub(r"//.*", "", path.read_text(encoding="utf-8")).replace("\\\n", " \n")
         for call in CALL.finditer(source):
-            code = argument(source, call.end())
-            name, place = call[1], f"{path.as_posix()}:{source.count(chr(10), 0, call.start()) + 1}"
+            name, arguments = call[1], arguments_of(source, call.end())
+            place = f"{path.as_posix()}:{source.count(chr(10), 0, call.start()) + 1}"
             if name in ("ORU_ASSERT", "ORU_ENFORCE", "ORU_ASSERT_SUCCEEDED"):
-                text = " ".join(code.split())
+                text = " ".join(",".join(arguments).split())
             else:
-                text = composed(code)
+                text = composed(arguments[TEXT_AT[name]] if name in TEXT_AT else ",".join(arguments))
                 if text is None:
                     continue
                 if name == "ORU_TRANSLATION_FAILURE":

@@ -7,8 +7,7 @@
 namespace ORU::OCL {
 
 Buffer::Buffer(Context const &context, MemoryAccessFlags access, std::size_t size, void *host) {
-    if (!host)
-        ORU_THROW_INTERNAL("NULL host memory pointer passed to Buffer constructor.");
+    ORU_ASSERT_TEXT("NULL host memory pointer passed to Buffer constructor.", host);
     cl_mem_flags const flags = AccessFlags(access) | CL_MEM_USE_HOST_PTR;
     adopt(ORU_CL(CreateBuffer, context.id(), flags, size, host));
 }
@@ -19,8 +18,7 @@ Buffer::Buffer(Context const &context, MemoryAccessFlags access, bool allocHost,
 
 Buffer::Buffer(Context const &context, MemoryAccessFlags access, bool allocHost, std::size_t size,
                void *host) {
-    if (!host)
-        ORU_THROW_INTERNAL("Must allocate host memory passed to Buffer constructor.");
+    ORU_ASSERT_TEXT("Must allocate host memory passed to Buffer constructor.", host);
     cl_mem_flags const flags = AllocationFlags(access, allocHost) | CL_MEM_COPY_HOST_PTR;
     adopt(ORU_CL(CreateBuffer, context.id(), flags, size, host));
 }

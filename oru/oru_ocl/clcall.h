@@ -23,7 +23,7 @@ inline FunctionTable const &Table() {
 
 /// Whether an entry point reports its error through a last argument instead of its result.
 template<class Result, class... Parameters>
-constexpr bool ReportsByArgument =
+constexpr bool kReportsByArgument =
     !std::is_same_v<Result, cl_int> &&
     std::is_same_v<std::tuple_element_t<sizeof...(Parameters), std::tuple<int, Parameters...>>,
                    cl_int *>;
@@ -64,7 +64,7 @@ template<class Result, class... Parameters>
 auto MakeCheckedCall(Result(CL_API_CALL *function)(Parameters...), char const *file,
                      unsigned int line) {
     constexpr std::size_t kCount =
-        sizeof...(Parameters) - (ReportsByArgument<Result, Parameters...> ? 1 : 0);
+        sizeof...(Parameters) - (kReportsByArgument<Result, Parameters...> ? 1 : 0);
     return CheckedCall<decltype(function), std::make_index_sequence<kCount>>{function, file, line};
 }
 

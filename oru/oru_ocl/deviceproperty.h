@@ -13,14 +13,14 @@ namespace ORU::OCL::Enum {
 /// A text that stands for the type `T`; equal texts mean equal types.
 template<class T>
 std::string const &GetTypeName() {
-    static std::string const name = typeid(T).name();
-    return name;
+    static std::string const kName = typeid(T).name();
+    return kName;
 }
 
 template<>
 inline std::string const &GetTypeName<cl_platform_id>() {
-    static std::string const name = "cl_platform_id";
-    return name;
+    static std::string const kName = "cl_platform_id";
+    return kName;
 }
 
 /// The type name of what `Device::getInfo` reads for `property`; empty for a property that it does

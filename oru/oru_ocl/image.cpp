@@ -21,19 +21,11 @@ constexpr EnumTable<Image::ImageInfo, cl_image_info, 7> kImageInfos = {
      {Image::IMAGEINFO_DEPTH, CL_IMAGE_DEPTH}}};
 static_assert(kImageInfos.isInOrder());
 
-void CheckHost(void const *host, char const *message) {
-    if (!host)
-        ORU_THROW_INTERNAL(message);
-}
-
 cl_mem FromTexture2D(Context const &context, cl_mem_flags flags, OGL::Object const &texture,
                      unsigned int mipLevel) {
     return ORU_CL(CreateFromGLTexture2D, context.id(), flags, texture.target(),
                   static_cast<cl_GLint>(mipLevel), texture.objectID());
 }
-
-constexpr char const *kNoHost2D = "NULL host memory pointer passed to Image2D constructor.";
-constexpr char const *kNoHost3D = "NULL host memory pointer passed to Image3D constructor.";
 
 } // namespace
 
@@ -48,7 +40,7 @@ unsigned int Image::ConvertImageInfo(ImageInfo info) {
 
 Image2D::Image2D(Context const &context, MemoryAccessFlags access, cl_image_format format,
                  std::size_t width, std::size_t height, std::size_t rowPitch, void *host) {
-    CheckHost(host, kNoHost2D);
+    ORU_ASSERT_TEXT("NULL host memory pointer passed to Image2D constructor.", host);
     cl_mem_flags const flags = AccessFlags(access) | CL_MEM_USE_HOST_PTR;
     adopt(ORU_CL(CreateImage2D, context.id(), flags, &format, width, height, rowPitch, host));
 }
@@ -56,7 +48,7 @@ Image2D::Image2D(Context const &context, MemoryAccessFlags access, cl_image_form
 Image2D::Image2D(Context const &context, MemoryAccessFlags access, bool allocHost,
                  cl_image_format format, std::size_t width, std::size_t height,
                  std::size_t rowPitch, void *host) {
-    CheckHost(host, kNoHost2D);
+    ORU_ASSERT_TEXT("NULL host memory pointer passed to Image2D constructor.", host);
     cl_mem_flags const flags = AllocationFlags(access, allocHost) | CL_MEM_COPY_HOST_PTR;
     adopt(ORU_CL(CreateImage2D, context.id(), flags, &format, width, height, rowPitch, host));
 }
@@ -82,7 +74,7 @@ Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::Renderbu
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, cl_image_format format,
                  std::size_t width, std::size_t height, std::size_t depth, std::size_t rowPitch,
                  std::size_t slicePitch, void *host) {
-    CheckHost(host, kNoHost3D);
+    ORU_ASSERT_TEXT("NULL host memory pointer passed to Image3D constructor.", host);
     cl_mem_flags const flags = AccessFlags(access) | CL_MEM_USE_HOST_PTR;
     adopt(ORU_CL(CreateImage3D, context.id(), flags, &format, width, height, depth, rowPitch,
                  slicePitch, host));
@@ -91,7 +83,7 @@ Image3D::Image3D(Context const &context, MemoryAccessFlags access, cl_image_form
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, bool allocHost,
                  cl_image_format format, std::size_t width, std::size_t height, std::size_t depth,
                  std::size_t rowPitch, std::size_t slicePitch, void *host) {
-    CheckHost(host, kNoHost3D);
+    ORU_ASSERT_TEXT("NULL host memory pointer passed to Image3D constructor.", host);
     cl_mem_flags const flags = AllocationFlags(access, allocHost) | CL_MEM_COPY_HOST_PTR;
     adopt(ORU_CL(CreateImage3D, context.id(), flags, &format, width, height, depth, rowPitch,
                  slicePitch, host));

@@ -115,7 +115,7 @@ void Library::Terminate() {
 bool Library::IsOpenCLAvailable(std::string const &path) {
     try {
         // A static whose initialiser throws is initialised again by the next call.
-        static bool const available = [&] {
+        static bool const kAvailable = [&] {
             std::string copy = path;
             HMODULE const module = LoadRuntime(path);
             {
@@ -128,7 +128,7 @@ bool Library::IsOpenCLAvailable(std::string const &path) {
             FreeLibrary(module);
             return hasPlatform;
         }();
-        return available;
+        return kAvailable;
     } catch (...) {
         return false;
     }

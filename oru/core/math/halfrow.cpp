@@ -125,18 +125,18 @@ private:
 using ToFloat = void (*)(half const *, float *, std::size_t);
 using ToHalf = void (*)(float const *, half *, std::size_t);
 
-Processor const gProcessor;
-ToFloat const gToFloat = gProcessor.hasF16C ? VectorToFloat : ScalarToFloat;
-ToHalf const gToHalf = gProcessor.hasAVX2 ? VectorToHalf : ScalarToHalf;
+Processor const kProcessor;
+ToFloat const kToFloat = kProcessor.hasF16C ? VectorToFloat : ScalarToFloat;
+ToHalf const kToHalf = kProcessor.hasAVX2 ? VectorToHalf : ScalarToHalf;
 
 } // namespace
 
 void HalfToFloat(half const *source, float *target, std::size_t count) {
-    gToFloat(source, target, count);
+    kToFloat(source, target, count);
 }
 
 void FloatToHalf(float const *source, half *target, std::size_t count) {
-    gToHalf(source, target, count);
+    kToHalf(source, target, count);
 }
 
 } // namespace ORU

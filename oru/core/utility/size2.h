@@ -10,6 +10,7 @@ namespace ORU {
 
 /// Two unsigned 64-bit sizes, (width, height) throughout the library.
 struct size2 {
+    // NOLINTNEXTLINE(readability-identifier-naming): hosts see it
     static constexpr std::size_t dimension = 2;
 
     constexpr size2(std::size_t v = 0) : values_{v, v} {}
