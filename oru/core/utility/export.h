@@ -4,8 +4,9 @@
 /// `ORU_API` stands before every exported class, function and variable. The library's own sources
 /// are compiled with `ORU_BUILDING`; a static build defines `ORU_STATIC` for itself and its users.
 #if defined(_MSC_VER)
-// Exported classes have members and bases of the standard library's, which are not exported. That is safe
-// because library and host use one standard library, as they must: its classes cross the boundary.
+// Exported classes have members and bases of the standard library's, which are not exported. That
+// is safe because library and host use one standard library, as they must: its classes cross the
+// boundary.
 #pragma warning(disable : 4251 4275)
 #endif
 

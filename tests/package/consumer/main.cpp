@@ -1,5 +1,5 @@
-// Uses the installed library as a host does: a start-up and a failure caught by its type, after which the
-// host's own exceptions and streams work as before.
+// Uses the installed library as a host does: a start-up and a failure caught by its type, after
+// which the host's own exceptions and streams work as before.
 #include <oru/core/exceptions/internalexception.h>
 #include <oru/oru_ogl/extensionator/glcall.h>
 #include <oru/oru_ogl/libraryogl.h>

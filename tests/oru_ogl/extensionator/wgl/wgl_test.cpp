@@ -1,9 +1,11 @@
 // The WGL chain and the WGL extension pointers.
+#include "tests/support/failure.h"
 #include "tests/support/glfixture.h"
 #include "tests/support/testwindow.h"
 
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/extensionator/wgl/wglforwarder.h"
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"
 
 #include <set>
