@@ -156,8 +156,9 @@ TEST_F(Spots, Texts) {
                                                         {"1 2 -3 4", "the radius is negative"},
                                                         {"nan 2 3 4", "'nan' is not a number"},
                                                         {"1e300 2 3 4", "1e300 is out of range"}};
-    for (auto const &[line, reason] : reasons)
-        EXPECT_FAILURE("line 3: " + reason, parse("1 2 3 1\n# fine so far\n" + line + "\n1 2\n"));
+    for (auto const &row : reasons)
+        EXPECT_FAILURE("line 3: " + row.second,
+                       parse("1 2 3 1\n# fine so far\n" + row.first + "\n1 2\n"));
 }
 
 } // namespace

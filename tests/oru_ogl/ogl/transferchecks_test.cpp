@@ -49,18 +49,18 @@ TEST_F(TransferChecksTest, PartsAreCheckedInOrder) {
     for (TextureKind const &kind : kTextureKinds) {
         BoundTexture const texture(kind.make(Texture::INTERNALFORMAT_RGBA8, {16, 8, 4}, false));
         Pushed<CountingForwarder> counter;
-        for (auto const &[level, size, sides, text] : rows) {
-            if (sides > kind.sides)
+        for (auto const &row : rows) {
+            if (row.sides > kind.sides)
                 continue;
             SCOPED_TRACE(kind.name);
-            std::string const upload = with(text, "subimage", kind.sides == 3 ? " " : "");
-            Box const box = {{}, size};
-            EXPECT_FAILURE(upload, Upload(*texture, level, box, kBytes, kTight, kNothing));
-            EXPECT_FAILURE(upload,
-                           Upload(*texture, level, box, kBytes, kTight, &buffer, std::size_t(99)));
-            if (sides < 3) {
-                EXPECT_FAILURE(with(text, "copySubimage", ""),
-                               Copy(*texture, level, {}, Size(size[0]), Size(size[1])));
+            std::string const upload = with(row.text, "subimage", kind.sides == 3 ? " " : "");
+            Box const box = {{}, row.size};
+            EXPECT_FAILURE(upload, Upload(*texture, row.level, box, kBytes, kTight, kNothing));
+            EXPECT_FAILURE(
+                upload, Upload(*texture, row.level, box, kBytes, kTight, &buffer, std::size_t(99)));
+            if (row.sides < 3) {
+                EXPECT_FAILURE(with(row.text, "copySubimage", ""),
+                               Copy(*texture, row.level, {}, Size(row.size[0]), Size(row.size[1])));
             }
         }
         EXPECT_EQ(0, counter->total()) << "the checks come before any GL call";
