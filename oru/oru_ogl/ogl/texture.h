@@ -17,6 +17,10 @@ namespace ORU::OGL {
 /// leaves what was bound to the target bound. Let no pixel unpack buffer be bound meanwhile:
 /// OpenGL would fill the texture from it. Setters, uploads and downloads act on the texture that is
 /// bound to the target; bind first, with TextureUnit::bind.
+///
+/// A core context has no client attribute stack: there transfers read the pixel storage that they
+/// change by glGetIntegerv and put it back by glPixelStorei, also after a failure. Formats of
+/// alpha, luminance and intensity, colour indices and WRAPMODE_CLAMP need a compatibility context.
 class ORU_API Texture : public Object {
 public:
     /// What a texture is bound to.

@@ -275,24 +275,3 @@ TEST(ContextProfiles, HostsCoreContextsWork) {
         }
     }
 }
-
-// A handle that the host has given back says nothing of the next context that has it.
-TEST(ContextProfiles, AreForgottenWithTheirContext) {
-    AutoInitializer library;
-    HostContext const core(nullptr, kHostKinds[1]);
-    Pushed<CountingForwarder> calls;
-    Texture2D texture(Texture::INTERNALFORMAT_RED, 1, 1, false);
-    ORU_GL(BindTexture, GL_TEXTURE_2D, texture.objectID());
-    char const texel = 0;
-    PixelUnpackParameters const params;
-    auto const upload = [&] {
-        texture.subImage(0, 0, 0, 1, 1, Texture::FORMAT_RED, Texture::TYPE_BYTE, &texel, params);
-    };
-    upload();
-    {
-        ContextWrapped const adopted;
-        upload();
-    }
-    upload();
-    EXPECT_EQ(0, calls->count("PushClientAttrib"));
-}
