@@ -30,9 +30,17 @@ bool HasCompatibilityExtension() {
     return false;
 }
 
-/// Finds out what is not known, for a context that is current.
+/// The version text of the current context, empty without one.
+char const *VersionText() {
+    auto const *text = reinterpret_cast<char const *>(::glGetString(GL_VERSION));
+    return text ? text : "";
+}
+
+/// Finds out what is not known, for a context that is current. Where the driver's version text says
+/// it, nothing is asked that a recording of the calls would show.
 bool AskWhetherCore(HGLRC context) {
-    bool const isCore = ReadContextTraits().isCore;
+    bool const isCore =
+        !std::strstr(VersionText(), "Compatibility Profile") && ReadContextTraits().isCore;
     ContextRegistry::KeepProfile(context, isCore ? ContextRegistry::Profile::Core
                                                  : ContextRegistry::Profile::Compatibility);
     return isCore;
@@ -42,11 +50,8 @@ bool AskWhetherCore(HGLRC context) {
 
 ContextTraits ReadContextTraits() {
     ContextTraits traits;
-    auto const *version = reinterpret_cast<char const *>(::glGetString(GL_VERSION));
-    if (!version)
-        return traits;
     char *end = nullptr;
-    traits.major = static_cast<unsigned int>(std::strtoul(version, &end, 10));
+    traits.major = static_cast<unsigned int>(std::strtoul(VersionText(), &end, 10));
     traits.minor = *end == '.' ? static_cast<unsigned int>(std::strtoul(end + 1, nullptr, 10)) : 0;
     // Questions that a version does not know would leave an error behind.
     if (traits.major < 3)
