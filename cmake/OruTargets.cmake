@@ -39,17 +39,30 @@ function(oru_add_test name)
     if(arg_ENVIRONMENT)
         set(prefix "${name}/")
     endif()
-    gtest_discover_tests(${name}
+    oru_discover_tests(${name} "${prefix}" ${name}_TESTS ${arg_TIMEOUT} "${arg_ENVIRONMENT}")
+endfunction()
+
+# oru_add_test_variant(<name> <program> ENVIRONMENT <VAR=value>...)
+# Runs the cases of a test program a second time with ENVIRONMENT, as "<name>/Suite.Name".
+function(oru_add_test_variant name program)
+    cmake_parse_arguments(arg "" "" "ENVIRONMENT" ${ARGN})
+    oru_discover_tests(${program} "${name}/" ${name}_TESTS 60 "${arg_ENVIRONMENT}")
+endfunction()
+
+# Makes each case of a program a test of CTest; `list` is a name for all of them.
+function(oru_discover_tests program prefix list timeout environment)
+    gtest_discover_tests(${program}
         TEST_PREFIX "${prefix}"
+        TEST_LIST ${list}
         DISCOVERY_MODE PRE_TEST
         DISCOVERY_TIMEOUT 60
         NO_PRETTY_TYPES NO_PRETTY_VALUES
-        PROPERTIES TIMEOUT ${arg_TIMEOUT})
-    if(arg_ENVIRONMENT)
+        PROPERTIES TIMEOUT ${timeout})
+    if(environment)
         # A property that is a list does not survive gtest_discover_tests: set it once the tests are known.
-        set(script "${CMAKE_CURRENT_BINARY_DIR}/${name}_environment.cmake")
+        set(script "${CMAKE_CURRENT_BINARY_DIR}/${list}_environment.cmake")
         file(CONFIGURE OUTPUT "${script}" @ONLY CONTENT
-            "set_tests_properties(\${@name@_TESTS} PROPERTIES ENVIRONMENT [==[@arg_ENVIRONMENT@]==])\n")
+            "set_tests_properties(\${@list@} PROPERTIES ENVIRONMENT [==[@environment@]==])\n")
         set_property(DIRECTORY APPEND PROPERTY TEST_INCLUDE_FILES "${script}")
     endif()
 endfunction()

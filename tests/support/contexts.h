@@ -15,6 +15,7 @@
 
 #include <algorithm>
 #include <set>
+#include <vector>
 
 namespace oru_test {
 
@@ -51,7 +52,8 @@ Windowed(TestWindow const &window, ORU::OGL::Context const *share = nullptr,
 /// A rendering context that the host makes with plain calls, current for its lifetime.
 class HostContext {
 public:
-    explicit HostContext(HGLRC share = nullptr) {
+    /// @param attributes for wglCreateContextAttribsARB; without any, a context of wglCreateContext
+    explicit HostContext(HGLRC share = nullptr, std::vector<int> const &attributes = {}) {
         PIXELFORMATDESCRIPTOR descriptor = {};
         descriptor.nSize = sizeof descriptor;
         descriptor.nVersion = 1;
@@ -59,8 +61,17 @@ public:
         descriptor.iPixelType = PFD_TYPE_RGBA;
         ::SetPixelFormat(dc_, ::ChoosePixelFormat(dc_, &descriptor), &descriptor);
         rc_ = ::wglCreateContext(dc_);
+        if (!attributes.empty()) {
+            HGLRC const plain = rc_;
+            EXPECT_TRUE(::wglMakeCurrent(dc_, plain));
+            auto const create = reinterpret_cast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(
+                reinterpret_cast<void *>(::wglGetProcAddress("wglCreateContextAttribsARB")));
+            rc_ = create(dc_, nullptr, attributes.data());
+            ::wglMakeCurrent(nullptr, nullptr);
+            ::wglDeleteContext(plain);
+        }
         EXPECT_TRUE(!share || ::wglShareLists(share, rc_));
-        EXPECT_TRUE(::wglMakeCurrent(dc_, rc_));
+        makeCurrent();
     }
     ~HostContext() {
         ::wglMakeCurrent(nullptr, nullptr);
@@ -70,11 +81,13 @@ public:
     HostContext(HostContext const &) = delete;
     HostContext &operator=(HostContext const &) = delete;
 
+    void makeCurrent() const { EXPECT_TRUE(::wglMakeCurrent(dc_, rc_)); }
+
     HDC dc() const { return dc_; }
     HGLRC rc() const { return rc_; }
 
 private:
-    TestWindow window_;
+    TestWindow window_{0};
     HDC dc_ = ::GetDC(window_.hwnd());
     HGLRC rc_ = nullptr;
 };

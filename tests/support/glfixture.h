@@ -1,6 +1,7 @@
 // What tests on a real context share: the fixture, a decorator that counts calls.
 #pragma once
 
+#include "tests/support/coreprofile.h"
 #include "tests/support/pushed.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
@@ -13,6 +14,7 @@
 
 #include <map>
 #include <memory>
+#include <optional>
 #include <string>
 
 namespace oru_test {
@@ -58,11 +60,13 @@ private:
     std::map<std::string, int> counts_;
 };
 
-/// Every test runs in an open library with an offscreen context current, and must leave no GL error
-/// behind.
+/// Every test runs in an open library with an offscreen context current, in a core one where the
+/// run asks for that, and must leave no GL error behind.
 class OffscreenTest : public ::testing::Test {
 protected:
     void SetUp() override {
+        if (IsCoreRun())
+            coreShaders_.emplace();
         context_ = std::make_unique<ORU::OGL::ContextOffscreen>();
         context_->makeCurrent();
     }
@@ -72,12 +76,15 @@ protected:
             EXPECT_EQ(static_cast<GLenum>(GL_NO_ERROR), ::glGetError());
         }
         context_.reset();
+        coreShaders_.reset();
     }
 
     ORU::OGL::ContextOffscreen &context() { return *context_; }
 
 private:
     ORU::OGL::AutoInitializer library_;
+    ORU::OGL::ExtensionManager::ScopedInitOptions options_{RunOptions()};
+    std::optional<Pushed<CoreShaders>> coreShaders_;
     std::unique_ptr<ORU::OGL::ContextOffscreen> context_;
 };
 

@@ -10,9 +10,10 @@ namespace oru_test {
 /// A window of the host.
 class TestWindow {
 public:
-    TestWindow()
-        : hwnd_(::CreateWindowA("STATIC", "", WS_POPUP | WS_VISIBLE, 20, 20, 64, 48, nullptr,
-                                nullptr, ::GetModuleHandleW(nullptr), nullptr)) {}
+    /// @param style WS_VISIBLE to be shown, for which the system waits a second or two
+    explicit TestWindow(DWORD style = WS_VISIBLE)
+        : hwnd_(::CreateWindowA("STATIC", "", WS_POPUP | style, 20, 20, 64, 48, nullptr, nullptr,
+                                ::GetModuleHandleW(nullptr), nullptr)) {}
     ~TestWindow() { ::DestroyWindow(hwnd_); }
     TestWindow(TestWindow const &) = delete;
     TestWindow &operator=(TestWindow const &) = delete;

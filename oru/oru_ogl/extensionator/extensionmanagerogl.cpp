@@ -6,6 +6,7 @@
 #include "oru/core/utility/versionstring.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/catalogueogl.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/extensionator/internal/contextservices.h"
 #include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
@@ -347,7 +348,8 @@ bool ExtensionManager::supportsHalfFiltering() {
 
 unsigned int ExtensionManager::numberOfTextureUnits() const {
     GLint units = 1;
-    if (isSupported(GL_ARB_FRAGMENT_PROGRAM))
+    // A core context has the units of shaders only.
+    if (isSupported(GL_ARB_FRAGMENT_PROGRAM) || internal::IsCoreContext())
         ORU_GL(GetIntegerv, GL_MAX_TEXTURE_IMAGE_UNITS, &units);
     else if (supportsMultiTexture())
         ORU_GL(GetIntegerv, GL_MAX_TEXTURE_UNITS, &units);

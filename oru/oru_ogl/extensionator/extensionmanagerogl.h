@@ -4,6 +4,7 @@
 #include "oru/core/utility/export.h"
 #include "oru/core/utility/sharedptr.h"
 #include "oru/core/utility/windowsforward.h"
+#include "oru/oru_ogl/contextattributes.h"
 #include "oru/oru_ogl/displaydevicekey.h"
 #include "oru/oru_ogl/extensionator/functiontable.h"
 #include "oru/oru_ogl/extensionator/openglextension.h"
@@ -20,13 +21,6 @@ namespace ORU::OGL {
 class Context;
 class OpenGLInterceptorDecorator;
 class WGLInterceptorDecorator;
-
-/// The profile that a host wants for its contexts: kept for the host, the layer acts on none.
-enum OpenGLProfile : unsigned int {
-    OPENGLPROFILE_DEFAULT = 0,
-    OPENGLPROFILE_CORE = 1,
-    OPENGLPROFILE_COMPATIBILITY = 2
-};
 
 /// What one OpenGL implementation can do: versions, vendor, extensions, and its function table.
 ///
@@ -54,11 +48,17 @@ public:
         OpenGLProfile openGLProfile() const { return profile_; }
         void setOpenGLProfile(OpenGLProfile profile) { profile_ = profile; }
 
+        /// What new contexts are asked for, unless their BufferFormat says so.
+        ContextAttributes contextAttributes() const { return contextAttributes_; }
+        void setContextAttributes(ContextAttributes attributes) { contextAttributes_ = attributes; }
+
     private:
         bool throwOnNullContext_ = true;
         bool flushOnMakeCurrentMacOnly_ = true;
+        ContextAttributes contextAttributes_; // where padding was
         OpenGLProfile profile_ = OPENGLPROFILE_DEFAULT;
     };
+    static_assert(sizeof(InitOptions) == 8, "Hosts know its size.");
 
     /// Replaces the default options for a scope.
     class ORU_API ScopedInitOptions {

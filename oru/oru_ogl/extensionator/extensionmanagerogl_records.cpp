@@ -137,7 +137,9 @@ ExtensionManager *ExtensionManager::Create(DisplayDeviceKey const &key) {
 
 void ExtensionManager::RegisterContext(Context const &context) {
     ExtensionManager *const record = Instance(internal::DisplayDeviceOf(context));
-    ContextRegistry::Insert(internal::RenderContextOf(context), record, &record->table());
+    HGLRC const rc = internal::RenderContextOf(context);
+    ContextRegistry::Insert(rc, record, &record->table());
+    ContextRegistry::Hold(rc);
 }
 
 void ExtensionManager::UnRegisterContext(Context const &context) {

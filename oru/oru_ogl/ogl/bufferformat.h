@@ -2,6 +2,7 @@
 #pragma once
 
 #include "oru/core/utility/export.h"
+#include "oru/oru_ogl/contextattributes.h"
 
 namespace ORU::OGL {
 
@@ -55,6 +56,13 @@ public:
     /// Whether the colour channels are floating point.
     bool floatingPointColor() const { return floatingPointColor_; }
 
+    /// What the context is asked for besides; where nothing is set, what the init options say.
+    ContextAttributes contextAttributes() const { return contextAttributes_; }
+    BufferFormat &setContextAttributes(ContextAttributes attributes) {
+        contextAttributes_ = attributes;
+        return *this;
+    }
+
 private:
     unsigned int red_;
     unsigned int green_;
@@ -63,6 +71,8 @@ private:
     unsigned int stencil_;
     unsigned int depth_;
     bool floatingPointColor_;
+    ContextAttributes contextAttributes_; // where padding was
 };
+static_assert(sizeof(BufferFormat) == 28, "Hosts know its size.");
 
 } // namespace ORU::OGL

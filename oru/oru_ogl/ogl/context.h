@@ -92,7 +92,8 @@ protected:
 
     /// Sets a pixel format on a device context and makes this object's rendering context on it.
     /// The thread's current context is restored at the end. Floating-point, multisampled and
-    /// deeper than 8-bit formats need WGL_ARB_pixel_format.
+    /// deeper than 8-bit formats need WGL_ARB_pixel_format. The context is as the format's context
+    /// attributes say, or where it has none, as the init options'.
     /// @param share context to share objects with, or null
     /// @throws LogicalException when no context can be made; nothing is left behind
     void initialize(HDC dc, BufferFormat const &format, Buffering buffering,
@@ -120,12 +121,16 @@ protected:
     HGLRC setupRenderingContext(HDC dc, BufferFormat const &format, bool doubleBuffered,
                                 Context const *share);
 
-    /// A rendering context that shares with `share`; of version 3.0 or later where attributes can
-    /// be asked for.
-    /// @throws InternalException for a null device context, or when the context cannot be made or
-    ///         cannot share
+    /// A rendering context that shares with `share`; where nothing is asked for, of version 3.0 or
+    /// later where attributes can be given, else any.
+    /// @param attributes what is asked for; the init options' in the first form
+    /// @throws InternalException for a null device context, or when the context cannot be made as
+    ///         asked for or cannot share
     /// @note wglCreateContextAttribsARB (WGL_ARB_create_context) or wglCreateContext, wglShareLists
+    /// @{
     HGLRC createRenderingContext(HDC dc, Context const *share);
+    HGLRC createRenderingContext(HDC dc, Context const *share, ContextAttributes const &attributes);
+    /// @}
 
     /// Makes this context use another rendering context's objects; for hosts that derive.
     /// @throws InternalException when the system refuses
@@ -164,8 +169,10 @@ protected:
     /// Leaves the group; nothing without a rendering context.
     void unregisterSharedContext();
 
-    /// Finds the group of an adopted context by trying whether display lists are shared.
-    /// @note glGenLists, glIsList, glDeleteLists, not through the chain
+    /// Finds the group of an adopted context by trying whether display lists are shared, or
+    /// textures where one of the two contexts is a core one. Neither is left with a GL error.
+    /// @note glGenLists, glIsList, glDeleteLists, or glGenTextures, glBindTexture, glIsTexture,
+    ///       glDeleteTextures; not through the chain
     static void RegisterContextWrapped(Context const *context);
 
     /// Leaves its group; nothing for a context in none.
@@ -188,6 +195,10 @@ protected:
                                                  bool defaultToZeroOnFailure);
 
 private:
+    ContextAttributes attributesFor(BufferFormat const &format) const;
+    HGLRC makeAsAsked(HDC dc, ContextAttributes const &attributes);
+    static void requireAttributes(ContextAttributes const &attributes);
+
     // Read by nobody; they have their place in the binary interface.
     static void SetThrowTestException(bool value) { sThrowTestException_ = value; }
     static bool sThrowTestException_;

@@ -3,7 +3,9 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/scopedptr.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/ogl/internal/objects/ending.h"
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 #include "oru/oru_ogl/platformgl.h"
 
@@ -30,23 +32,65 @@ ShareGroups &Groups() {
     return *gShareGroups;
 }
 
-/// Whether a display list made in `a` appears in `b`, and disappears there when deleted in `a`.
-/// When it does not appear, the empty list stays in `a`: deleting it would make that context
+/// What a probe of two contexts leaves in one of them and looks for in the other: OpenGL's own
+/// functions, plain ones that every version has.
+struct ProbedObject {
+    GLuint (*make)();
+    GLboolean(ORU_APIENTRY *exists)(GLuint name);
+    void (*remove)(GLuint name);
+    bool isAlwaysRemoved;
+};
+
+/// An empty display list. Where it does not appear it stays: deleting it would make its context
 /// current once more for each group that is asked.
-bool SharesLists(Context const *a, Context const *b) {
+ProbedObject const kDisplayList = {
+    [] { return ::glGenLists(1); },
+    &::glIsList,
+    [](GLuint name) { ::glDeleteLists(name, 1); },
+    false,
+};
+
+/// A texture without images, as core contexts have no lists.
+ProbedObject const kTexture = {
+    [] {
+        GLint bound = 0;
+        ::glGetIntegerv(GL_TEXTURE_BINDING_2D, &bound);
+        GLuint name = 0;
+        ::glGenTextures(1, &name);
+        ::glBindTexture(GL_TEXTURE_2D, name); // it exists from here on
+        ::glBindTexture(GL_TEXTURE_2D, static_cast<GLuint>(bound));
+        return name;
+    },
+    &::glIsTexture,
+    [](GLuint name) { ::glDeleteTextures(1, &name); },
+    true,
+};
+
+/// Whether an object made in `a` appears in `b`, and disappears there when deleted in `a`.
+bool SharesObjects(Context const *a, Context const *b) {
     ORU_ASSERT(a);
     ORU_ASSERT(b);
     ScopedContextWrapper const restoreCurrent;
     try {
+        bool const isCore = internal::IsCoreContext(a->deviceContext(), a->renderContext()) ||
+                            internal::IsCoreContext(b->deviceContext(), b->renderContext());
+        ProbedObject const &object = isCore ? kTexture : kDisplayList;
         a->makeCurrent();
-        GLuint const id = ::glGenLists(1);
+        GLuint const id = object.make();
+        bool isToBeRemoved = object.isAlwaysRemoved;
+        internal::Ending removal([&] {
+            if (!isToBeRemoved)
+                return;
+            a->makeCurrent();
+            object.remove(id);
+        });
         b->makeCurrent();
-        if (!::glIsList(id))
+        if (!object.exists(id))
             return false;
-        a->makeCurrent();
-        ::glDeleteLists(id, 1);
+        isToBeRemoved = true;
+        removal.now();
         b->makeCurrent();
-        return !::glIsList(id);
+        return !object.exists(id);
     } catch (InternalException const &) {
         // A context that cannot be made current here, being in use elsewhere, tells nothing.
         return false;
@@ -97,7 +141,7 @@ void Context::UnregisterShareContext(Context const *context) {
 
 void Context::RegisterContextWrapped(Context const *context) {
     for (ShareGroup &group : Groups()) {
-        if (SharesLists(group.front(), context)) {
+        if (SharesObjects(group.front(), context)) {
             group.push_back(context);
             return;
         }

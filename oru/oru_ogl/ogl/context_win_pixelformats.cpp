@@ -67,6 +67,7 @@ void Context::initialize(HDC dc, BufferFormat const &format, Buffering buffering
     bool const gdiSuffices = !format.floatingPointColor() && multisampling == MULTISAMPLING_NONE &&
                              format.redBits() <= 8 && format.greenBits() <= 8 &&
                              format.blueBits() <= 8 && format.alphaBits() <= 8;
+    ContextAttributes const attributes = attributesFor(format);
     TemporaryContext temporary;
     try {
         if (gdiSuffices) {
@@ -76,16 +77,19 @@ void Context::initialize(HDC dc, BufferFormat const &format, Buffering buffering
             HDC queryDC = ORU_WGL0(GetCurrentContext) ? ORU_WGL0(GetCurrentDC) : nullptr;
             if (!queryDC) {
                 queryDC = temporary.makeWindow();
-                temporary.adopt(setupRenderingContext(
-                    queryDC, BufferFormat(8, 8, 8, 0, 0, 0, false), false, nullptr));
+                setPixelFormat(queryDC, ChoosePixelFormat(
+                                            queryDC, BufferFormat(8, 8, 8, 0, 0, 0, false), false));
+                temporary.adopt(createRenderingContext(queryDC, nullptr, ContextAttributes()));
             }
             int const pixelFormat =
                 ChoosePixelFormat(queryDC, format, buffering, multisampling, WINDOWING_WINDOW);
             temporary.release();
             setPixelFormat(dc, pixelFormat);
-            renderContext_ = createRenderingContext(dc, share);
+            renderContext_ = createRenderingContext(dc, share, attributes);
         }
         makeCurrent();
+        if (!attributes.isDefault())
+            requireAttributes(attributes);
     } catch (LogicalException const &failure) {
         if (ORU_WGL0(GetCurrentContext) || ORU_WGL0(GetCurrentDC))
             if (!ORU_WGL(MakeCurrent, nullptr, nullptr))
@@ -111,7 +115,7 @@ HGLRC Context::setupRenderingContext(HDC dc, BufferFormat const &format, bool do
                                      Context const *share) {
     pixelFormat_ = ChoosePixelFormat(dc, format, doubleBuffered);
     setPixelFormat(dc, pixelFormat_);
-    return createRenderingContext(dc, share);
+    return createRenderingContext(dc, share, attributesFor(format));
 }
 
 int Context::ChoosePixelFormat(HDC dc, BufferFormat const &format, bool doubleBuffered) {
@@ -173,7 +177,17 @@ void Context::setPixelFormat(HDC dc, int pixelFormat) {
                                        " on device context. Window Error: ", ::GetLastError()));
 }
 
+ContextAttributes Context::attributesFor(BufferFormat const &format) const {
+    ContextAttributes const attributes = format.contextAttributes();
+    return attributes.isDefault() ? initOptions_.contextAttributes() : attributes;
+}
+
 HGLRC Context::createRenderingContext(HDC dc, Context const *share) {
+    return createRenderingContext(dc, share, initOptions_.contextAttributes());
+}
+
+HGLRC Context::createRenderingContext(HDC dc, Context const *share,
+                                      ContextAttributes const &attributes) {
     if (!dc)
         ORU_THROW_INTERNAL("Context::createRenderingContext invalid device context");
 
@@ -185,6 +199,11 @@ HGLRC Context::createRenderingContext(HDC dc, Context const *share) {
         ORU_THROW_INTERNAL("Context::createRenderingContext cannot share lists.");
     };
 
+    if (!attributes.isDefault()) {
+        HGLRC const context = makeAsAsked(dc, attributes);
+        shareWith(context);
+        return context;
+    }
     ExtensionManager const *const manager = ExtensionManager::Instance(displayDeviceKey_);
     if (auto const create = manager ? manager->getWglCreateContextAttribsPtr() : nullptr) {
         constexpr int kAttributes[] = {WGL_CONTEXT_MAJOR_VERSION_ARB, 3,

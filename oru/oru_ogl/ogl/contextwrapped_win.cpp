@@ -3,6 +3,7 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/dropexceptions.h"
+#include "oru/oru_ogl/extensionator/internal/contextregistry.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
@@ -39,6 +40,7 @@ DisplayDeviceKey ContextWrapped::DeviceOfCurrentContext() {
 
 ContextWrapped::~ContextWrapped() {
     DropExceptions([this] { UnregisterShareContext(this); });
+    internal::ContextRegistry::LetGo(renderContext_);
 }
 
 void ContextWrapped::makeCurrent() const {

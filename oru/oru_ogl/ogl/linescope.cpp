@@ -1,7 +1,9 @@
 // Line smoothing, stippling and width changed for a scope.
 #include "oru/oru_ogl/ogl/linescope.h"
 
+#include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/platformgl.h"
 
@@ -51,6 +53,10 @@ TemporaryLineSmoothScope::~TemporaryLineSmoothScope() {
 }
 
 void LineStippleState::setToCurrentGLValues() {
+    ORU_ASSERT_TEXT(
+        "Line stippling needs a compatibility context: in a core one leave fragments out "
+        "in a shader",
+        !internal::IsCoreContext());
     enabled = IsOn(GL_LINE_STIPPLE);
     if (!enabled)
         return;

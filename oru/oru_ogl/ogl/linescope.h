@@ -39,6 +39,7 @@ struct ORU_API LineStippleState {
     unsigned short pattern = 0; ///< drawn from the lowest bit on
 
     /// Reads it from the current context; factor and pattern only while stippling is on.
+    /// @throws InternalException in a core context, which has no stippling
     /// @note glGetBooleanv, glGetIntegerv
     void setToCurrentGLValues();
 
@@ -52,6 +53,7 @@ class ORU_API TemporaryLineStippleScope {
 public:
     /// @param enable 0 for solid lines; factor and pattern then do not matter
     /// @param factor pixels per bit of the pattern, 1 to 256
+    /// @throws InternalException in a core context, which has no stippling
     /// @note glEnable and glLineStipple, or glDisable
     TemporaryLineStippleScope(unsigned char enable, int factor, unsigned short pattern);
     TemporaryLineStippleScope(TemporaryLineStippleScope const &) = default;

@@ -3,6 +3,7 @@
 
 #include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
@@ -16,6 +17,8 @@ namespace ORU::OGL {
 
 namespace {
 
+constexpr std::uint64_t kNotComputed = ~std::uint64_t(0) >> 1;
+
 /// A size halved `level` times.
 std::uint64_t AtLevel(std::uint64_t size, unsigned int level) {
     return level < 64 ? size >> level : 0;
@@ -26,7 +29,8 @@ std::uint64_t AtLevel(std::uint64_t size, unsigned int level) {
 Texture::Texture(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
                  std::uint64_t height, std::uint64_t depth)
     : Object(Target2GL(target), TargetBinding2GL(binding)), format_(format), width_(width),
-      height_(height), depth_(depth) {
+      height_(height), depth_(depth), sizeInBytes_(kNotComputed), generatesMipmaps_(0) {
+    internal::RequireFormat(format);
     ORU_GL(GenTextures, 1, &objectID_);
     if (objectID_ == 0) // the check's text is what hosts see, with its slip
         ORU_THROW_INTERNAL("Texture:: contructor failed to allocate new GPU texture resource");
@@ -49,8 +53,8 @@ std::uint64_t Texture::depth(unsigned int level) const {
 }
 
 int Texture::sizeInBytes() const {
-    if (sizeInBytes_ == ~std::uint64_t(0))
-        sizeInBytes_ = SizeInBytes(format_, width_, height_, depth_);
+    if (sizeInBytes_ == kNotComputed)
+        sizeInBytes_ = SizeInBytes(format_, width_, height_, depth_) & kNotComputed;
     return static_cast<int>(sizeInBytes_);
 }
 
@@ -72,7 +76,20 @@ void Texture::setBorderColor(float const *rgba) {
 }
 
 void Texture::enableAutoMIPGeneration(bool on) {
-    ORU_GL(TexParameteri, target(), GL_GENERATE_MIPMAP, on ? 1 : 0);
+    bool const isCore = internal::IsCoreContext();
+    generatesMipmaps_ = isCore && on;
+    if (!isCore)
+        ORU_GL(TexParameteri, target(), GL_GENERATE_MIPMAP, on ? 1 : 0);
+}
+
+void Texture::generateMipmap() {
+    if (internal::Supports(GL_ARB_FRAMEBUFFER_OBJECT))
+        ORU_GL(GenerateMipmap, target());
+    else if (internal::Supports(GL_EXT_FRAMEBUFFER_OBJECT))
+        ORU_GL(GenerateMipmapEXT, target());
+    else
+        ORU_THROW_INTERNAL("Texture::generateMipmap needs OpenGL 3.0, GL_ARB_framebuffer_object or "
+                           "GL_EXT_framebuffer_object: upload each level");
 }
 
 std::size_t Texture::Channels(InternalFormat format) {
@@ -125,7 +142,7 @@ bool Texture::IsTargetSupported(unsigned int target) {
 }
 
 bool Texture::SupportsAutoMIPGeneration() {
-    ExtensionManager const *const record = ExtensionManager::Instance();
+    ExtensionManager const *const record = internal::RecordOfCurrent();
     if (!record)
         return false;
     unsigned int const major = record->majorVersion();
@@ -134,18 +151,18 @@ bool Texture::SupportsAutoMIPGeneration() {
 
 void Texture::PushAndSetReadbackByteAlignment(unsigned int bytes) {
     internal::CheckByteAlignment(bytes);
-    ORU_GL(PushClientAttrib, GL_CLIENT_PIXEL_STORE_BIT);
+    internal::PushPixelStorage(internal::kPackStorage);
     ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, static_cast<GLint>(bytes));
 }
 
 void Texture::PushAndSetTransferByteAlignment(unsigned int bytes) {
     internal::CheckByteAlignment(bytes);
-    ORU_GL(PushClientAttrib, GL_CLIENT_PIXEL_STORE_BIT);
+    internal::PushPixelStorage(internal::kUnpackStorage);
     ORU_GL(PixelStorei, GL_UNPACK_ALIGNMENT, static_cast<GLint>(bytes));
 }
 
 void Texture::PopPixelTransferModes() {
-    ORU_GL0(PopClientAttrib);
+    internal::PopPixelStorage();
 }
 
 ORU_TRANSLATED(Texture, Target, internal::kTargets)

@@ -17,6 +17,10 @@ namespace ORU::OGL {
 /// leaves what was bound to the target bound. Let no pixel unpack buffer be bound meanwhile:
 /// OpenGL would fill the texture from it. Setters, uploads and downloads act on the texture that is
 /// bound to the target; bind first, with TextureUnit::bind.
+///
+/// A core context has no client attribute stack: there transfers read the pixel storage that they
+/// change by glGetIntegerv and put it back by glPixelStorei, also after a failure. Formats of
+/// alpha, luminance and intensity, colour indices and WRAPMODE_CLAMP need a compatibility context.
 class ORU_API Texture : public Object {
 public:
     /// What a texture is bound to.
@@ -215,9 +219,16 @@ public:
     /// @note glTexParameterfv
     void setBorderColor(float const *rgba);
 
-    /// Whether a change of level 0 makes the other levels anew.
+    /// Whether a change of level 0 makes the other levels anew. A core context cannot do that by
+    /// itself: there each upload to level 0 and each copy to it ends with a `generateMipmap()`.
     /// @note glTexParameteri; needs `SupportsAutoMIPGeneration()`
     void enableAutoMIPGeneration(bool on);
+
+    /// Makes the other levels anew from level 0, now.
+    /// @throws InternalException where there is no such function
+    /// @note glGenerateMipmap (OpenGL 3.0, GL_ARB_framebuffer_object) or glGenerateMipmapEXT
+    ///       (GL_EXT_framebuffer_object)
+    void generateMipmap();
     /// @}
 
     /// Channels of a format. @throws InternalException for INTERNALFORMAT_RGB4, and for a number
@@ -261,10 +272,18 @@ public:
 protected:
     /// Makes the texture's name; the storage is the derived classes' part.
     /// @param width, height, depth texels of level 0, 1 for what the target has not
-    /// @throws InternalException when there is no name to be had
+    /// @throws InternalException when there is no name to be had, and in a core context for a
+    /// format
+    ///         of alpha, luminance or intensity
     /// @note glGenTextures
     Texture(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
             std::uint64_t height, std::uint64_t depth);
+
+    /// What follows a change of a level's image by the classes; see `enableAutoMIPGeneration`.
+    void imageChanged(int level) {
+        if (level == 0 && generatesMipmaps_)
+            generateMipmap();
+    }
 
     /// Kept for hosts that call it; there is nothing to verify.
     void verifyCurrentTextureObject() const {}
@@ -276,8 +295,10 @@ protected:
     /// @name Client pixel-store state around a transfer
     /// Saves the state and sets the alignment of rows; the last one puts the saved state back.
     /// @param bytes 1, 2, 4 or 8
-    /// @throws InternalException for any other number
-    /// @note glPushClientAttrib, glPixelStorei, glPopClientAttrib
+    /// @throws InternalException for any other number, and in a core context (where up to 16 states
+    ///         are saved, of packing or unpacking) for a saved one too many or too few
+    /// @note glPushClientAttrib, glPixelStorei, glPopClientAttrib; in a core context glGetIntegerv
+    ///       and glPixelStorei
     /// @{
     static void PushAndSetReadbackByteAlignment(unsigned int bytes);
     static void PushAndSetTransferByteAlignment(unsigned int bytes);
@@ -289,7 +310,8 @@ private:
     std::uint64_t width_;
     std::uint64_t height_;
     std::uint64_t depth_;
-    mutable std::uint64_t sizeInBytes_ = ~std::uint64_t(0); ///< all ones: not computed yet
+    mutable std::uint64_t sizeInBytes_ : 63; ///< all ones: not computed yet
+    std::uint64_t generatesMipmaps_ : 1;     ///< only what a core context does not by itself
 };
 
 /// Writes the enumerator's name ("INTERNALFORMAT_RGBA8"), or "UNKNOWN FORMAT".

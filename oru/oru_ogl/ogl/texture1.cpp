@@ -42,6 +42,7 @@ Texture1::Texture1(Target target, TargetBinding binding, InternalFormat format, 
 Texture1::~Texture1() = default;
 
 void Texture1::setWrap(WrapMode s) {
+    internal::RequireWrap(s);
     ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_S, static_cast<GLint>(WrapMode2GL(s)));
 }
 
@@ -54,6 +55,7 @@ void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Ty
     checkPart("subimage", level, width);
     internal::Upload(Send, Part{target(), level, {x}, internal::ToSides(width)}, format, type, data,
                      params);
+    imageChanged(level);
 }
 
 void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Type type,
@@ -61,11 +63,13 @@ void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Ty
     checkPart("subimage", level, width);
     internal::Upload(Send, Part{target(), level, {x}, internal::ToSides(width)}, format, type,
                      buffer, offset, params);
+    imageChanged(level);
 }
 
 void Texture1::copyTexSubImage(int level, int xOffset, int x, int y, std::uint64_t width) {
     checkPart("copySubimage", level, width);
     ORU_GL(CopyTexSubImage1D, target(), level, xOffset, x, y, static_cast<GLsizei>(width));
+    imageChanged(level);
 }
 
 void Texture1::getPixelData(void *dst, int level, unsigned int format, unsigned int type) const {

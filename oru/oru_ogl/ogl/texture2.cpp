@@ -71,6 +71,7 @@ void Texture2::allocate(bool mipmapped, Type type) {
 void Texture2::setWrap(WrapMode s, WrapMode t) {
     if (!isBound())
         ORU_THROW_INTERNAL("Texture must be enabled (bound & active)");
+    internal::RequireWrap(s, t);
     ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_S, static_cast<GLint>(WrapMode2GL(s)));
     ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_T, static_cast<GLint>(WrapMode2GL(t)));
 }
@@ -87,6 +88,7 @@ void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint6
     checkPart("subimage", level, width, height);
     internal::Upload(Send, Part{target(), level, {x, y}, internal::ToSides(width, height)}, format,
                      type, data, params);
+    imageChanged(level);
 }
 
 void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint64_t height,
@@ -95,6 +97,7 @@ void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint6
     checkPart("subimage", level, width, height);
     internal::Upload(Send, Part{target(), level, {x, y}, internal::ToSides(width, height)}, format,
                      type, buffer, offset, params);
+    imageChanged(level);
 }
 
 void Texture2::copyTexSubImage(int level, int xOffset, int yOffset, int x, int y,
@@ -102,6 +105,7 @@ void Texture2::copyTexSubImage(int level, int xOffset, int yOffset, int x, int y
     checkPart("copySubimage", level, width, height);
     ORU_GL(CopyTexSubImage2D, target(), level, xOffset, yOffset, x, y, static_cast<GLsizei>(width),
            static_cast<GLsizei>(height));
+    imageChanged(level);
 }
 
 void Texture2::getPixelData(void *dst, int level, Format format, Type type,
@@ -110,11 +114,9 @@ void Texture2::getPixelData(void *dst, int level, Format format, Type type,
         ORU_THROW_INTERNAL("Texture must be bound");
     if (format == FORMAT_COLOR_INDEX)
         ORU_THROW_INTERNAL("COLOR_INDEX not allowed here!");
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
-    PushAndSetReadbackByteAlignment(alignment);
-    ORU_GL(GetTexImage, target(), level, glFormat, glType, dst);
-    PopPixelTransferModes();
+    internal::PixelLayout const layout = internal::LayoutOf(format, type);
+    internal::WithPackAlignment(
+        alignment, [&] { ORU_GL(GetTexImage, target(), level, layout.format, layout.type, dst); });
 }
 
 void Texture2::getPixelData(Buffer *buffer, std::size_t offset, int level, Format format, Type type,
@@ -125,14 +127,13 @@ void Texture2::getPixelData(Buffer *buffer, std::size_t offset, int level, Forma
     if (format == FORMAT_COLOR_INDEX)
         ORU_THROW_INTERNAL("COLOR_INDEX not allowed here!");
     internal::CheckByteAlignment(alignment);
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
+    internal::PixelLayout const layout = internal::LayoutOf(format, type);
     internal::BecomePackBuffer(*buffer);
-    PushAndSetReadbackByteAlignment(alignment);
-    internal::ReadInto(*buffer, offset, [&](void *pixels) {
-        ORU_GL(GetTexImage, target(), level, glFormat, glType, pixels);
+    internal::WithPackAlignment(alignment, [&] {
+        internal::ReadInto(*buffer, offset, [&](void *pixels) {
+            ORU_GL(GetTexImage, target(), level, layout.format, layout.type, pixels);
+        });
     });
-    PopPixelTransferModes();
 }
 
 std::size_t Texture2::pixelDataSize(int /*level*/, Format format, Type type) const {

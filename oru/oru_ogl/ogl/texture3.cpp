@@ -59,10 +59,9 @@ Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, 
     : Texture(target, binding, format, width, height, depth) {
     initialize([&](std::array<GLsizei, 3> const &sides) {
         auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format));
-        unsigned int const glFormat = Format2GL(clientFormat);
-        unsigned int const glType = Type2GL(type);
-        ORU_GL(PushClientAttrib, GL_CLIENT_PIXEL_STORE_BIT);
-        internal::Ending restoreUnpackState([] { ORU_GL0(PopClientAttrib); });
+        auto const [glFormat, glType] = internal::LayoutOf(clientFormat, type);
+        internal::PixelStorageScope saved(internal::kUnpackStorage);
+        internal::Ending restoreUnpackState([&] { saved.restore(); });
         params.apply();
         ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1], sides[2], 0,
                glFormat, glType, data);
@@ -73,6 +72,7 @@ Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, 
 Texture3::~Texture3() = default;
 
 void Texture3::setWrap(WrapMode s, WrapMode t, WrapMode r) {
+    internal::RequireWrap(s, t, r);
     ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_S, static_cast<GLint>(WrapMode2GL(s)));
     ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_T, static_cast<GLint>(WrapMode2GL(t)));
     ORU_GL(TexParameteri, target(), GL_TEXTURE_WRAP_R, static_cast<GLint>(WrapMode2GL(r)));
@@ -92,6 +92,7 @@ void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std
     internal::Upload(Send,
                      Part{target(), level, {x, y, z}, internal::ToSides(width, height, depth)},
                      format, type, data, params);
+    imageChanged(level);
 }
 
 void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std::uint64_t height,
@@ -101,6 +102,7 @@ void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std
     internal::Upload(Send,
                      Part{target(), level, {x, y, z}, internal::ToSides(width, height, depth)},
                      format, type, buffer, offset, params);
+    imageChanged(level);
 }
 
 void Texture3::copyTexSubImage(int level, int xOffset, int yOffset, int zOffset, int x, int y,
@@ -110,31 +112,29 @@ void Texture3::copyTexSubImage(int level, int xOffset, int yOffset, int zOffset,
                         internal::Side{"height", "height", height, this->height(0)});
     ORU_GL(CopyTexSubImage3D, target(), level, xOffset, yOffset, zOffset, x, y,
            static_cast<GLsizei>(width), static_cast<GLsizei>(height));
+    imageChanged(level);
 }
 
 void Texture3::getPixelData(void *dst, int level, Format format, Type type,
                             unsigned int alignment) const {
     if (format == FORMAT_COLOR_INDEX)
         ORU_THROW_INTERNAL("COLOR_INDEX not allowed here!");
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
-    PushAndSetReadbackByteAlignment(alignment);
-    ORU_GL(GetTexImage, target(), level, glFormat, glType, dst);
-    PopPixelTransferModes();
+    internal::PixelLayout const layout = internal::LayoutOf(format, type);
+    internal::WithPackAlignment(
+        alignment, [&] { ORU_GL(GetTexImage, target(), level, layout.format, layout.type, dst); });
 }
 
 void Texture3::getPixelData(Buffer *buffer, int offset, int level, Format format, Type type,
                             unsigned int alignment) const {
     internal::CheckBuffer(buffer);
     internal::CheckByteAlignment(alignment);
-    unsigned int const glFormat = Format2GL(format);
-    unsigned int const glType = Type2GL(type);
+    internal::PixelLayout const layout = internal::LayoutOf(format, type);
     internal::BecomePackBuffer(*buffer);
-    PushAndSetReadbackByteAlignment(alignment);
-    internal::ReadInto(*buffer, static_cast<std::uint64_t>(offset), [&](void *pixels) {
-        ORU_GL(GetTexImage, target(), level, glFormat, glType, pixels);
+    internal::WithPackAlignment(alignment, [&] {
+        internal::ReadInto(*buffer, static_cast<std::uint64_t>(offset), [&](void *pixels) {
+            ORU_GL(GetTexImage, target(), level, layout.format, layout.type, pixels);
+        });
     });
-    PopPixelTransferModes();
 }
 
 std::size_t Texture3::pixelDataSize(int /*level*/, Format format, Type type) const {

@@ -3,6 +3,7 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texturestate.h"
@@ -21,11 +22,14 @@ Texture2DBindScope::Texture2DBindScope(Texture2D *texture, unsigned int unit, bo
     unit_ = unit;
     try {
         TextureUnit const &theUnit = *TextureUnit::Unit(unit);
-        theUnit.enable2D();
+        bool const isFixedFunction = !internal::IsCoreContext();
+        if (isFixedFunction)
+            theUnit.enable2D();
         theUnit.bind(texture);
         texture->setFilter(Texture::FILTER_NEAREST, Texture::FILTER_NEAREST);
         texture->setWrap(Texture::WRAPMODE_CLAMP_TO_EDGE, Texture::WRAPMODE_CLAMP_TO_EDGE);
-        theUnit.setEnv(TextureUnit::ENVIRONMENT_REPLACE);
+        if (isFixedFunction)
+            theUnit.setEnv(TextureUnit::ENVIRONMENT_REPLACE);
     } catch (...) {
         end();
         throw;
@@ -42,7 +46,8 @@ void Texture2DBindScope::end() const noexcept {
         TextureState::SetActiveTextureUnit(unit_);
         TextureUnit const &unit = *TextureUnit::Unit(unit_);
         unit.bind2DDefault();
-        unit.disable2D();
+        if (!internal::IsCoreContext())
+            unit.disable2D();
         TextureState::SetActiveTextureUnit(previousUnit_);
     });
 }

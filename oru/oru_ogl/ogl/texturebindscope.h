@@ -9,7 +9,8 @@ class Texture2D;
 
 /// Binds a 2-D texture on a unit and lets it replace the fragments' colours until the scope ends,
 /// in fixed-function drawing. The texture is sampled with FILTER_NEAREST and clamped to its edges,
-/// and stays so. At the end the unit has no 2-D texture, whatever it had before.
+/// and stays so. At the end the unit has no 2-D texture, whatever it had before. A core context has
+/// no fixed-function drawing: there the scope binds the texture for a shader.
 class ORU_API Texture2DBindScope {
 public:
     /// @param texture may be null in a scope that is not active

@@ -1,7 +1,9 @@
 // The fixed-function texture units of the current context.
 #include "oru/oru_ogl/ogl/textureunit.h"
 
+#include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
 #include "oru/oru_ogl/ogl/texture1.h"
 #include "oru/oru_ogl/ogl/texture2.h"
@@ -20,6 +22,13 @@ constexpr internal::Translation<TextureUnit::Environment, 6> kEnvironments = {
     {ORU_ROW(ADD), ORU_ROW(BLEND), ORU_ROW(COMBINE), ORU_ROW(DECAL), ORU_ROW(MODULATE),
      ORU_ROW(REPLACE)}};
 #undef ORU_ROW
+
+void RequireFixedFunction() {
+    ORU_ASSERT_TEXT(
+        "Fixed-function texturing needs a compatibility context: in a core one bind the "
+        "texture and sample it in a shader",
+        !internal::IsCoreContext());
+}
 
 } // namespace
 
@@ -51,12 +60,15 @@ ORU_BINDING(RECT, GL_TEXTURE_RECTANGLE, TextureRECT)
 
 #define ORU_ENABLING(Target, gl)                                                                   \
     void TextureUnit::enable##Target() const {                                                     \
+        RequireFixedFunction();                                                                    \
         ORU_GL(Enable, gl);                                                                        \
     }                                                                                              \
     void TextureUnit::disable##Target() const {                                                    \
+        RequireFixedFunction();                                                                    \
         ORU_GL(Disable, gl);                                                                       \
     }                                                                                              \
     bool TextureUnit::isEnabled##Target() const {                                                  \
+        RequireFixedFunction();                                                                    \
         return ORU_GL(IsEnabled, gl) == GL_TRUE;                                                   \
     }
 ORU_ENABLING(1D, GL_TEXTURE_1D)
@@ -66,6 +78,7 @@ ORU_ENABLING(RECT, GL_TEXTURE_RECTANGLE)
 #undef ORU_ENABLING
 
 void TextureUnit::setEnv(Environment environment) const {
+    RequireFixedFunction();
     ORU_GL(TexEnvi, GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE,
            static_cast<GLint>(Environment2GL(environment)));
 }

@@ -55,6 +55,7 @@ public:
     /// @}
 
     /// @name Fixed-function texturing with a target
+    /// @throws InternalException in a core context, which has none
     /// @note glEnable, glDisable, glIsEnabled
     /// @{
     void enable1D() const;
@@ -71,6 +72,7 @@ public:
     bool isEnabledRECT() const;
     /// @}
 
+    /// @throws InternalException in a core context, which has no fixed-function texturing
     /// @note glTexEnvi
     void setEnv(Environment environment) const;
 

@@ -3,6 +3,7 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/programogl.h"
@@ -161,6 +162,12 @@ void VertexBuffer::marshallData(std::size_t count) {
 }
 
 void VertexBuffer::drawPrimitives(std::size_t count) {
+    bool const isDeprecated =
+        primitiveType_ >= PRIMITIVETYPE_QUADS && primitiveType_ <= PRIMITIVETYPE_POLYGON;
+    if (isDeprecated && internal::IsCoreContext())
+        ORU_THROW_INTERNAL(
+            "Quadrilaterals and polygons need a compatibility context: in a core one "
+            "draw triangles");
     ORU_GL(BindVertexArray, vertexBuffer_);
     ORU_GL(DrawArrays, primitiveType_, 0, static_cast<GLsizei>(count));
     ORU_GL(BindVertexArray, 0);

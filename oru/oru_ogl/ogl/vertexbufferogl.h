@@ -23,7 +23,8 @@ class Program;
 ///     triangle.drawPrimitives();
 ///
 /// A copy has the vertices and no OpenGL objects: set it up with a program before drawing. Moving
-/// takes the objects along. OpenGL 3.0, or GL_ARB_vertex_array_object with OpenGL 2.0.
+/// takes the objects along. Quadrilaterals and polygons need a compatibility context. OpenGL 3.0,
+/// or GL_ARB_vertex_array_object with OpenGL 2.0.
 class ORU_API VertexBuffer {
 public:
     /// Components of an attribute.

@@ -29,11 +29,13 @@ struct Everything {
     TemporaryAlphaBlendScope blend;
     TemporaryLineWidthScope width{3};
     TemporaryLineSmoothScope smooth;
-    TemporaryLineStippleScope stipple{1, 2, 0xAAAA};
+    std::optional<TemporaryLineStippleScope> stipple;
     Texture2DBindScope bound{&texture, 0, true};
     ProgramEnabledScope enabled;
 
     Everything() {
+        if (!IsCoreRun())
+            stipple.emplace(static_cast<unsigned char>(1), 2, static_cast<unsigned short>(0xAAAA));
         shader.load("void main() { gl_Position = vec4(0); }");
         shader.compile(true);
         program.attach(&shader);

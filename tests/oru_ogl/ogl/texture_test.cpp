@@ -91,7 +91,9 @@ TEST_F(TextureTest, SetsParametersOfTheBoundTexture) {
         SCOPED_TRACE(kind.name);
         BoundTexture const texture(kind.make(Texture::INTERNALFORMAT_RGBA8, {4, 4, 4}, false));
         texture->setFilter(Texture::FILTER_LINEAR, Texture::FILTER_NEAREST);
-        Texture::WrapMode const s = Texture::WRAPMODE_CLAMP_TO_BORDER, t = Texture::WRAPMODE_CLAMP,
+        Texture::WrapMode const s = Texture::WRAPMODE_CLAMP_TO_BORDER,
+                                t = IsCoreRun() ? Texture::WRAPMODE_CLAMP_TO_EDGE
+                                                : Texture::WRAPMODE_CLAMP,
                                 r = Texture::WRAPMODE_REPEAT;
         if (auto *const one = dynamic_cast<Texture1 *>(&*texture)) {
             one->setWrap(s);
@@ -103,8 +105,8 @@ TEST_F(TextureTest, SetsParametersOfTheBoundTexture) {
         } else {
             dynamic_cast<Texture3 &>(*texture).setWrap(s, t, r);
         }
-        std::vector<GLint> expected = {GL_LINEAR, GL_NEAREST, GL_CLAMP_TO_BORDER, GL_CLAMP,
-                                       GL_REPEAT};
+        std::vector<GLint> expected = {GL_LINEAR, GL_NEAREST, GL_CLAMP_TO_BORDER,
+                                       static_cast<GLint>(Texture::WrapMode2GL(t)), GL_REPEAT};
         expected.resize(2 + kind.sides);
         EXPECT_EQ(expected, Sampling(kind.target, kind.sides));
 
@@ -112,13 +114,30 @@ TEST_F(TextureTest, SetsParametersOfTheBoundTexture) {
         std::array<float, 4> border = {};
         ORU_GL(GetTexParameterfv, kind.target, GL_TEXTURE_BORDER_COLOR, border.data());
         EXPECT_EQ(red, border);
-        for (int i = 1; i >= 0 && kind.mipmaps(); --i) {
+        for (int i = 1; i >= 0 && kind.mipmaps() && !IsCoreRun(); --i) {
             texture->enableAutoMIPGeneration(i == 1);
             GLint automatic = -1;
             ORU_GL(GetTexParameteriv, kind.target, GL_GENERATE_MIPMAP, &automatic);
             EXPECT_EQ(i, automatic);
         }
     }
+}
+
+// Before any call, and in core contexts only.
+TEST_F(TextureTest, ClampIsOfCompatibilityContexts) {
+    std::string const expected = IsCoreRun() ? "WRAPMODE_CLAMP needs a compatibility context: in a "
+                                               "core one use WRAPMODE_CLAMP_TO_EDGE"
+                                             : "";
+    auto const clamp = Texture::WRAPMODE_CLAMP, repeat = Texture::WRAPMODE_REPEAT;
+    Texture1D line(Texture::INTERNALFORMAT_RED, 4, false);
+    Texture2D plane(Texture::INTERNALFORMAT_RED, 4, 4, false);
+    Texture3D solid(Texture::INTERNALFORMAT_RED, 4, 4, 4, false);
+    ORU_GL(BindTexture, GL_TEXTURE_2D, plane.objectID());
+    Pushed<CountingForwarder> calls;
+    EXPECT_FAILURE(expected, line.setWrap(clamp));
+    EXPECT_FAILURE(expected, plane.setWrap(repeat, clamp));
+    EXPECT_FAILURE(expected, solid.setWrap(repeat, repeat, clamp));
+    EXPECT_EQ(IsCoreRun() ? 0 : 6, calls->count("TexParameteri"));
 }
 
 TEST_F(TextureTest, TellsItsSizePerLevel) {

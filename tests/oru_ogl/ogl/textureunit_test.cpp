@@ -13,7 +13,12 @@ namespace {
 using U = TextureUnit;
 using Operation = void (U::*)() const;
 
-/// Binds a texture in both ways, and enables its target unless it is one of shaders only.
+char const kFixedFunction[] =
+    "Fixed-function texturing needs a compatibility context: in a core one "
+    "bind the texture and sample it in a shader";
+
+/// Binds a texture in both ways, and enables its target unless it is one of shaders only, as all
+/// are in a core context.
 template<class Kind>
 void ExpectActs(U const &unit, Kind const &texture, Operation bindDefault,
                 Operation enable = nullptr, Operation disable = nullptr,
@@ -27,6 +32,12 @@ void ExpectActs(U const &unit, Kind const &texture, Operation bindDefault,
     (unit.*bindDefault)();
     if (!enable)
         return;
+    if (IsCoreRun()) {
+        EXPECT_FAILURE(kFixedFunction, (unit.*isEnabled)());
+        EXPECT_FAILURE(kFixedFunction, (unit.*enable)());
+        EXPECT_FAILURE(kFixedFunction, (unit.*disable)());
+        return;
+    }
     EXPECT_FALSE((unit.*isEnabled)());
     (unit.*enable)();
     EXPECT_TRUE((unit.*isEnabled)() && ::glIsEnabled(texture.target()));
@@ -55,6 +66,7 @@ TEST_F(TextureUnitTest, ActsOnTheActiveUnit) {
                    &U::disable3D, &U::isEnabled3D);
         ExpectActs(unit, Texture2DArray(format, 4, 4, 4, false), &U::bind2DArrayDefault);
     }
+    EXPECT_FAILURE(IsCoreRun() ? kFixedFunction : "", U::Unit(0)->setEnv(U::ENVIRONMENT_ADD));
     EXPECT_FAILURE("GL_INVALID_ENUM", TextureState::SetActiveTextureUnit(1000));
     ExpectTranslation("Environment", TextureUnit::Environment2GL, TextureUnit::GL2Environment, 6,
                       GL_REPLACE);
@@ -71,15 +83,18 @@ TEST_F(TextureUnitTest, ScopeLeavesTheUnitEmptyAndTheOtherActive) {
     {
         Texture2DBindScope const scope(&plane, 0, true);
         EXPECT_EQ(0u, TextureState::ActiveTextureUnit());
-        EXPECT_TRUE(plane.isBound() && TextureUnit::Unit(0)->isEnabled2D());
-        GLint mode = 0;
-        ORU_GL(GetTexEnviv, GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE, &mode);
-        EXPECT_EQ(GL_REPLACE, mode);
+        EXPECT_TRUE(plane.isBound());
+        if (!IsCoreRun()) {
+            GLint mode = 0;
+            ORU_GL(GetTexEnviv, GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE, &mode);
+            EXPECT_EQ(GL_REPLACE, mode);
+            EXPECT_TRUE(TextureUnit::Unit(0)->isEnabled2D());
+        }
     }
     EXPECT_EQ(2u, TextureState::ActiveTextureUnit());
     TextureState::SetActiveTextureUnit(0);
     EXPECT_EQ(0u, plane.getBoundID());
-    EXPECT_FALSE(TextureUnit::Unit(0)->isEnabled2D());
+    EXPECT_TRUE(IsCoreRun() || !TextureUnit::Unit(0)->isEnabled2D());
     texture.bind();
     EXPECT_EQ((std::vector<GLint>{GL_NEAREST, GL_NEAREST, GL_CLAMP_TO_EDGE, GL_CLAMP_TO_EDGE}),
               Sampling(GL_TEXTURE_2D, 2));

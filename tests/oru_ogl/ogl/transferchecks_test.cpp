@@ -163,11 +163,35 @@ TEST_F(TransferChecksTest, UnpackStateIsCheckedAndSet) {
 
     struct Helpers : Texture2D {
         using Texture::PopPixelTransferModes;
+        using Texture::PushAndSetReadbackByteAlignment;
         using Texture::PushAndSetTransferByteAlignment;
     };
     EXPECT_FAILURE(kAlignment, Helpers::PushAndSetTransferByteAlignment(3));
     Helpers::PushAndSetTransferByteAlignment(8);
     EXPECT_EQ(8, Get(GL_UNPACK_ALIGNMENT));
+    Helpers::PushAndSetTransferByteAlignment(4);
+    Helpers::PushAndSetReadbackByteAlignment(1);
+    EXPECT_EQ((std::vector<GLint>{1, 4}), Get({GL_PACK_ALIGNMENT, GL_UNPACK_ALIGNMENT}));
     Helpers::PopPixelTransferModes();
+    EXPECT_EQ((std::vector<GLint>{4, 4}), Get({GL_PACK_ALIGNMENT, GL_UNPACK_ALIGNMENT}));
+    Helpers::PopPixelTransferModes();
+    EXPECT_EQ(8, Get(GL_UNPACK_ALIGNMENT));
+    Helpers::PopPixelTransferModes();
+    EXPECT_EQ(2, Get(GL_UNPACK_ALIGNMENT));
+    EXPECT_FAILURE(IsCoreRun() ? "No pixel storage of this context was saved: call a PushAndSet... "
+                                 "function before each PopPixelTransferModes"
+                               : "GL_STACK_UNDERFLOW",
+                   Helpers::PopPixelTransferModes());
+    auto const fill = [] {
+        for (int i = 0; i < 99; ++i)
+            Helpers::PushAndSetTransferByteAlignment(1);
+    };
+    EXPECT_FAILURE(IsCoreRun()
+                       ? "No room to save pixel storage: end each PushAndSetReadbackByteAlignment "
+                         "and PushAndSetTransferByteAlignment with a PopPixelTransferModes"
+                       : "GL_STACK_OVERFLOW",
+                   fill());
+    for (int i = 0; i < 16; ++i)
+        Helpers::PopPixelTransferModes();
     EXPECT_EQ(2, Get(GL_UNPACK_ALIGNMENT));
 }

@@ -168,4 +168,13 @@ TEST_F(VertexBufferTest, RefusesWhatItCannotDraw) {
     Build(other, "void main() { gl_Position = vec4(0); }", "void main() {}");
     EXPECT_FAILURE("f.resolvedSlot_ >= 0", buffer.setupWithProgram(&other));
     EXPECT_FAILURE("f.resolvedSlot_ >= 0", buffer.setupWithProgram(NameOf(other)));
+
+    // The three primitive types that core contexts lack; others are OpenGL's matter.
+    std::string const deprecated =
+        "Quadrilaterals and polygons need a compatibility context: in a core one draw triangles";
+    for (unsigned int type = 6; type <= 10; ++type) {
+        VertexBuffer shape({}, 0, static_cast<VertexBuffer::PrimitiveType>(type));
+        EXPECT_EQ(IsCoreRun() && type > 6 && type < 10,
+                  MessageOf([&] { shape.drawPrimitives(0); }) == deprecated);
+    }
 }

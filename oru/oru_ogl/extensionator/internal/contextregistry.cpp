@@ -47,6 +47,8 @@ void ContextRegistry::Insert(HGLRC context, ExtensionManager *record, FunctionTa
             continue;
         slot->record.store(record, std::memory_order_relaxed);
         slot->table.store(table, std::memory_order_relaxed);
+        slot->holders.store(0, std::memory_order_relaxed);
+        slot->profile.store(Profile::Unknown, std::memory_order_relaxed);
         slot->context.store(Key(context), std::memory_order_release);
         return;
     }
@@ -64,6 +66,29 @@ void ContextRegistry::Clear() {
     for (Slot &slot : sIndex_)
         slot.context.store(kFree, std::memory_order_release);
     TheMap().clear();
+}
+
+ContextRegistry::Profile ContextRegistry::FindProfile(HGLRC context) {
+    Slot const *slot = FindSlot(context);
+    return slot ? slot->profile.load(std::memory_order_relaxed) : Profile::Unknown;
+}
+
+void ContextRegistry::KeepProfile(HGLRC context, Profile profile) {
+    Slot *slot = FindSlot(context);
+    if (slot && slot->holders.load(std::memory_order_relaxed))
+        slot->profile.store(profile, std::memory_order_relaxed);
+}
+
+void ContextRegistry::Hold(HGLRC context) {
+    if (Slot *slot = FindSlot(context))
+        slot->holders.fetch_add(1, std::memory_order_relaxed);
+}
+
+void ContextRegistry::LetGo(HGLRC context) {
+    Slot *slot = FindSlot(context);
+    if (slot && slot->holders.load(std::memory_order_relaxed) &&
+        slot->holders.fetch_sub(1, std::memory_order_relaxed) == 1)
+        slot->profile.store(Profile::Unknown, std::memory_order_relaxed);
 }
 
 } // namespace ORU::OGL::internal

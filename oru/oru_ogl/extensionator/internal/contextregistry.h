@@ -15,13 +15,17 @@ struct FunctionTable;
 namespace internal {
 
 /// The process-wide map from rendering contexts to the records of their implementation, which it
-/// does not own. Any thread may look up, insert and erase at any time.
+/// does not own. Any thread may look up, insert and erase at any time. What a context itself is,
+/// not its implementation, stands beside the record, which contexts of different profiles share.
 ///
 /// A look-up stands before every OpenGL call beyond 1.1, so it must not write anything that threads
 /// share, which the concurrent map's element locks do. A small read-only index answers for the
 /// contexts in use; only what it does not hold goes to the map.
 class ContextRegistry {
 public:
+    /// What is known of a context: Core is one without what OpenGL 3 deprecated.
+    enum class Profile : unsigned char { Unknown, Compatibility, Core };
+
     /// The context's record, or null.
     static ExtensionManager *Find(HGLRC context);
 
@@ -44,6 +48,17 @@ public:
 
     static void Clear();
 
+    /// @name Profiles
+    /// Kept while a context of the library holds the rendering context, which it made or adopted.
+    /// The host does not say when it deletes another one, whose handle may then be that of a new
+    /// context with another profile.
+    /// @{
+    static Profile FindProfile(HGLRC context);
+    static void KeepProfile(HGLRC context, Profile profile);
+    static void Hold(HGLRC context);
+    static void LetGo(HGLRC context);
+    /// @}
+
 private:
     /// No context has this handle; null will not do, as a thread without a context asks for it.
     static std::uintptr_t const kFree = ~std::uintptr_t(0);
@@ -55,7 +70,10 @@ private:
         std::atomic<std::uintptr_t> context{kFree};
         std::atomic<FunctionTable const *> table{nullptr};
         std::atomic<ExtensionManager *> record{nullptr};
+        std::atomic<unsigned short> holders{0};
+        std::atomic<Profile> profile{Profile::Unknown};
     };
+    static_assert(sizeof(Slot) == 32, "Two places lie in each line of the cache.");
 
     static std::size_t const kSlotBits = 8;
     static std::size_t const kSlots = std::size_t(1) << kSlotBits;

@@ -78,6 +78,8 @@ bool HasGrey(Texture2D const &shown) {
 bool FiltersLinearly(Texture::InternalFormat format) {
     ScopedContextWrapper const restoreCurrent;
     ContextWrapped const wrapped;
+    // It draws by fixed functions, whatever the host wants of its own contexts.
+    ExtensionManager::ScopedInitOptions const anyContext{ExtensionManager::InitOptions()};
     ContextOffscreen const offscreen(&wrapped);
     offscreen.makeCurrent();
 

@@ -3,14 +3,25 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
+#include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 
 namespace ORU::OGL::internal {
+
+/// The record of the current context, null without one. A core context that the host made may have
+/// none yet, and the defaults for unknown contexts are not for it: its record is made.
+inline ExtensionManager const *RecordOfCurrent() {
+    ExtensionManager const *const record = ExtensionManager::Instance();
+    if (record || !IsCoreContext())
+        return record;
+    return ExtensionManager::InstanceGuaranteed(ORU_WGL0(GetCurrentContext));
+}
 
 /// Whether there is a current context and a test of its record holds:
 /// `CurrentRecord(&ExtensionManager::supportsTexture3D)`.
 template<class... Parameters>
 bool CurrentRecord(bool (ExtensionManager::*test)(Parameters...) const, Parameters... arguments) {
-    ExtensionManager const *const record = ExtensionManager::Instance();
+    ExtensionManager const *const record = RecordOfCurrent();
     return record && (record->*test)(arguments...);
 }
 

@@ -2,6 +2,11 @@
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 
 #include "oru/core/utility/composetext.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
+#include "oru/oru_ogl/extensionator/opengltokenname.h"
+#include "oru/oru_ogl/ogl/internal/textures/texturetables.h"
+
+#include <cstring>
 
 namespace ORU::OGL::internal {
 
@@ -38,6 +43,29 @@ void CheckUnpackBuffer(Buffer const *buffer, std::uint64_t offset) {
 void CheckByteAlignment(unsigned int bytes) {
     if (bytes != 1 && bytes != 2 && bytes != 4 && bytes != 8)
         ORU_THROW_INTERNAL("Invalid row byte alignment (must be of 1, 2, 4, or 8).");
+}
+
+void RequireFormat(Texture::InternalFormat format) {
+    auto const *const row = kInternalFormats.find(format);
+    // The formats of core contexts are those that begin with red.
+    bool const isDeprecated = row && row->name[std::strlen("INTERNALFORMAT_")] != 'R';
+    if (isDeprecated && IsCoreContext())
+        ORU_THROW_INTERNAL(ComposeText(row->name,
+                                       " needs a compatibility context: in a core one use "
+                                       "a format of red, or of red and green"));
+}
+
+PixelLayout LayoutOf(Texture::Format format, Texture::Type type) {
+    PixelLayout const layout = {Texture::Format2GL(format), Texture::Type2GL(type)};
+    bool const isDeprecated =
+        format == Texture::FORMAT_COLOR_INDEX || format == Texture::FORMAT_ALPHA ||
+        format == Texture::FORMAT_LUMINANCE || format == Texture::FORMAT_LUMINANCE_ALPHA ||
+        type == Texture::TYPE_BITMAP;
+    if (isDeprecated && IsCoreContext())
+        ORU_THROW_INTERNAL(ComposeText(
+            "Pixels of ", ORUOGLTokenName(layout.format), " and ", ORUOGLTokenName(layout.type),
+            " need a compatibility context: in a core one use FORMAT_RED or FORMAT_RG"));
+    return layout;
 }
 
 } // namespace ORU::OGL::internal

@@ -5,6 +5,7 @@
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
+#include "oru/oru_ogl/ogl/internal/textures/pixelstorage.h"
 #include "oru/oru_ogl/ogl/pixelunpackparameters.h"
 #include "oru/oru_ogl/ogl/texture.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -53,15 +54,14 @@ inline void *BufferOffset(std::uint64_t offset) {
     return reinterpret_cast<void *>(static_cast<std::uintptr_t>(offset));
 }
 
-/// Runs an upload with the unpack state that the parameters describe, and puts the state back. When
-/// the upload fails, the state stays as the upload had it, on the client attribute stack above what
-/// it was before: the caller looks at it, or drops it with glPopClientAttrib.
+/// Runs an upload with the unpack state that the parameters describe, and puts the state back, or
+/// after a failure what PixelStorageScope says.
 template<class Upload>
 void WithUnpackState(PixelUnpackParameters const &parameters, Upload upload) {
-    ORU_GL(PushClientAttrib, GL_CLIENT_PIXEL_STORE_BIT);
+    PixelStorageScope saved(kUnpackStorage);
     parameters.apply();
     upload();
-    ORU_GL0(PopClientAttrib);
+    saved.restore();
 }
 
 /// The part of the texture bound to a target that an upload writes.
@@ -78,13 +78,25 @@ struct Part {
 template<std::size_t Sides>
 using SendPart = void (*)(Part<Sides> const &part, GLenum format, GLenum type, void const *pixels);
 
+/// @throws InternalException in a core context for a format that it lacks
+void RequireFormat(Texture::InternalFormat format);
+
+/// A format and a type of pixels in memory, as OpenGL takes them.
+struct PixelLayout {
+    GLenum format;
+    GLenum type;
+};
+
+/// @throws InternalException for values outside the enumerations, and in a core context for those
+///         that it lacks
+PixelLayout LayoutOf(Texture::Format format, Texture::Type type);
+
 /// Uploads pixels from memory. Checks the formats only; `CheckPart` comes before it.
 template<std::size_t Sides>
 void Upload(SendPart<Sides> send, Part<Sides> const &part, Texture::Format format,
             Texture::Type type, void const *data, PixelUnpackParameters const &parameters) {
-    GLenum const glFormat = Texture::Format2GL(format);
-    GLenum const glType = Texture::Type2GL(type);
-    WithUnpackState(parameters, [&] { send(part, glFormat, glType, data); });
+    PixelLayout const layout = LayoutOf(format, type);
+    WithUnpackState(parameters, [&] { send(part, layout.format, layout.type, data); });
 }
 
 /// Uploads pixels from a buffer, which becomes a pixel unpack buffer; checks buffer and formats.
@@ -93,8 +105,7 @@ void Upload(SendPart<Sides> send, Part<Sides> const &part, Texture::Format forma
             Texture::Type type, Buffer *buffer, std::uint64_t offset,
             PixelUnpackParameters const &parameters) {
     CheckUnpackBuffer(buffer, offset);
-    GLenum const glFormat = Texture::Format2GL(format);
-    GLenum const glType = Texture::Type2GL(type);
+    PixelLayout const layout = LayoutOf(format, type);
     if (!buffer->isUnpackBuffer())
         buffer->convertToUnpackBuffer();
     // Hosts that record the calls know 1-D uploads to put the unpack state back first.
@@ -102,12 +113,23 @@ void Upload(SendPart<Sides> send, Part<Sides> const &part, Texture::Format forma
     std::optional<BoundObjectScope> bound;
     WithUnpackState(parameters, [&] {
         bound.emplace(*buffer, ORU_BINDER(BindBuffer));
-        send(part, glFormat, glType, BufferOffset(offset));
+        send(part, layout.format, layout.type, BufferOffset(offset));
         if (!kStateFirst)
             bound->restore();
     });
     if (kStateFirst)
         bound->restore();
+}
+
+/// Runs a download into rows of an alignment in bytes, which is checked, and puts the state back,
+/// or after a failure what PixelStorageScope says.
+template<class Download>
+void WithPackAlignment(unsigned int bytes, Download download) {
+    CheckByteAlignment(bytes);
+    PixelStorageScope saved(kPackAlignment);
+    ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, static_cast<GLint>(bytes));
+    download();
+    saved.restore();
 }
 
 /// Makes a buffer one that can be bound for `ReadInto`.

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "oru/core/utility/boundary.h"
+#include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/texture.h"
 
@@ -30,6 +31,14 @@ bool ArePowersOfTwo(Sizes... sizes) {
 inline Texture::WrapMode NewTextureClamp() {
     return CurrentRecord(&ExtensionManager::supportsClampToEdge) ? Texture::WRAPMODE_CLAMP_TO_EDGE
                                                                  : Texture::WRAPMODE_CLAMP;
+}
+
+/// @throws InternalException in a core context for a wrap mode that it lacks
+template<class... Modes>
+void RequireWrap(Modes... modes) {
+    if (((modes == Texture::WRAPMODE_CLAMP) || ...) && IsCoreContext())
+        ORU_THROW_INTERNAL("WRAPMODE_CLAMP needs a compatibility context: in a core one use "
+                           "WRAPMODE_CLAMP_TO_EDGE");
 }
 
 /// Calls `allocate(level, sides)` for level 0 and, with mipmaps, for all levels below it.
