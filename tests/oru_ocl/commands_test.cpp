@@ -42,20 +42,19 @@ TEST_F(ProgramTest, AFailedBuildLeavesALogAndAProgramToBuildAgain) {
     Program program(context, "kernel void f(global int *d) { d[0] = VALUE; }");
     EXPECT_EQ(Program::BUILD_STATUS_NONE, program.buildStatus(device));
     EXPECT_FAILURE("OCL Exception: CL_BUILD_PROGRAM_FAILURE", program.build(""));
+    void *const none = nullptr;
+    EXPECT_EQ(TextOf(program.id(), 1, device.id(), "null", none, none),
+              runtime()->arguments("clBuildProgram"));
     EXPECT_EQ(Program::BUILD_STATUS_ERROR, program.buildStatus(device));
     std::string const log = program.buildLog(device);
     EXPECT_NE(std::string::npos, log.find("VALUE")) << log;
     EXPECT_EQ(std::string::npos, log.find('\0'));
     auto const notify = [](cl_program, void *) {};
-    program.buildAsync({device}, "-D VALUE=5", {notify, &program});
-    EXPECT_EQ(TextOf(program.id(), 1, device.id(), "-D VALUE=5", AddressOf(notify), &program),
+    program.buildAsync({}, "-D VALUE=5", {notify, &program});
+    EXPECT_EQ(TextOf(program.id(), 0, "null", "-D VALUE=5", AddressOf(notify), &program),
               runtime()->arguments("clBuildProgram"));
     EXPECT_EQ(Program::BUILD_STATUS_SUCCESS, program.buildStatus(device));
     EXPECT_FAILURE("OCL Exception: CL_INVALID_KERNEL_NAME", program.kernel("g"));
-    void *const none = nullptr;
-    EXPECT_FAILURE("OCL Exception: CL_BUILD_PROGRAM_FAILURE", program.build({}, ""));
-    EXPECT_EQ(TextOf(program.id(), 0, "null", "null", none, none),
-              runtime()->arguments("clBuildProgram"));
 }
 
 TEST_F(ProgramTest, EveryKernelIsCreatedOnce) {

@@ -40,9 +40,14 @@ FunctionTable const &Functions() {
 }
 
 template<class Argument>
-constexpr bool IsHandle =
-    std::is_pointer_v<Argument> &&std::is_class_v<std::remove_pointer_t<Argument>> &&
-    !std::is_const_v<std::remove_pointer_t<Argument>>;
+constexpr bool IsHandle = false;
+template<class Object>
+constexpr bool IsHandle<Object *> = std::is_class_v<Object> && !std::is_const_v<Object>;
+
+/// Platforms and devices are not counted.
+template<class Argument>
+constexpr bool IsCounted = IsHandle<Argument> && !std::is_same_v<Argument, cl_platform_id> &&
+                           !std::is_same_v<Argument, cl_device_id>;
 
 /// The text of an argument as the call book wants it. `previous` is the number before it, which is
 /// the length of a list.
@@ -91,12 +96,6 @@ Result Failed([[maybe_unused]] cl_int code, [[maybe_unused]] Arguments... argume
         return nullptr;
     }
 }
-
-template<class Handle, class... Kinds>
-constexpr bool IsOneOf = (std::is_same_v<Handle, Kinds> || ...);
-template<class Handle>
-constexpr bool IsCounted = IsOneOf<Handle, cl_context, cl_command_queue, cl_mem, cl_sampler,
-                                   cl_program, cl_kernel, cl_event>;
 
 /// Notes the references that an argument of a successful call brought: `change` to a handle, one to
 /// a received event, one to each received kernel.
