@@ -151,8 +151,7 @@ TEST(ContextRegistry, FindsMoreContextsThanItsIndexHolds) {
     ExtensionManager *const record = ExtensionManager::Instance(&real);
     std::vector<std::unique_ptr<Exposed<Context>>> contexts;
     for (std::uintptr_t i = 1; i <= 400; ++i) {
-        contexts.push_back(
-            std::make_unique<Exposed<Context>>(reinterpret_cast<HGLRC>(i << 16)));
+        contexts.push_back(std::make_unique<Exposed<Context>>(reinterpret_cast<HGLRC>(i << 16)));
         contexts.back()->setDisplayDeviceKey(real.displayDeviceKey());
         ExtensionManager::RegisterContext(*contexts.back());
     }
