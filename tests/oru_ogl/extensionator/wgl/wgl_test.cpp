@@ -1,43 +1,53 @@
 // The WGL chain and the WGL extension pointers.
+#include "tests/support/contexts.h"
 #include "tests/support/failure.h"
 #include "tests/support/glfixture.h"
-#include "tests/support/testwindow.h"
+#include "tests/support/tablerows.h"
 
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/extensionator/wgl/wglforwarder.h"
-#include "oru/oru_ogl/ogl/contextwindowed_win.h"
 
 #include <set>
+#include <string>
 #include <utility>
 #include <vector>
 
 using namespace ORU::OGL;
-using oru_test::MessageOf;
+using namespace oru_test;
 
 namespace {
 
-/// Answers for its life as if entry points were missing, and notes what is asked for from where.
+/// Answers as if entry points were missing, and notes what is asked for from where.
 class Withholder : public WGLForwarder {
 public:
-    explicit Withholder(std::set<std::string> names) : names_(std::move(names)) {
-        WGLInterceptor::Instance()->addInterceptor(this);
-    }
-    ~Withholder() override { WGLInterceptor::Instance()->popInterceptor(); }
+    explicit Withholder(std::set<std::string> names = {}) : names_(std::move(names)) {}
 
     PROC wcgmGetProcAddress(char const *file, unsigned int line, char const *name) override {
-        asked_.emplace_back(name, line);
+        asked.push_back(name + (':' + std::to_string(line)));
         return names_.count(name) ? nullptr : WGLForwarder::wcgmGetProcAddress(file, line, name);
     }
-    std::vector<std::pair<std::string, unsigned int>> asked_;
+    std::vector<std::string> asked;
 
 private:
     std::set<std::string> names_;
 };
 
+/// Notes the calls whose parameters do not tell them apart.
+class Letters : public WGLForwarder {
+public:
+    BOOL wcgmUseFontBitmapsA(char const *, unsigned int, HDC, DWORD, DWORD, DWORD) override {
+        return asked += 'A', TRUE;
+    }
+    BOOL wcgmUseFontBitmapsW(char const *, unsigned int, HDC, DWORD, DWORD, DWORD) override {
+        return asked += 'W', TRUE;
+    }
+    std::string asked;
+};
+
 } // namespace
 
-class WGLTest : public oru_test::OffscreenTest {};
+class WGLTest : public OffscreenTest {};
 
 TEST_F(WGLTest, ForwardsToThePlatform) {
     EXPECT_EQ(nullptr, WGLInterceptor::Instance()->popInterceptor()) << "the checker stays";
@@ -45,46 +55,41 @@ TEST_F(WGLTest, ForwardsToThePlatform) {
     EXPECT_EQ(::wglGetProcAddress("wglSwapIntervalEXT"),
               ORU_WGL(GetProcAddress, "wglSwapIntervalEXT"));
     EXPECT_FALSE(ORU_WGL(DeleteContext, nullptr)) << "failures come back as they are";
+    Pushed<Letters> letters;
     WGLForwarder decorator;
     WGLInterceptor::Instance()->addInterceptor(&decorator);
-    EXPECT_EQ("Enforce dynamic_cast<WGLErrorChecker*>(sInterceptor_) != NULL",
-              MessageOf([] { WGLInterceptor::Destroy(); }));
+    EXPECT_FAILURE("Enforce dynamic_cast<WGLErrorChecker*>(sInterceptor_) != NULL",
+                   WGLInterceptor::Destroy());
+    ORU_WGL(UseFontBitmapsA, nullptr, 0u, 0u, 0u);
+    ORU_WGL(UseFontBitmapsW, nullptr, 0u, 0u, 0u);
+    EXPECT_EQ("AW", letters->asked);
     EXPECT_EQ(&decorator, ExtensionManager::Instance()->popWGLInterceptor());
 }
 
 TEST_F(WGLTest, LoadsEachExtension) {
-    Withholder const none({});
+    Pushed<Withholder> none;
     for (unsigned int value = 0; value <= UNKNOWN_OPENGL_EXTENSION; ++value)
         EXPECT_EQ(value >= 102 && value <= 112,
                   InitializeWGLExtension(static_cast<OpenGLExtension>(value)))
             << value;
-    std::vector<std::pair<std::string, unsigned int>> const expected = {
-        {"wglCreateContextAttribsARB", 80},
-        {"wglGetExtensionsStringARB", 114},
-        {"wglCreatePbufferARB", 152},
-        {"wglDestroyPbufferARB", 153},
-        {"wglGetPbufferDCARB", 154},
-        {"wglQueryPbufferARB", 155},
-        {"wglReleasePbufferDCARB", 156},
-        {"wglChoosePixelFormatARB", 176},
-        {"wglGetPixelFormatAttribfvARB", 177},
-        {"wglGetPixelFormatAttribivARB", 178},
-        {"wglBindTexImageARB", 214},
-        {"wglReleaseTexImageARB", 215},
-        {"wglSetPbufferAttribARB", 216},
-        {"wglGetSwapIntervalEXT", 235},
-        {"wglSwapIntervalEXT", 236}};
-    EXPECT_EQ(expected, none.asked_);
-    EXPECT_EQ(::wglGetProcAddress("wglQueryPbufferARB"),
-              reinterpret_cast<PROC>(reinterpret_cast<void *>(_wcgmQueryPbufferARB)));
+    std::vector<std::string> expected;
+    for (auto const &row : TableRows(ORU_WGL_ENTRY_POINTS))
+        expected.push_back(row[0] + ':' + row[2]);
+    EXPECT_EQ(15u, expected.size());
+    EXPECT_EQ(expected, none->asked);
+#define ORU_WGL_POINTER(Result, Pointer, Parameters)                                               \
+    EXPECT_EQ(::wglGetProcAddress(("wgl" + std::string(#Pointer).substr(5)).c_str()),              \
+              reinterpret_cast<PROC>(reinterpret_cast<void *>(Pointer)));
+#include "oru/oru_ogl/extensionator/wgl/extensionswgl_pointers.inc"
 }
 
 // What a driver lacks an entry point of is not supported; what it has of it is there all the same.
 TEST(WGLRecord, LacksAnExtensionWithoutItsEntryPoint) {
     AutoInitializer const library;
     _wcgmSwapIntervalEXT = nullptr;
-    Withholder const without({"wglGetSwapIntervalEXT", "wglBindTexImageARB"});
-    ContextOffscreen context;
+    Pushed<Withholder> const without(
+        std::set<std::string>{"wglGetSwapIntervalEXT", "wglBindTexImageARB"});
+    ContextOffscreen const context;
     context.makeCurrent();
     ExtensionManager &record = *ExtensionManager::Instance();
     EXPECT_FALSE(record.isSupported(WGL_EXT_SWAP_CONTROL));
@@ -94,13 +99,11 @@ TEST(WGLRecord, LacksAnExtensionWithoutItsEntryPoint) {
     EXPECT_FALSE(Context::SupportsVerticalRetraceControl());
     EXPECT_FALSE(record.supportsRenderToTexture());
     ASSERT_TRUE(record.supportsFloatingPointTextures() && record.isSupported(GL_EXT_GPU_SHADER4));
-    oru_test::Pushed<oru_test::CountingForwarder> calls;
-    EXPECT_FALSE(record.supportsFloatFiltering());
-    EXPECT_FALSE(record.supportsHalfFiltering());
+    Pushed<CountingForwarder> calls;
+    EXPECT_FALSE(record.supportsFloatFiltering() || record.supportsHalfFiltering());
     EXPECT_EQ(0, calls->total());
-    oru_test::TestWindow const window;
-    ContextWindowed windowed(window.hwnd(), BufferFormat(BufferFormat::FORMAT_RGBA8),
-                             Context::BUFFERING_DOUBLE, Context::MULTISAMPLING_NONE, &context);
-    EXPECT_EQ("ContextWindowed::enableSyncToVerticalRetrace unsupported feature",
-              MessageOf([&] { windowed.enableSyncToVerticalRetrace(true); }));
+    TestWindow const window;
+    ContextWindowed windowed = Windowed(window, &context);
+    EXPECT_FAILURE("ContextWindowed::enableSyncToVerticalRetrace unsupported feature",
+                   windowed.enableSyncToVerticalRetrace(true));
 }
