@@ -10,7 +10,7 @@ SOURCE = "catalogue/gl_entry_points.tsv and gl_extensions.tsv by emit_gl.py"
 HAND_CHECKED = {"glBegin", "glEnd", "glGetError"}
 
 # Names that the generated bodies use themselves; a parameter of that name would hide them.
-RESERVED_NAMES = {"file", "line", "insideBeginEnd_", "value_"}
+RESERVED_NAMES = {"file", "line", "insideBeginEnd_", "function_", "value_"}
 
 
 def emit(folder, writer):
@@ -222,14 +222,22 @@ def error_checker(entries):
     for entry in entries:
         if entry.name in HAND_CHECKED:
             continue
-        target = f"::{entry.name}" if entry.is_core else f"ExtensionManager::CurrentTable().{entry.name}"
-        call = f"{target}({entry.arguments})"
+        lines = []
+        function = f"::{entry.name}"
+        if not entry.is_core:
+            function = "function_"
+            lines = [f"auto const function_ = ExtensionManager::CurrentTable().{entry.name};",
+                     "if (!function_)",
+                     f'    ThrowMissingFunction(file, line, "{entry.name}", "{entry.group}");']
+        call = f"{function}({entry.arguments})"
+        check = f'CheckOpenGLError(insideBeginEnd_, file, line, "{entry.name}");'
         if entry.result == "void":
-            lines = f"    {call};\n    CheckOpenGLError(insideBeginEnd_, file, line);"
+            lines += [f"{call};", check]
         else:
-            lines = f"    {entry.result} const value_ = {call};\n    CheckOpenGLError(insideBeginEnd_, file, line);\n    return value_;"
+            lines += [f"{entry.result} const value_ = {call};", check, "return value_;"]
+        body = "\n".join(f"    {text}" for text in lines)
         bodies.append(f"{entry.result} OpenGLErrorChecker::{entry.operation}({entry.full_declarations}) {{\n"
-                      f"{lines}\n}}")
+                      f"{body}\n}}")
     return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/internal/openglerrorcheck.h"
 

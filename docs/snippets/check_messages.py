@@ -12,9 +12,9 @@ import re
 import sys
 
 CHECKS = {"ORU_ASSERT": "", "ORU_ENFORCE": "Enforce ", "ORU_ASSERT_SUCCEEDED": "", "ORU_ASSERT_TEXT": "",
-          "ORU_ENFORCE_TEXT": "Enforce ", "ORU_THROW_INTERNAL": "", "ORU_TRANSLATION_FAILURE": "",
+          "ORU_ENFORCE_TEXT": "Enforce ", "ORU_ASSERT_NOTED": "", "ORU_THROW_INTERNAL": "", "ORU_TRANSLATION_FAILURE": "",
           "ORU_ENUM_FAILURE": "", "ThrowInternal": ""}
-TEXT_AT = {"ORU_ASSERT_TEXT": 0, "ORU_ENFORCE_TEXT": 0, "ThrowInternal": 2}  # the argument that is the text
+TEXT_AT = {"ORU_ASSERT_TEXT": 0, "ORU_ASSERT_NOTED": 0, "ORU_ENFORCE_TEXT": 0, "ThrowInternal": 2}  # the argument that is the text
 CALL = re.compile(r"(?<!define )\b(" + "|".join(CHECKS) + r")\(")
 LITERAL = re.compile(r'"((?:[^"\\]|\\.)*)"')
 

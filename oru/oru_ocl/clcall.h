@@ -21,6 +21,10 @@ inline FunctionTable const &Table() {
 /// Throws `ExceptionOCL` with an empty message.
 [[noreturn]] ORU_API ORU_COLD void ThrowOCL(char const *file, unsigned int line, cl_int code);
 
+/// The same with a note that names the function, and the code where `ErrorToCString` does not.
+[[noreturn]] ORU_API ORU_COLD void ThrowOCL(char const *file, unsigned int line, cl_int code,
+                                            char const *function);
+
 /// Whether an entry point reports its error through a last argument instead of its result.
 template<class Result, class... Parameters>
 constexpr bool kReportsByArgument =
@@ -37,6 +41,7 @@ struct CheckedCall<Result(CL_API_CALL *)(Parameters...), std::index_sequence<Ind
     Result(CL_API_CALL *function)(Parameters...);
     char const *file;
     unsigned int line;
+    char const *name;
 
     /// Calls the entry point; without its last argument and for its result when that argument
     /// reports the error, for nothing when the result is the error.
@@ -44,28 +49,29 @@ struct CheckedCall<Result(CL_API_CALL *)(Parameters...), std::index_sequence<Ind
         if constexpr (sizeof...(Indices) < sizeof...(Parameters)) {
             cl_int error = CL_SUCCESS;
             Result const result = function(arguments..., &error);
-            Check(file, line, error);
+            Check(file, line, error, name);
             return result;
         } else {
-            Check(file, line, function(arguments...));
+            Check(file, line, function(arguments...), name);
         }
     }
 
 private:
     /// Static, so that nothing needs the object in memory: the place stays in the throwing branch.
-    static void Check(char const *file, unsigned int line, cl_int error) {
+    static void Check(char const *file, unsigned int line, cl_int error, char const *name) {
         if (error != CL_SUCCESS)
-            ThrowOCL(file, line, error);
+            ThrowOCL(file, line, error, name);
     }
 };
 
 /// The call of an entry point, for `ORU_CL`.
 template<class Result, class... Parameters>
 auto MakeCheckedCall(Result(CL_API_CALL *function)(Parameters...), char const *file,
-                     unsigned int line) {
+                     unsigned int line, char const *name) {
     constexpr std::size_t kCount =
         sizeof...(Parameters) - (kReportsByArgument<Result, Parameters...> ? 1 : 0);
-    return CheckedCall<decltype(function), std::make_index_sequence<kCount>>{function, file, line};
+    return CheckedCall<decltype(function), std::make_index_sequence<kCount>>{function, file, line,
+                                                                             name};
 }
 
 } // namespace ORU::OCL
@@ -73,6 +79,7 @@ auto MakeCheckedCall(Result(CL_API_CALL *function)(Parameters...), char const *f
 /// `ORU_CL(CreateBuffer, context, flags, size, host)` calls clCreateBuffer of the function table,
 /// which must have it: the entry points of OpenCL 1.0 always, others where `table()` shows them.
 /// Throws InternalException "table_ != 0" before the call, ExceptionOCL with this source position
-/// when it fails.
+/// and a note of the function when it fails.
 #define ORU_CL(Name, ...)                                                                          \
-    ::ORU::OCL::MakeCheckedCall(::ORU::OCL::Table().cl##Name, __FILE__, __LINE__)(__VA_ARGS__)
+    ::ORU::OCL::MakeCheckedCall(::ORU::OCL::Table().cl##Name, __FILE__, __LINE__,                  \
+                                "cl" #Name)(__VA_ARGS__)

@@ -18,8 +18,9 @@ void Device::getInfoImpl(Enum::DeviceProperty property, std::size_t size, void *
 }
 
 std::string Device::getStringInfo(Enum::DeviceProperty property) const {
-    ORU_ASSERT_TEXT("GetPropertyTypeName(property) == Enum::GetTypeName<char*>()",
-                    Enum::GetPropertyTypeName(property) == Enum::GetTypeName<char *>());
+    ORU_ASSERT_NOTED("GetPropertyTypeName(property) == Enum::GetTypeName<char*>()",
+                     Enum::DescribeTypes(property, Enum::GetTypeName<char *>()),
+                     Enum::GetPropertyTypeName(property) == Enum::GetTypeName<char *>());
     std::string text =
         QueryCharacters([&](std::size_t bytes, void *value, std::size_t *bytesReturned) {
             getInfoImpl(property, bytes, value, bytesReturned);

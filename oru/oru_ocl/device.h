@@ -56,8 +56,9 @@ public:
         if constexpr (std::is_same_v<T, std::string>) {
             return getStringInfo(property);
         } else {
-            ORU_ASSERT_TEXT("property_typename == type_name",
-                            Enum::GetPropertyTypeName(property) == Enum::GetTypeName<T>());
+            ORU_ASSERT_NOTED("property_typename == type_name",
+                             Enum::DescribeTypes(property, Enum::GetTypeName<T>()),
+                             Enum::GetPropertyTypeName(property) == Enum::GetTypeName<T>());
             T value;
             getInfoImpl(property, sizeof(T), &value, nullptr);
             return value;

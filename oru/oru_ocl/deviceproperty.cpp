@@ -2,6 +2,7 @@
 #include "oru/oru_ocl/deviceproperty.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/composetext.h"
 #include "oru/oru_ocl/internal/devicepropertytable.h"
 #include "oru/oru_ocl/range.h"
 
@@ -51,6 +52,19 @@ void FillDevicePropertyTable() {
 
 std::string const &Enum::GetPropertyTypeName(DeviceProperty property) {
     return SlotOf(property).type;
+}
+
+std::string Enum::DescribeTypes(DeviceProperty property, std::string const &read) {
+    auto const readable = [](std::string const &type) -> std::string {
+        return type == GetTypeName<char *>()          ? "std::string"
+               : type == GetTypeName<unsigned int>()  ? "unsigned int"
+               : type == GetTypeName<std::uint64_t>() ? "std::uint64_t"
+               : type == GetTypeName<Range<3>>()      ? "Range<3>"
+               : type.empty()                         ? "unknown"
+                                                      : type;
+    };
+    return ComposeText("read as ", readable(read), ", but property ", property, " is ",
+                       readable(GetPropertyTypeName(property)));
 }
 
 } // namespace ORU::OCL

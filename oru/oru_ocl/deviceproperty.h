@@ -28,4 +28,8 @@ inline std::string const &GetTypeName<cl_platform_id>() {
 /// @throws InternalException "property_index < table_size" for a value that is no property
 ORU_API std::string const &GetPropertyTypeName(DeviceProperty property);
 
+/// What a failed read of `property` says about the type that it has and the one it was read as.
+/// @param read the `GetTypeName` of the latter
+ORU_API std::string DescribeTypes(DeviceProperty property, std::string const &read);
+
 } // namespace ORU::OCL::Enum

@@ -18,9 +18,14 @@ public:
     /// of local memory.
     /// @param index argument number from 0
     /// @param size bytes
-    /// @throws ExceptionOCL when the runtime refuses
+    /// @throws ExceptionOCL when the runtime refuses, with a note of kernel, argument and size
     void setArg(unsigned int index, void const *value, std::size_t size) {
-        ORU_CL(SetKernelArg, id(), index, size, value);
+        try {
+            ORU_CL(SetKernelArg, id(), index, size, value);
+        } catch (LogicalException &failure) {
+            noteArgument(failure, index, size);
+            throw;
+        }
     }
 
     /// Sets an argument to a memory object or a sampler, or to a plain value: a TVec2 or TVec4 of
@@ -46,6 +51,10 @@ private:
     template<class T>
     struct IsWrapper<T, std::void_t<decltype(std::declval<T const &>().handle())>>
         : std::true_type {};
+
+    /// Notes which argument of which kernel was set.
+    ORU_COLD void noteArgument(LogicalException &failure, unsigned int index,
+                               std::size_t size) const;
 
     /// Takes over the caller's reference.
     explicit Kernel(cl_kernel kernel) : OpenCLObjectWrapper(kernel) {}

@@ -2,6 +2,7 @@
 #include "oru/oru_ocl/ocllibrary.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/core/utility/composetext.h"
 #include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ocl/extensionmanagerocl.h"
 #include "oru/oru_ocl/internal/devicepropertytable.h"
@@ -34,20 +35,33 @@ std::wstring SystemDirectory() {
     }
 }
 
-/// The runtime in the directory `path`, or in the system directory for an empty one; null when it
-/// does not load.
-HMODULE LoadRuntime(std::string const &path) {
+/// The file of the runtime in the directory `path`, or in the system directory for an empty one;
+/// empty when Windows does not tell that.
+std::wstring RuntimeFile(std::string const &path) {
     std::wstring file;
     if (path.empty()) {
         file = SystemDirectory();
         if (file.empty())
-            return nullptr;
+            return file;
         file += L'\\';
     }
     for (char const c : path)
         file += static_cast<wchar_t>(static_cast<signed char>(c));
-    file += L"OpenCL.dll";
-    return LoadLibraryW(file.c_str());
+    return file + L"OpenCL.dll";
+}
+
+/// Null when it does not load.
+HMODULE LoadRuntime(std::wstring const &file) {
+    return file.empty() ? nullptr : LoadLibraryW(file.c_str());
+}
+
+/// What a host should know of a runtime that does not load.
+std::string WhyNoRuntime(std::wstring const &file, DWORD error) {
+    std::string shown;
+    for (wchar_t const c : file)
+        shown += c < 0x80 ? static_cast<char>(c) : '?';
+    return ComposeText("no OpenCL runtime at ", shown, " (Windows error ", error,
+                       "): install a driver with OpenCL, or name the folder that holds it");
 }
 
 /// Takes over the reference to `module`, giving up the one held before.
@@ -85,8 +99,9 @@ void Library::InitializeIfNecessary() {
 
 void Library::InitializeLocked() {
     ORU_ASSERT(!bInitialized_);
-    HMODULE const runtime = LoadRuntime(libraryPath_);
-    ORU_ASSERT_TEXT("openCLLibraryHandle", runtime);
+    std::wstring const file = RuntimeFile(libraryPath_);
+    HMODULE const runtime = LoadRuntime(file);
+    ORU_ASSERT_NOTED("openCLLibraryHandle", WhyNoRuntime(file, GetLastError()), runtime);
     ExtensionManager const *const leftOver = ExtensionManager::instance();
     try {
         ExtensionManager::create(runtime);
@@ -117,7 +132,7 @@ bool Library::IsOpenCLAvailable(std::string const &path) {
         // A static whose initialiser throws is initialised again by the next call.
         static bool const kAvailable = [&] {
             std::string copy = path;
-            HMODULE const module = LoadRuntime(path);
+            HMODULE const module = LoadRuntime(RuntimeFile(path));
             {
                 std::lock_guard const lock(gMutex);
                 libraryPath_.swap(copy);

@@ -22,6 +22,10 @@ namespace ORU_private {
 [[noreturn]] ORU_API ORU_COLD void ThrowInternal(char const *file, int line,
                                                  std::string const &message);
 
+/// The same with a note.
+[[noreturn]] ORU_API ORU_COLD void
+ThrowInternalNoted(char const *file, int line, std::string const &message, std::string const &note);
+
 } // namespace ORU_private
 
 /// Throws `InternalException` with the expression's source text when the expression is false; with
@@ -38,6 +42,11 @@ namespace ORU_private {
 /// that the code would no longer spell so. `text` is a literal.
 #define ORU_ASSERT_TEXT(text, ...)                                                                 \
     ((__VA_ARGS__) ? void(0) : ::ORU_private::ThrowInternal(__FILE__, __LINE__, text))
+
+/// As `ORU_ASSERT_TEXT`, with a note (see `LogicalException::note`); both are composed only when it
+/// fails.
+#define ORU_ASSERT_NOTED(text, note, ...)                                                          \
+    ((__VA_ARGS__) ? void(0) : ::ORU_private::ThrowInternalNoted(__FILE__, __LINE__, text, note))
 
 /// As `ORU_ENFORCE`, with the given text behind "Enforce ".
 #define ORU_ENFORCE_TEXT(text, ...) ORU_ASSERT_TEXT("Enforce " text, __VA_ARGS__)

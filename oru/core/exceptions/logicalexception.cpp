@@ -21,7 +21,20 @@ ExceptionBase *LogicalException::clone() const {
 
 void LogicalException::write(std::ostream &os) const {
     // to_string, not the stream's number format: a caller's std::hex must not change the line.
-    os << what() << ' ' << file_ << ':' << std::to_string(line_) << " (" << message_ << ')';
+    os << what() << ' ' << file_ << ':' << std::to_string(line_) << " (" << message() << ')';
+    if (*note())
+        os << ' ' << note();
+}
+
+char const *LogicalException::note() const {
+    auto const end = message_.find('\0');
+    return end == std::string::npos ? "" : message_.c_str() + end + 1;
+}
+
+void LogicalException::addNote(std::string const &note) {
+    if (note.empty())
+        return;
+    message_ += (*this->note() ? ", " : std::string(1, '\0')) + note;
 }
 
 void LogicalException::initialize(char const *file, int line, char const *message) {

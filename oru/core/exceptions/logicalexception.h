@@ -34,9 +34,18 @@ public:
     /// What failed, valid as long as the object lives.
     char const *message() const { return message_.c_str(); }
 
+    /// What a reader would like to know besides: which OpenGL function failed, what would help,
+    /// which call of the host's led there. Notes are separated by commas; empty when there is none.
+    char const *note() const;
+
+    /// Adds a note, nothing for an empty one, as a host does for the place of its own call (see
+    /// calledfrom.h).
+    /// @throws std::bad_alloc when memory is exhausted
+    void addNote(std::string const &note);
+
     ExceptionBase *clone() const override;
 
-    /// Writes "what file:line (message)".
+    /// Writes "what file:line (message)", and behind it a blank and the notes, if there are any.
     void write(std::ostream &os) const override;
 
 private:
@@ -44,6 +53,7 @@ private:
 
     std::string file_;
     int line_ = 0;
+    // The message, then, if there are notes, a zero and the notes: hosts know an exception's size.
     std::string message_;
 };
 

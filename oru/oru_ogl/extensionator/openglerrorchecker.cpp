@@ -1,6 +1,7 @@
 // The last link of the OpenGL chain: makes the real calls and checks them.
 #include "oru/oru_ogl/extensionator/openglerrorchecker.h"
 
+#include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/exceptionogl.h"
 #include "oru/oru_ogl/extensionator/internal/openglerrorcheck.h"
 
@@ -29,9 +30,33 @@ unsigned char const *OpenGLErrorChecker::GetOpenGLErrorString(unsigned int error
 #undef ORU_ERROR_NAME
 }
 
-void ThrowOpenGLError(char const *file, unsigned int line, unsigned int error) {
+namespace {
+
+char const kWithoutContext[] =
+    "without a current OpenGL context: make one current in this thread (Context::makeCurrent)";
+
+} // namespace
+
+void ThrowOpenGLError(char const *file, unsigned int line, unsigned int error,
+                      char const *function) {
     auto const *name = OpenGLErrorChecker::GetOpenGLErrorString(error);
-    throw ExceptionOGL(file, line, reinterpret_cast<char const *>(name), error);
+    ExceptionOGL failure(file, line, reinterpret_cast<char const *>(name), error);
+    failure.addNote(ComposeText("in ", function));
+    if (!::wglGetCurrentContext())
+        failure.addNote(kWithoutContext);
+    throw failure;
+}
+
+void ThrowMissingFunction(char const *file, unsigned int line, char const *function,
+                          char const *group) {
+    auto const *version = reinterpret_cast<char const *>(::glGetString(GL_VERSION));
+    std::string const message =
+        ::wglGetCurrentContext()
+            ? ComposeText(function, " is not in this driver (OpenGL ",
+                          version ? version : "unknown", "), which would need ", group,
+                          ": ask ExtensionManager::isSupported, or update the driver")
+            : ComposeText(function, " was called ", kWithoutContext);
+    throw ExceptionOGL(file, line, message.c_str(), 0);
 }
 
 void OpenGLErrorChecker::cgmBegin(char const *file, unsigned int line, GLenum mode) {
@@ -46,13 +71,13 @@ void OpenGLErrorChecker::cgmEnd(char const *file, unsigned int line) {
         throw ExceptionOGL(file, line, "Unbalanced glEnd()!", 0);
     insideBeginEnd_.store(false, std::memory_order_relaxed);
     ::glEnd();
-    CheckOpenGLError(insideBeginEnd_, file, line);
+    CheckOpenGLError(insideBeginEnd_, file, line, "glEnd");
 }
 
 GLenum OpenGLErrorChecker::cgmGetError(char const *file, unsigned int line) {
     // The check asks again: it reports a second pending error, the first is the caller's result.
     GLenum const error = ::glGetError();
-    CheckOpenGLError(insideBeginEnd_, file, line);
+    CheckOpenGLError(insideBeginEnd_, file, line, "glGetError");
     return error;
 }
 

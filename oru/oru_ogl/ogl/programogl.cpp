@@ -91,6 +91,10 @@ void Program::getInfoLog(int maxLength, char *buffer) {
     body().getInfoLog(maxLength, buffer);
 }
 
+std::string Program::compileLogs() const {
+    return body().compileLogs();
+}
+
 void Program::setAttributeLocation(unsigned int index, char const *name) {
     body().setAttributeLocation(index, name);
 }

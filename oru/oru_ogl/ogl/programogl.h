@@ -4,6 +4,8 @@
 #include "oru/core/utility/export.h"
 #include "oru/core/utility/scopedptr.h"
 
+#include <string>
+
 namespace ORU::OGL {
 
 class ProgramImpl;
@@ -53,7 +55,7 @@ public:
     void detachAllFragmentShaders();
 
     /// Makes a shader from a source, compiles and attaches it. A failed compilation shows when the
-    /// program is linked.
+    /// program is linked, and in `compileLogs`.
     /// @param count, strings, lengths as Shader::load
     void loadVertexShader(unsigned int count, char const *const *strings, int const *lengths);
     void loadFragmentShader(unsigned int count, char const *const *strings, int const *lengths);
@@ -64,7 +66,8 @@ public:
 
     /// @param throwOnFailure whether a failed link throws rather than waits to be asked for; then a
     ///        driver's note that the program will "run in software" throws too
-    /// @throws InternalException whose message holds the linker's log
+    /// @throws InternalException whose message holds the linker's log, and whose note what
+    ///         `compileLogs` says
     /// @note glLinkProgram
     void link(bool throwOnFailure);
 
@@ -96,6 +99,10 @@ public:
     /// @param buffer receives the log, cut to fit, and a final zero
     /// @note glGetProgramInfoLog
     void getInfoLog(int maxLength, char *buffer);
+
+    /// What the compiler says of each attached shader that does not compile; empty when all do.
+    /// @note glGetAttachedShaders, glGetShaderiv, glGetShaderInfoLog
+    std::string compileLogs() const;
     /// @}
 
     /// @name Attributes

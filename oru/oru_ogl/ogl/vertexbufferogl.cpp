@@ -123,11 +123,17 @@ void VertexBuffer::deleteDeviceSideResources() {
     vertexBuffer_ = 0;
 }
 
+void VertexBuffer::requireFound(Field const &field) {
+    ORU_ASSERT_NOTED("f.resolvedSlot_ >= 0",
+                     "the program has no active attribute \"" + field.name_ + '"',
+                     field.resolvedSlot_ >= 0);
+}
+
 void VertexBuffer::setupWithProgram(unsigned int programID) {
     setup();
     for (Field &field : fields_) {
         field.resolvedSlot_ = ORU_GL(GetAttribLocation, programID, field.name_.c_str());
-        ORU_ASSERT_TEXT("f.resolvedSlot_ >= 0", field.resolvedSlot_ >= 0);
+        requireFound(field);
     }
 }
 
@@ -140,7 +146,7 @@ void VertexBuffer::useWithProgram(Program *program) {
     ORU_ENFORCE_TEXT("oglProgram != NULL", program);
     for (Field &field : fields_) {
         field.resolvedSlot_ = program->getAttributeLocation(field.name_.c_str());
-        ORU_ASSERT_TEXT("f.resolvedSlot_ >= 0", field.resolvedSlot_ >= 0);
+        requireFound(field);
     }
 }
 

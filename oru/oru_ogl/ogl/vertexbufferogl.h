@@ -150,6 +150,9 @@ private:
     void setup() { prepareDeviceSideResources(); }
     void useWithProgram(Program *program);
     unsigned int fieldIndex(std::string const &name) const;
+
+    /// Fails for a field that the program does not use.
+    static void requireFound(Field const &field);
     void prepareHostSideResources();
     void prepareDeviceSideResources();
     void deleteDeviceSideResources();

@@ -9,18 +9,23 @@
 
 namespace ORU::OGL {
 
-/// Throws the ExceptionOGL of a GL error value.
-[[noreturn]] ORU_COLD void ThrowOpenGLError(char const *file, unsigned int line,
-                                            unsigned int error);
+/// Throws the ExceptionOGL of a GL error value, with a note that names the function.
+[[noreturn]] ORU_COLD void ThrowOpenGLError(char const *file, unsigned int line, unsigned int error,
+                                            char const *function);
 
-/// Throws when the call before left an error; asks nothing inside glBegin and glEnd, where OpenGL
-/// allows no query.
+/// Throws for a function that the table of the calling thread lacks.
+/// @param group the capability that the function comes with
+[[noreturn]] ORU_COLD void ThrowMissingFunction(char const *file, unsigned int line,
+                                                char const *function, char const *group);
+
+/// Throws when the call of `function` before left an error; asks nothing inside glBegin and glEnd,
+/// where OpenGL allows no query.
 inline void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const *file,
-                             unsigned int line) {
+                             unsigned int line, char const *function) {
     if (insideBeginEnd.load(std::memory_order_relaxed))
         return;
     if (GLenum const error = ::glGetError())
-        ThrowOpenGLError(file, line, error);
+        ThrowOpenGLError(file, line, error, function);
 }
 
 } // namespace ORU::OGL

@@ -3,6 +3,7 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/opengltokenname.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/programs/infolog.h"
@@ -142,16 +143,33 @@ void ProgramImplCore::link(bool throwOnFailure) {
     bool const linked = isLinked();
     int const length = getInfoLogLength();
     if (length < 2) {
-        if (!linked)
-            ORU_THROW_INTERNAL("Unknown Program Link Error\n");
+        ORU_ASSERT_NOTED("Unknown Program Link Error\n", compileLogs(), linked);
         return;
     }
     std::string const log = internal::ReadInfoLog(*this, length);
-    if (!linked)
-        ORU_THROW_INTERNAL("Program Link Error: \n" + log);
+    ORU_ASSERT_NOTED("Program Link Error: \n" + log, compileLogs(), linked);
     // Some drivers tell only in this way that the program is too much for the hardware.
     if (log.find("run in software") != std::string::npos)
         ORU_THROW_INTERNAL("Program Link Error(Falling to Software): \n" + log);
+}
+
+std::string ProgramImplCore::compileLogs() const {
+    std::string logs;
+    for (GLuint const shader : AttachedShaders(programID_)) {
+        GLint compiled = GL_TRUE;
+        ORU_GL(GetShaderiv, shader, GL_COMPILE_STATUS, &compiled);
+        if (compiled)
+            continue;
+        GLint type = 0;
+        ORU_GL(GetShaderiv, shader, GL_SHADER_TYPE, &type);
+        GLint length = 0;
+        ORU_GL(GetShaderiv, shader, GL_INFO_LOG_LENGTH, &length);
+        std::string log(static_cast<std::string::size_type>(length), '\0');
+        ORU_GL(GetShaderInfoLog, shader, length, &length, log.data());
+        log.resize(static_cast<std::string::size_type>(length));
+        logs += ORUOGLTokenName(static_cast<GLenum>(type)) + (" does not compile: " + log);
+    }
+    return logs;
 }
 
 void ProgramImplCore::postLinkInit() {}

@@ -47,6 +47,7 @@ public:
                                  unsigned int count) const override;
     int getInfoLogLength() const override;
     void getInfoLog(int maxLength, char *buffer) override;
+    std::string compileLogs() const override;
 
 private:
     int parameter(unsigned int name) const;

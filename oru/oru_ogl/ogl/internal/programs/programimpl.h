@@ -3,6 +3,8 @@
 
 #include "oru/core/utility/export.h"
 
+#include <string>
+
 namespace ORU::OGL {
 
 class Shader;
@@ -50,6 +52,7 @@ public:
                                          unsigned int count) const = 0;
     virtual int getInfoLogLength() const = 0;
     virtual void getInfoLog(int maxLength, char *buffer) = 0;
+    virtual std::string compileLogs() const = 0;
 };
 
 } // namespace ORU::OGL
