@@ -78,8 +78,15 @@ public:
 private:
     template<class Step>
     void run(Step const &step) {
-        if (!Guarded(errors_.guard, step))
-            throw Failure("damaged JPEG: " + errors_.guard.message);
+        if (Guarded(errors_.guard, step))
+            return;
+        int const code = errors_.base.msg_code;
+        bool const isOfOtherKind = code == JERR_BAD_PRECISION || code == JERR_SOF_UNSUPPORTED ||
+                                   code == JERR_ARITH_NOTIMPL;
+        throw Failure((isOfOtherKind ? "this kind of JPEG is not supported (8 bits a channel, "
+                                       "baseline or progressive, is): "
+                                     : "damaged JPEG: ") +
+                      errors_.guard.message);
     }
 
     Orientation orientation() const {

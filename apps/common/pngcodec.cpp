@@ -104,9 +104,17 @@ void RequireUsableSize(std::vector<unsigned char> const &bytes, SizeLimit limit)
     constexpr std::size_t kHeaderEnd = 33;
     if (bytes.size() < kHeaderEnd)
         throw Failure("damaged PNG: the file is cut off");
-    if (std::memcmp(bytes.data() + 12, "IHDR", 4) == 0)
-        limit.require(BigEndian32(bytes.data() + kWidthOffset),
-                      BigEndian32(bytes.data() + kHeightOffset));
+    if (std::memcmp(bytes.data() + 12, "IHDR", 4) != 0)
+        return;
+    std::size_t const width = BigEndian32(bytes.data() + kWidthOffset);
+    std::size_t const height = BigEndian32(bytes.data() + kHeightOffset);
+    limit.require(width, height);
+    // A byte of deflate's gives 1032 at most: a file that is shorter need not be given memory. No
+    // picture has fewer bits a pixel than its depth says.
+    constexpr std::size_t kDepthOffset = 24;
+    constexpr std::size_t kMostInflated = 1032;
+    if (width * height / 8 * bytes[kDepthOffset] / kMostInflated > bytes.size())
+        throw Failure("damaged PNG: the file is cut off");
 }
 
 std::vector<png_bytep> Rows(Image &image) {

@@ -1,4 +1,5 @@
 // The code of the chapter on drawing.
+#include "oru/core/exceptions/calledfrom.h"
 #include "oru/core/exceptions/logicalexception.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
@@ -207,6 +208,17 @@ TEST_F(DrawingGuide, ReportsMistakes) {
     }
     // [quiet]
     EXPECT_NE(std::string::npos, told.find("vec4")) << told;
+
+    Program program;
+    program.attach(&shader);
+    try {
+        // [from_here]
+        ORU_FROM_HERE(program.link(true)); // a failure's notes end with ", called from" this line
+        // [from_here]
+    } catch (ORU::LogicalException const &e) {
+        told = e.note();
+    }
+    EXPECT_NE(std::string::npos, told.find(", called from docs/snippets/drawing.cpp:")) << told;
 }
 
 TEST_F(DrawingGuide, ScopesPutStateBack) {

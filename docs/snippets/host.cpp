@@ -22,7 +22,7 @@ int main() {
 
         ORU_GL(BindTexture, 0x1234, 1u); // not a texture target
     } catch (ORU::ExceptionBase const &failure) {
-        // ORU logical exception main.cpp:21 (GL_INVALID_ENUM)
+        // ORU logical exception main.cpp:21 (GL_INVALID_ENUM) in glBindTexture
         std::cerr << failure << '\n';
         return 1;
     }

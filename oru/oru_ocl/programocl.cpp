@@ -1,6 +1,7 @@
 // OpenCL programs: what is built for a device from source or binaries.
 #include "oru/oru_ocl/programocl.h"
 
+#include "oru/core/utility/composetext.h"
 #include "oru/core/utility/enumtable.h"
 #include "oru/oru_ocl/clcall.h"
 #include "oru/oru_ocl/internal/handlearray.h"
@@ -111,6 +112,11 @@ Program::BinaryArray::BinaryArray(std::vector<Device> const &devices,
         devices_.push_back(device.id());
     ORU_ASSERT_TEXT("devs.size() == sizes.size()", devices.size() == sizes.size());
     ORU_ASSERT(sizes.size() == binaries.size());
+    for (std::size_t i = 0; i < sizes.size(); ++i) // the runtime would read behind its end
+        if (sizes[i] > binaries[i].size())
+            ORU_THROW_INTERNAL(ComposeText("Program::BinaryArray binary ", i, " holds ",
+                                           binaries[i].size(), " bytes, not the ", sizes[i],
+                                           " given as its size"));
 }
 
 Program::BinaryArray::BinaryArray(std::vector<cl_device_id> const &devices,

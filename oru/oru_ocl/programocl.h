@@ -75,7 +75,8 @@ class ORU_API Program::BinaryArray {
 public:
     /// Copies the three lists.
     /// @param sizes bytes of each binary
-    /// @throws InternalException when the lists are not of one length
+    /// @throws InternalException when the lists are not of one length, or a size is larger than its
+    ///         binary
     BinaryArray(std::vector<Device> const &devices, std::vector<std::size_t> const &sizes,
                 std::vector<std::vector<unsigned char>> const &binaries);
 

@@ -47,9 +47,10 @@ Buffer::Buffer(std::int64_t size, Type type, Usage usage, void const *data)
         ORU_THROW_INTERNAL("Range error: nSize > 0");
     // A context may name both extensions and be too old for the entry points that are called here.
     ORU_ASSERT_SUPPORTED(GL_VERSION_1_5);
-    ORU_GL(GenBuffers, 1, &objectID_);
-    ORU_ASSERT(objectID_ != 0);
     try {
+        // An error that the host left pending ends the call, too, after the name was made.
+        ORU_GL(GenBuffers, 1, &objectID_);
+        ORU_ASSERT(objectID_ != 0);
         setTarget(type);
         fill(data);
     } catch (...) {
@@ -63,7 +64,8 @@ Buffer::~Buffer() {
 }
 
 void Buffer::deleteObject() noexcept {
-    internal::Release([this] { ORU_GL(DeleteBuffers, 1, &objectID_); });
+    if (objectID_)
+        internal::Release([this] { ORU_GL(DeleteBuffers, 1, &objectID_); });
 }
 
 void Buffer::setTarget(Type type) {
@@ -135,15 +137,35 @@ void Buffer::convertToUnpackBuffer() {
 void *Buffer::map(unsigned int access) {
     if (mapped_)
         ORU_THROW_INTERNAL("Buffer is already mapped (this will cause a GL error)");
-    void *const address = ORU_GL(MapBuffer, target(), access);
-    mapped_ = true;
-    return address;
+    try {
+        void *const address = ORU_GL(MapBuffer, target(), access);
+        mapped_ = true;
+        return address;
+    } catch (...) {
+        askWhetherMapped();
+        throw;
+    }
+}
+
+void Buffer::askWhetherMapped() noexcept {
+    DropExceptions([this] {
+        GLint isMapped = 0;
+        ORU_GL(GetBufferParameteriv, target(), GL_BUFFER_MAPPED, &isMapped);
+        mapped_ = isMapped != 0;
+    });
 }
 
 void Buffer::unmap() {
     if (!mapped_) // the check's text is what hosts see, with its slip
         ORU_THROW_INTERNAL("Buffer must be mapped before umapping it (this will cause a GL error)");
-    if (!ORU_GL(UnmapBuffer, target()))
+    bool isIntact = false;
+    try {
+        isIntact = ORU_GL(UnmapBuffer, target());
+    } catch (...) {
+        askWhetherMapped();
+        throw;
+    }
+    if (!isIntact)
         ORU_THROW_INTERNAL("Cannot unmap buffer");
     mapped_ = false;
 }

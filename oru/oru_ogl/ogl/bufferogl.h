@@ -80,12 +80,13 @@ public:
     /// Maps the whole store into memory.
     /// @param access GL_READ_ONLY, GL_WRITE_ONLY or GL_READ_WRITE
     /// @return `size()` bytes, valid until `unmap()`
-    /// @throws InternalException when mapped already
+    /// @throws InternalException when mapped already; ExceptionOGL when OpenGL refuses, the buffer
+    ///         not being bound say
     /// @note glMapBuffer
     void *map(unsigned int access);
 
     /// @throws InternalException when not mapped, or when the system has lost the contents, after
-    ///         which the buffer still counts as mapped
+    ///         which the buffer still counts as mapped; ExceptionOGL when OpenGL refuses
     /// @note glUnmapBuffer
     void unmap();
 
@@ -131,6 +132,10 @@ private:
     void convertTo(Type type, char const *failure);
     void fill(void const *data);
     void deleteObject() noexcept;
+
+    /// After a map or unmap that failed: an error that was pending before ends them, too, when they
+    /// are done. @note glGetBufferParameteriv
+    void askWhetherMapped() noexcept;
     void checkTransfer(char const *operation, std::int64_t offset, void const *data) const;
 
     std::int64_t size_;

@@ -131,11 +131,11 @@ void Context::UnregisterShareContext(Context const *context) {
         group->erase(member);
         if (group->empty())
             groups.erase(group);
-        break;
-    }
-    if (groups.empty()) {
-        ORUDeleter<ShareGroups>()(gShareGroups);
-        gShareGroups = nullptr;
+        if (groups.empty()) {
+            ORUDeleter<ShareGroups>()(gShareGroups);
+            gShareGroups = nullptr;
+        }
+        return;
     }
 }
 

@@ -74,8 +74,7 @@ bool FindOutput(ComPtr<IDXGIAdapter> const &adapter, Wanted wanted, DXGI_OUTPUT_
     return false;
 }
 
-DisplayDeviceKey MakeKey(ComPtr<IDXGIAdapter> const &adapter, DXGI_OUTPUT_DESC const &output) {
-    DXGI_ADAPTER_DESC const description = Describe(adapter);
+DisplayDeviceKey MakeKey(DXGI_ADAPTER_DESC const &description, DXGI_OUTPUT_DESC const &output) {
     return DisplayDeviceKey(ToUTF8(output.DeviceName), ToUTF8(description.Description),
                             (boost::format("%1%") % description.DeviceId).str());
 }
@@ -84,10 +83,11 @@ DisplayDeviceKey AdapterDisplayKey(UINT adapterIndex) {
     ComPtr<IDXGIFactory1> const dxgiFactory = CreateFactory();
     ComPtr<IDXGIAdapter> adapter;
     ORU_ASSERT_SUCCEEDED(dxgiFactory->EnumAdapters(adapterIndex, adapter.ReleaseAndGetAddressOf()));
+    DXGI_ADAPTER_DESC const description = Describe(adapter);
     DXGI_OUTPUT_DESC output;
     if (!FindOutput(adapter, IsAttached, output))
         ORU_THROW_INTERNAL("Wasn't able to find the specified card attached to the desktop");
-    return MakeKey(adapter, output);
+    return MakeKey(description, output);
 }
 
 /// The name of the output that shows a window; the system answers only through a swap chain.
@@ -141,7 +141,7 @@ bool FindKey(Wanted wanted, DisplayDeviceKey &key) {
         DXGI_OUTPUT_DESC output;
         if (!FindOutput(adapter, wanted, output))
             return false;
-        key = MakeKey(adapter, output);
+        key = MakeKey(Describe(adapter), output);
         return true;
     });
 }

@@ -95,7 +95,7 @@ void Context::initialize(HDC dc, BufferFormat const &format, Buffering buffering
             if (!ORU_WGL(MakeCurrent, nullptr, nullptr))
                 ORU_THROW_INTERNAL("ContextWindowed::ContextWindowed failed to release context: "
                                    "fatal exception!");
-        bool const isDeleted = temporary.release();
+        bool const isDeleted = temporary.destroy();
         HGLRC const made = renderContext_;
         renderContext_ = nullptr;
         if (!isDeleted || (made && !ORU_WGL(DeleteContext, made)))

@@ -37,12 +37,22 @@ void RequireUnbound(Object const &texture) {
 
 Framebuffer::Framebuffer() : Object(GL_FRAMEBUFFER_EXT, GL_FRAMEBUFFER_BINDING_EXT) {
     ORU_ASSERT(IsSupported());
-    ORU_GL(GenFramebuffersEXT, 1, &objectID_);
+    try {
+        ORU_GL(GenFramebuffersEXT, 1, &objectID_);
+    } catch (...) {
+        deleteObject(); // an error that was pending before ends the call when the name is made
+        throw;
+    }
     ORU_ASSERT(objectID_ != 0);
 }
 
 Framebuffer::~Framebuffer() {
-    internal::Release([this] { ORU_GL(DeleteFramebuffersEXT, 1, &objectID_); });
+    deleteObject();
+}
+
+void Framebuffer::deleteObject() noexcept {
+    if (objectID_)
+        internal::Release([this] { ORU_GL(DeleteFramebuffersEXT, 1, &objectID_); });
 }
 
 void Framebuffer::bind() {

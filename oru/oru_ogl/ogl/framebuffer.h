@@ -97,6 +97,7 @@ public:
     static bool IsSupported();
 
 private:
+    void deleteObject() noexcept;
     void requireBound(char const *failure) const;
     static unsigned int AttachmentFor(Renderbuffer const &renderbuffer, unsigned int colorIndex);
 };

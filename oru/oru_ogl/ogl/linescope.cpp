@@ -19,13 +19,11 @@ bool IsOn(GLenum name) {
     return value != GL_FALSE;
 }
 
-void Apply(bool enable, int factor, unsigned short pattern) {
-    if (enable) {
+void Switch(bool on) {
+    if (on)
         ORU_GL(Enable, GL_LINE_STIPPLE);
-        ORU_GL(LineStipple, factor, pattern);
-    } else {
+    else
         ORU_GL(Disable, GL_LINE_STIPPLE);
-    }
 }
 
 } // namespace
@@ -80,12 +78,16 @@ TemporaryLineStippleScope::TemporaryLineStippleScope(unsigned char enable, int f
 TemporaryLineStippleScope::~TemporaryLineStippleScope() {
     if (current_ == saved_)
         return;
-    Release([this] { Apply(saved_.enabled, saved_.factor, saved_.pattern); });
+    Release([this] { Switch(saved_.enabled); });
+    if (saved_.enabled)
+        Release([this] { ORU_GL(LineStipple, saved_.factor, saved_.pattern); });
 }
 
 void TemporaryLineStippleScope::updateCurrentState(unsigned char enable, int factor,
                                                    unsigned short pattern) {
-    Apply(enable != 0, factor, pattern);
+    Switch(enable != 0);
+    if (enable)
+        ORU_GL(LineStipple, factor, pattern);
     current_ = {enable != 0, factor, pattern};
 }
 

@@ -47,8 +47,8 @@ Renderbuffer::Renderbuffer(unsigned int format, int width, int height)
     if (height > maximum) // the check's text is what hosts see, with its "width"
         ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of width ", height,
                                        ", a max height of ", maximum, " is supported"));
-    ORU_GL(GenRenderbuffersEXT, 1, &objectID_);
     try {
+        ORU_GL(GenRenderbuffersEXT, 1, &objectID_);
         makeStorage();
     } catch (...) {
         deleteObject();
@@ -69,7 +69,8 @@ Renderbuffer::~Renderbuffer() {
 }
 
 void Renderbuffer::deleteObject() noexcept {
-    internal::Release([this] { ORU_GL(DeleteRenderbuffersEXT, 1, &objectID_); });
+    if (objectID_)
+        internal::Release([this] { ORU_GL(DeleteRenderbuffersEXT, 1, &objectID_); });
 }
 
 void Renderbuffer::bind() {

@@ -31,13 +31,23 @@ Texture::Texture(Target target, TargetBinding binding, InternalFormat format, st
     : Object(Target2GL(target), TargetBinding2GL(binding)), format_(format), width_(width),
       height_(height), depth_(depth), sizeInBytes_(kNotComputed), generatesMipmaps_(0) {
     internal::RequireFormat(format);
-    ORU_GL(GenTextures, 1, &objectID_);
+    try {
+        ORU_GL(GenTextures, 1, &objectID_);
+    } catch (...) {
+        deleteObject(); // an error that was pending before ends the call when the name is made
+        throw;
+    }
     if (objectID_ == 0) // the check's text is what hosts see, with its slip
         ORU_THROW_INTERNAL("Texture:: contructor failed to allocate new GPU texture resource");
 }
 
 Texture::~Texture() {
-    internal::Release([this] { ORU_GL(DeleteTextures, 1, &objectID_); });
+    deleteObject();
+}
+
+void Texture::deleteObject() noexcept {
+    if (objectID_)
+        internal::Release([this] { ORU_GL(DeleteTextures, 1, &objectID_); });
 }
 
 std::uint64_t Texture::width(unsigned int level) const {

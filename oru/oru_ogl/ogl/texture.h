@@ -306,6 +306,8 @@ protected:
     /// @}
 
 private:
+    void deleteObject() noexcept;
+
     InternalFormat format_;
     std::uint64_t width_;
     std::uint64_t height_;

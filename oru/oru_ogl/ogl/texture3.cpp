@@ -27,7 +27,6 @@ void Texture3::initialize(Allocate allocate) {
     if (!internal::CurrentRecord(&ExtensionManager::supportsNonPowerOfTwoTextures) &&
         !internal::ArePowersOfTwo(width(0), height(0), Texture::depth(0)))
         ORU_THROW_INTERNAL("Texture3::ctor hardware only supports power of two textures");
-    ORU_ASSERT_SUPPORTED(GL_VERSION_1_2); // glTexImage3D
 
     internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
     allocate(internal::ToSides(width(0), height(0), Texture::depth(0)));

@@ -45,7 +45,9 @@ public:
 
     /// Reads a level into memory of `pixelDataSize` bytes (for level 0 and alignment 1).
     /// @param alignment bytes that rows are aligned to: 1, 2, 4 or 8
-    /// @throws InternalException for FORMAT_COLOR_INDEX and for other alignments
+    /// @throws InternalException for FORMAT_COLOR_INDEX and for other alignments; ExceptionOGL for
+    ///         what OpenGL refuses, which leaves the download's pack state on the client attribute
+    ///         stack
     /// @note glPushClientAttrib, glPixelStorei, glGetTexImage, glPopClientAttrib
     void getPixelData(void *dst, int level, Format format, Type type, unsigned int alignment) const;
 

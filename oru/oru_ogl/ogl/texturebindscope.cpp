@@ -42,14 +42,15 @@ Texture2DBindScope::~Texture2DBindScope() {
 }
 
 void Texture2DBindScope::end() const noexcept {
-    internal::Release([this] {
-        TextureState::SetActiveTextureUnit(unit_);
-        TextureUnit const &unit = *TextureUnit::Unit(unit_);
-        unit.bind2DDefault();
+    // Each step by itself: one that fails must not keep the others from being taken.
+    using internal::Release;
+    Release([this] { TextureState::SetActiveTextureUnit(unit_); });
+    Release([this] { TextureUnit::Unit(unit_)->bind2DDefault(); });
+    Release([this] {
         if (!internal::IsCoreContext())
-            unit.disable2D();
-        TextureState::SetActiveTextureUnit(previousUnit_);
+            TextureUnit::Unit(unit_)->disable2D();
     });
+    Release([this] { TextureState::SetActiveTextureUnit(previousUnit_); });
 }
 
 } // namespace ORU::OGL

@@ -4,6 +4,7 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
+#include "oru/oru_ogl/ogl/internal/objects/ending.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/programogl.h"
@@ -117,10 +118,13 @@ void VertexBuffer::prepareDeviceSideResources() {
 void VertexBuffer::deleteDeviceSideResources() {
     if (vertexBuffer_ == 0)
         return;
-    ORU_GL(DeleteBuffers, static_cast<GLsizei>(attributeBuffers_.size()), attributeBuffers_.data());
-    attributeBuffers_.clear();
-    ORU_GL(DeleteVertexArrays, 1, &vertexBuffer_);
-    vertexBuffer_ = 0;
+    // The names are given up first: a call that fails, for an error that was pending before, has
+    // deleted them all the same.
+    std::vector<unsigned int> const buffers = std::exchange(attributeBuffers_, {});
+    unsigned int const array = std::exchange(vertexBuffer_, 0);
+    internal::Ending deleteArray([&] { ORU_GL(DeleteVertexArrays, 1, &array); });
+    ORU_GL(DeleteBuffers, static_cast<GLsizei>(buffers.size()), buffers.data());
+    deleteArray.now();
 }
 
 void VertexBuffer::requireFound(Field const &field) {

@@ -80,7 +80,8 @@ void BoundingRect::include(BoundingRegionBase const &region) {
     BoundingRect const r = rect ? *rect : RectAround(region);
     if (isEmpty()) {
         *this = r;
-    } else if (!r.isEmpty()) {
+    } else if (!region.isEmpty()) { // the rectangle around numbers and NaNs can be empty where the
+                                    // region is not
         minimum_ = Lower(minimum_, r.minimum_);
         maximum_ = Higher(maximum_, r.maximum_);
     }

@@ -46,8 +46,7 @@ bool ShaderImplCore::IsSupported(Shader::ShaderType type) {
         return internal::Supports(GL_VERSION_2_0);
     case Shader::SHADERTYPE_TESSELLATION_CONTROL:
     case Shader::SHADERTYPE_TESSELLATION_EVALUATION:
-        // A driver may name the extension and hold a version back that has the entry points.
-        return internal::Supports(GL_VERSION_2_0) && internal::Supports(GL_ARB_TESSELLATION_SHADER);
+        return internal::Supports(GL_ARB_TESSELLATION_SHADER);
     case Shader::SHADERTYPE_GEOMETRY:
         return internal::Supports(GL_VERSION_3_2);
     case Shader::SHADERTYPE_COMPUTE:

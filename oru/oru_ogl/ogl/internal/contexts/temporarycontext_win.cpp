@@ -23,9 +23,14 @@ void TemporaryContext::adopt(HGLRC context) {
 }
 
 bool TemporaryContext::release() {
+    if (renderContext_)
+        ORU_WGL(MakeCurrent, nullptr, nullptr);
+    return destroy();
+}
+
+bool TemporaryContext::destroy() {
     bool isDeleted = true;
     if (renderContext_) {
-        ORU_WGL(MakeCurrent, nullptr, nullptr);
         isDeleted = ORU_WGL(DeleteContext, renderContext_) != FALSE;
         renderContext_ = nullptr;
     }

@@ -26,6 +26,9 @@ public:
     /// @return false when the system refused to delete the rendering context
     bool release();
 
+    /// The same where no context is current already.
+    bool destroy();
+
 private:
     ScopedPtr<InternalWindow> window_;
     HDC deviceContext_ = nullptr;
