@@ -9,18 +9,18 @@ using namespace ORU::OCL;
 using namespace oru_test;
 
 TEST_F(SharingTest, TheRuntimeIsToldTheObject) {
-    auto const RGBA8 = OGL::Texture::INTERNALFORMAT_RGBA8;
+    auto const format = OGL::Texture::INTERNALFORMAT_RGBA8;
     OGL::Buffer buffer(64, OGL::Buffer::TYPE_ARRAY_BUFFER, OGL::Buffer::USAGE_STATIC_DRAW, nullptr);
-    OGL::Texture2D texture(RGBA8, 8, 8, true);
-    OGL::TextureRECT rectangle(RGBA8, 8, 8);
-    OGL::Texture3D volume(RGBA8, 8, 8, 8, true);
+    OGL::Texture2D texture(format, 8, 8, true);
+    OGL::TextureRECT rectangle(format, 8, 8);
+    OGL::Texture3D volume(format, 8, 8, 8, true);
     OGL::Renderbuffer renderbuffer(GL_RGBA8, 8, 8);
     // Of an access that is none the runtime is told nothing.
     cl_mem_flags const flags[] = {CL_MEM_READ_ONLY, CL_MEM_WRITE_ONLY, CL_MEM_READ_WRITE, 0};
     for (int i = 0; i < 4; ++i) {
         auto const access = Memory::MemoryAccessFlags(i);
         auto const passes = [&](Memory const &, char const *entryPoint, auto... object) {
-            EXPECT_EQ(TextOf(context.id(), flags[i], object...), runtime()->arguments(entryPoint));
+            EXPECT_EQ(TextOf(context.id(), flags[i], object...), runtime->arguments(entryPoint));
         };
         passes(Buffer(context, access, buffer), "clCreateFromGLBuffer", buffer.objectID());
         passes(Image2D(context, access, texture, 2), "clCreateFromGLTexture2D", GL_TEXTURE_2D, 2,
