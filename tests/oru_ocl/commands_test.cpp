@@ -29,10 +29,11 @@ TEST_F(ProgramTest, AFailedBuildLeavesALogAndAProgramToBuildAgain) {
     std::string const log = program.buildLog(device);
     EXPECT_NE(std::string::npos, log.find("VALUE")) << log;
     EXPECT_EQ(std::string::npos, log.find('\0'));
-    auto const notify = [](cl_program, void *) {};
+    auto *const notify = +[](cl_program, void *) {};
     program.buildAsync({}, "-D VALUE=5", {notify, &program});
-    EXPECT_EQ(TextOf(program.id(), 0, "null", "-D VALUE=5", AddressOf(notify), &program),
-              runtime->arguments("clBuildProgram"));
+    EXPECT_EQ(
+        TextOf(program.id(), 0, "null", "-D VALUE=5", reinterpret_cast<void *>(notify), &program),
+        runtime->arguments("clBuildProgram"));
     EXPECT_EQ(Program::BUILD_STATUS_SUCCESS, program.buildStatus(device));
 }
 

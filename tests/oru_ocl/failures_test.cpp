@@ -1,11 +1,14 @@
-// Every entry point that the layer calls is made to fail once.
+// Memory over OpenGL objects, and every entry point that the layer calls made to fail once.
 #include "oru/core/utility/integerrect.h"
 #include "oru/oru_ocl/exceptionocl.h"
 #include "oru/oru_ocl/sampler.h"
+#include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
+#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"
+#include "oru/oru_ogl/platformgl.h"
 #include "tests/support/computetest.h"
 
 #include <fstream>
@@ -17,13 +20,28 @@ using namespace oru_test;
 
 namespace {
 
-/// One object of each kind, for the failing calls to work on.
-class FailuresTest : public SharingTest {
+namespace OGL = ORU::OGL;
+
+/// With an OpenGL context, current.
+class OpenGLTest : public QueueTest {
+protected:
+    OpenGLTest() { glContext_.makeCurrent(); }
+
+    void TearDown() override { EXPECT_EQ(GLenum(GL_NO_ERROR), ::glGetError()); }
+
+private:
+    OGL::AutoInitializer library_;
+    OGL::ContextOffscreen glContext_;
+};
+
+/// One object of each kind.
+class FailuresTest : public OpenGLTest {
 protected:
     OGL::Buffer glBuffer{64, OGL::Buffer::TYPE_ARRAY_BUFFER, OGL::Buffer::USAGE_STATIC_DRAW,
                          nullptr};
-    OGL::Texture2D glTexture{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4, false};
-    OGL::Texture3D glVolume{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4, 4, false};
+    OGL::Texture2D glTexture{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4, true};
+    OGL::TextureRECT glRectangle{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4};
+    OGL::Texture3D glVolume{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4, 4, true};
     OGL::Renderbuffer glRenderbuffer{GL_RGBA8, 4, 4};
     Buffer buffer{context, kBoth, false, 64};
     Buffer shared{context, kBoth, glBuffer};
@@ -33,6 +51,8 @@ protected:
     Kernel kernel = program.kernel("f");
     Event event = queue.enqueueMarker();
 };
+
+using SharingTest = FailuresTest;
 
 struct Case {
     char const *entryPoint; ///< without its "cl"
@@ -50,12 +70,29 @@ std::string SourceLine(std::string const &file, int line) {
 
 } // namespace
 
+TEST_F(SharingTest, TheRuntimeIsToldTheObject) {
+    // Of an access that is none the runtime is told nothing.
+    cl_mem_flags const flags[] = {CL_MEM_READ_ONLY, CL_MEM_WRITE_ONLY, CL_MEM_READ_WRITE, 0};
+    for (int i = 0; i < 4; ++i) {
+        auto const access = Memory::MemoryAccessFlags(i);
+        auto const passes = [&](Memory const &, char const *entryPoint, auto... object) {
+            EXPECT_EQ(TextOf(context.id(), flags[i], object...), runtime->arguments(entryPoint));
+        };
+        passes(Buffer(context, access, glBuffer), "clCreateFromGLBuffer", glBuffer.objectID());
+        passes(Image2D(context, access, glTexture, 2), "clCreateFromGLTexture2D", GL_TEXTURE_2D, 2,
+               glTexture.objectID());
+        passes(Image2D(context, access, glRectangle, 0), "clCreateFromGLTexture2D",
+               GL_TEXTURE_RECTANGLE, 0, glRectangle.objectID());
+        passes(Image2D(context, access, glRenderbuffer), "clCreateFromGLRenderbuffer",
+               glRenderbuffer.objectID());
+        passes(Image3D(context, access, glVolume, 2), "clCreateFromGLTexture3D", GL_TEXTURE_3D, 2,
+               glVolume.objectID());
+    }
+}
+
 TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
     ContextProperties const properties(platform);
-    std::size_t const length = 2;
-    unsigned char const bytes[2] = {};
-    unsigned char const *pointer = bytes;
-    Program::BinaryArray const binaries({device.id()}, &length, &pointer);
+    Program::BinaryArray const binaries({device}, {2}, {{0, 0}});
     ORU::IntegerRect const rect({0, 0}, {2, 2});
     int values[16] = {};
     void *const data = values;

@@ -20,15 +20,11 @@ using MemoryTest = QueueTest;
 
 TEST(Extensions, HaveExactNames) {
     EXPECT_EQ(10, ExtensionManager::nameToExtensionEnum("cl_khr_gl_sharing"));
-    EXPECT_EQ(16, ExtensionManager::nameToExtensionEnum("cl_khr_gl_sharin"));
     for (int e = -1; e <= 16; ++e) {
         std::string const name = ExtensionManager::ExtensionEnumToString(Enum::Extension(e));
         EXPECT_EQ(e < 0 || e > 12, name.empty()) << e;
         EXPECT_EQ(name.empty() ? 16 : e, ExtensionManager::nameToExtensionEnum(name)) << name;
     }
-    std::vector<std::string> tokens = {"kept"};
-    TokenizeExtensionString("\t cl_a  cl_b\t", tokens);
-    EXPECT_EQ((std::vector<std::string>{"kept", "cl_a", "cl_b"}), tokens);
 }
 
 TEST(Ranges, HoldTheirSizes) {
@@ -105,8 +101,6 @@ TEST_F(ObjectsTest, DevicesAnswerEveryPropertyByItsType) {
     EXPECT_FAILURE("property_index < table_size",
                    device.getInfo<unsigned int>(Enum::DeviceProperty(0x103E)));
     EXPECT_EQ(platform.id(), device.platform().id());
-    EXPECT_EQ(device.type(), platform.devices(device.type()).front().type());
-    EXPECT_EQ(device.getInfo<std::string>(Enum::DEVICEPROPERTY_VENDOR), device.vendor());
     runtime->answerNumber(CL_DEVICE_IMAGE_SUPPORT, cl_bool(false));
     EXPECT_FALSE(device.supportsImages());
 }
@@ -165,11 +159,11 @@ TEST_F(ObjectsTest, ContextsPassTheirPropertiesDevicesAndCallback) {
               properties.properties());
     properties.setSharedRenderContext(reinterpret_cast<HGLRC>(0x5678));
 
-    auto const notify = [](char const *, void const *, std::size_t, void *) {};
+    auto *const notify = +[](char const *, void const *, std::size_t, void *) {};
     Context::NotifyCallback const callback(notify, &properties);
     std::string const sharing =
         TextOf(CL_CONTEXT_PLATFORM, id, CL_WGL_HDC_KHR, 0x1234, CL_GL_CONTEXT_KHR, 0x5678);
-    std::string const told = TextOf(AddressOf(notify), &properties);
+    std::string const told = TextOf(reinterpret_cast<void *>(notify), &properties);
     auto const check = [&](Context const &context, char const *entryPoint, auto... devices) {
         EXPECT_EQ(sharing + TextOf(devices...) + told, runtime->arguments(entryPoint));
         ASSERT_EQ(1u, context.devices().size());
@@ -211,12 +205,8 @@ TEST_F(MemoryTest, TheRuntimeIsToldWhatToMake) {
            2, 3, 2, 20, 80, data);
     passes(Image3D(context, kReads, true, kRGBA8, 2, 3, 2, 20, 80, data), image3D,
            CL_MEM_READ_ONLY | copy | allocate, 2, 3, 2, 20, 80, data);
-    // Runtimes refuse pitches without memory, but hear of them.
-    runtime->fail("clCreateImage3D", 1, CL_INVALID_IMAGE_SIZE);
-    EXPECT_FAILURE("OCL Exception: CL_INVALID_IMAGE_SIZE",
-                   Image3D(context, kWrites, false, kRGBA8, 2, 3, 2, 20, 80));
-    EXPECT_EQ(TextOf(context.id(), CL_MEM_WRITE_ONLY, 2, 3, 2, 20, 80, kNone),
-              runtime->arguments("clCreateImage3D"));
+    passes(Image3D(context, kWrites, false, kRGBA8, 2, 3, 2, 0, 0), image3D, CL_MEM_WRITE_ONLY, 2,
+           3, 2, 0, 0, kNone);
 }
 
 TEST_F(MemoryTest, NullHostMemoryIsRefusedBeforeAnyCall) {
@@ -263,6 +253,7 @@ TEST_F(MemoryTest, SamplersAnswerWhatTheyAreMadeWith) {
         }
     EXPECT_FAILURE("Unknown OCL addressing mode.",
                    Sampler(context, true, Sampler::SamplerAddressingMode(4), {}));
-    EXPECT_FAILURE("Unknown OCL filter mode.",
-                   Sampler(context, true, {}, Sampler::SamplerFilterMode(2)));
+    runtime->answerNumber(CL_SAMPLER_ADDRESSING_MODE, CL_ADDRESS_MIRRORED_REPEAT);
+    Sampler const sampler(context, true, Sampler::ADDRESS_CLAMP, Sampler::FILTER_LINEAR);
+    EXPECT_FAILURE("Unknown OpenCL addressing mode.", sampler.addressingMode());
 }

@@ -5,12 +5,11 @@
 #include "oru/oru_ocl/extensionmanagerocl.h"
 #include "oru/oru_ocl/programocl.h"
 #include "tests/support/failure.h"
-#include "tests/support/glfixture.h"
 #include "tests/support/testruntime.h"
 
-namespace oru_test {
+#include <gtest/gtest.h>
 
-namespace OGL = ORU::OGL;
+namespace oru_test {
 
 constexpr auto kReads = ORU::OCL::Memory::MEMORY_READ_ONLY;
 constexpr auto kWrites = ORU::OCL::Memory::MEMORY_WRITE_ONLY;
@@ -19,12 +18,6 @@ constexpr cl_image_format kRGBA8 = {CL_RGBA, CL_UNORM_INT8};
 
 /// A null argument, as the call book shows it.
 constexpr void *kNone = nullptr;
-
-/// The address of a callback without captures, for the text of a call.
-template<class Callback>
-void const *AddressOf(Callback const &callback) {
-    return reinterpret_cast<void const *>(+callback);
-}
 
 /// Every test must leave no handle behind. The layer stays open until the process ends, since only
 /// its first opening finds the tests' runtime.
@@ -59,18 +52,6 @@ protected:
 
     ORU::OCL::Context context{ORU::OCL::ContextProperties(platform), device};
     ORU::OCL::CommandQueue queue{context, device, false, false};
-};
-
-/// With an OpenGL context, current.
-class SharingTest : public QueueTest {
-protected:
-    SharingTest() { glContext_.makeCurrent(); }
-
-    void TearDown() override { EXPECT_EQ(GLenum(GL_NO_ERROR), ::glGetError()); }
-
-private:
-    OGL::AutoInitializer library_;
-    OGL::ContextOffscreen glContext_;
 };
 
 } // namespace oru_test

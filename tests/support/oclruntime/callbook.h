@@ -17,13 +17,12 @@ std::string TextOf(Arguments... arguments) {
     return text.str();
 }
 
-/// One for each runtime, which exports it by OruTestCallBook; used while no call is under way.
+/// One for each runtime, which exports it by OruTestCallBook; used while no call is under way. The
+/// runtime itself uses what follows `references`.
 class CallBook {
 public:
     CallBook() { reset(); }
 
-    /// @name For the test
-    /// @{
     /// The `call`-th call of an entry point from now (1 is the next) does nothing and reports
     /// `code`.
     void fail(std::string const &entryPoint, unsigned int call, cl_int code) {
@@ -56,10 +55,7 @@ public:
 
     /// The caller's references to each handle that it has any to.
     std::map<void const *, int> const &references() const { return references_; }
-    /// @}
 
-    /// @name For the runtime
-    /// @{
     /// Notes a call; the code with which it is to fail, or CL_SUCCESS.
     cl_int enter(std::string const &entryPoint, std::string const &arguments) {
         Entry &entry = entries_[entryPoint];
@@ -75,7 +71,6 @@ public:
         if (handle && (references_[handle] += change) == 0)
             references_.erase(handle);
     }
-    /// @}
 
 private:
     struct Entry {

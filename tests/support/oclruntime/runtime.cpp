@@ -151,22 +151,18 @@ cl_int CL_API_CALL Transfer(cl_command_queue queue, cl_uint count, cl_mem const 
 }
 
 /// What is called: the system's entry points, some of them replaced.
-FunctionTable const &Functions() {
-    static FunctionTable const kTable = [] {
-        FunctionTable table = System();
-        table.clCreateContext = CreateContext;
-        table.clCreateContextFromType = CreateContextFromType;
-        table.clBuildProgram = BuildProgram;
-        table.clCreateKernelsInProgram = CreateKernelsInProgram;
-        table.clCreateFromGLBuffer = CreateFromGL;
-        table.clCreateFromGLRenderbuffer = CreateFromGL;
-        table.clCreateFromGLTexture2D = CreateFromGLTexture;
-        table.clCreateFromGLTexture3D = CreateFromGLTexture;
-        table.clEnqueueAcquireGLObjects = Transfer<false>;
-        table.clEnqueueReleaseGLObjects = Transfer<true>;
-        return table;
-    }();
-    return kTable;
+FunctionTable Replaced(FunctionTable table) {
+    table.clCreateContext = CreateContext;
+    table.clCreateContextFromType = CreateContextFromType;
+    table.clBuildProgram = BuildProgram;
+    table.clCreateKernelsInProgram = CreateKernelsInProgram;
+    table.clCreateFromGLBuffer = CreateFromGL;
+    table.clCreateFromGLRenderbuffer = CreateFromGL;
+    table.clCreateFromGLTexture2D = CreateFromGLTexture;
+    table.clCreateFromGLTexture3D = CreateFromGLTexture;
+    table.clEnqueueAcquireGLObjects = Transfer<false>;
+    table.clEnqueueReleaseGLObjects = Transfer<true>;
+    return table;
 }
 
 template<class Argument>
@@ -185,10 +181,9 @@ std::string Recorded([[maybe_unused]] std::string const &name, [[maybe_unused]] 
     if constexpr (std::is_integral_v<Argument>) {
         previous = static_cast<std::size_t>(argument);
         text = TextOf(argument);
-    } else if constexpr (std::is_function_v<Target>) {
+    } else if constexpr (std::is_function_v<Target> || std::is_void_v<Target> ||
+                         kIsHandle<Argument>) {
         text = TextOf(reinterpret_cast<void const *>(argument));
-    } else if constexpr (std::is_void_v<Target> || kIsHandle<Argument>) {
-        text = TextOf(argument);
     } else if constexpr (std::is_same_v<Target, char const>) {
         text = TextOf(argument ? argument : "null");
     } else if constexpr (std::is_same_v<Target, cl_context_properties const>) {
@@ -204,14 +199,6 @@ std::string Recorded([[maybe_unused]] std::string const &name, [[maybe_unused]] 
     }
     return text;
 }
-
-/// Where a call reports its error by an argument.
-void SetError(cl_int *error, cl_int code) {
-    if (error)
-        *error = code;
-}
-template<class Argument>
-void SetError(Argument, cl_int) {}
 
 /// Notes the references that an argument of a successful call brought: `change` to a handle, one to
 /// a received event.
@@ -243,6 +230,7 @@ template<class Result, class... Parameters>
 auto Call(std::string const &name, Result (CL_API_CALL *FunctionTable::*slot)(Parameters...)) {
     return [=](Parameters... arguments) -> Result {
         std::lock_guard const lock(gMutex);
+        static FunctionTable const kFunctions = Replaced(System());
         [[maybe_unused]] std::size_t previous = 0;
         std::string recorded;
         ((recorded += Recorded(name, arguments, previous)), ...);
@@ -250,16 +238,19 @@ auto Call(std::string const &name, Result (CL_API_CALL *FunctionTable::*slot)(Pa
         if constexpr (std::is_same_v<Result, cl_int>) {
             if (code != CL_SUCCESS || Answered(arguments...))
                 return code;
-            Result const result = (Functions().*slot)(arguments...);
+            Result const result = (kFunctions.*slot)(arguments...);
             int const change = (name.rfind("clRetain", 0) == 0) - (name.rfind("clRelease", 0) == 0);
             if (result == CL_SUCCESS)
                 (NoteReferences(arguments, change), ...);
             return result;
         } else {
-            (SetError(arguments, code), ...);
-            Result const result = code == CL_SUCCESS ? (Functions().*slot)(arguments...) : nullptr;
-            if constexpr (kIsHandle<Result>)
-                gBook.count(result, 1);
+            auto const setError = [code](auto argument) {
+                if constexpr (std::is_same_v<decltype(argument), cl_int *>)
+                    *argument = code;
+            };
+            (setError(arguments), ...);
+            Result const result = code == CL_SUCCESS ? (kFunctions.*slot)(arguments...) : nullptr;
+            NoteReferences(result, 1);
             return result;
         }
     };
