@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <array>
 #include <memory>
+#include <type_traits>
 #include <vector>
 
 namespace oru_test {
@@ -32,12 +33,13 @@ struct Pixel {
     Texture::Type type;
 };
 
+auto const kRGBA8 = Texture::INTERNALFORMAT_RGBA8;
+Pixel const kBytes{Texture::FORMAT_RGBA, Texture::TYPE_UNSIGNED_BYTE};
 PixelUnpackParameters const kTight;
 
 struct TextureKind {
     char const *name;
     GLenum target;
-    GLenum binding;
     std::size_t sides;
     std::size_t layers; ///< the side that counts layers, 3 for none
     std::unique_ptr<Texture> (*make)(Texture::InternalFormat format, Sides const &size,
@@ -63,23 +65,22 @@ inline std::uint64_t Size(int side) {
     return static_cast<std::uint64_t>(side);
 }
 
-#define ORU_KIND(Class, gl, sides, layers, ...)                                                    \
-    {                                                                                              \
-#Class, GL_TEXTURE_##gl, GL_TEXTURE_BINDING_##gl, sides, layers,                           \
-            [](Texture::InternalFormat format, Sides const &size,                                  \
-               [[maybe_unused]] bool mipmapped) -> std::unique_ptr < Texture>                      \
-        { return std::make_unique<Class>(format, __VA_ARGS__); }                                   \
-    }
+template<class Kind, std::size_t... Side>
+std::unique_ptr<Texture> Make(Texture::InternalFormat format, Sides const &size, bool mipmapped) {
+    if constexpr (std::is_same_v<Kind, TextureRECT>)
+        return std::make_unique<Kind>(format, Size(size[Side])...);
+    else
+        return std::make_unique<Kind>(format, Size(size[Side])..., mipmapped);
+}
+
 inline TextureKind const kTextureKinds[] = {
-    ORU_KIND(Texture1D, 1D, 1, 3, Size(size[0]), mipmapped),
-    ORU_KIND(Texture2D, 2D, 2, 3, Size(size[0]), Size(size[1]), mipmapped),
-    ORU_KIND(TextureRECT, RECTANGLE, 2, 3, Size(size[0]), Size(size[1])),
-    ORU_KIND(Texture1DArray, 1D_ARRAY, 2, 1, Size(size[0]), Size(size[1]), mipmapped),
-    ORU_KIND(Texture3D, 3D, 3, 3, Size(size[0]), Size(size[1]), Size(size[2]), mipmapped),
-    ORU_KIND(Texture2DArray, 2D_ARRAY, 3, 2, Size(size[0]), Size(size[1]), Size(size[2]),
-             mipmapped),
+    {"Texture1D", GL_TEXTURE_1D, 1, 3, Make<Texture1D, 0>},
+    {"Texture2D", GL_TEXTURE_2D, 2, 3, Make<Texture2D, 0, 1>},
+    {"TextureRECT", GL_TEXTURE_RECTANGLE, 2, 3, Make<TextureRECT, 0, 1>},
+    {"Texture1DArray", GL_TEXTURE_1D_ARRAY, 2, 1, Make<Texture1DArray, 0, 1>},
+    {"Texture3D", GL_TEXTURE_3D, 3, 3, Make<Texture3D, 0, 1, 2>},
+    {"Texture2DArray", GL_TEXTURE_2D_ARRAY, 3, 2, Make<Texture2DArray, 0, 1, 2>},
 };
-#undef ORU_KIND
 
 /// A texture that is bound while it lives.
 struct BoundTexture {
@@ -92,7 +93,7 @@ struct BoundTexture {
     Texture *operator->() const { return texture.get(); }
 };
 
-/// Filters and wrap modes of the texture bound to a target, as many of these as it has sides.
+/// Filters of the texture bound to a target, and a wrap mode for each side.
 inline std::vector<GLint> Sampling(GLenum target, std::size_t sides) {
     GLenum const names[] = {GL_TEXTURE_MIN_FILTER, GL_TEXTURE_MAG_FILTER, GL_TEXTURE_WRAP_S,
                             GL_TEXTURE_WRAP_T, GL_TEXTURE_WRAP_R};
