@@ -1,9 +1,10 @@
 // What the context tests share: contexts of the host, windowed and opened ones, and their count.
 #pragma once
 
-#include "tests/support/pushed.h"
 #include "tests/support/testwindow.h"
 
+#include "oru/oru_ogl/extensionator/interceptorscope.h"
+#include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/wglforwarder.h"
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
@@ -56,17 +57,14 @@ public:
     explicit HostContext(HGLRC share = nullptr, std::vector<int> const &attributes = {}) {
         PIXELFORMATDESCRIPTOR descriptor = {};
         descriptor.nSize = sizeof descriptor;
-        descriptor.nVersion = 1;
         descriptor.dwFlags = PFD_DRAW_TO_WINDOW | PFD_SUPPORT_OPENGL;
-        descriptor.iPixelType = PFD_TYPE_RGBA;
         ::SetPixelFormat(dc_, ::ChoosePixelFormat(dc_, &descriptor), &descriptor);
         rc_ = ::wglCreateContext(dc_);
         if (!attributes.empty()) {
             HGLRC const plain = rc_;
             EXPECT_TRUE(::wglMakeCurrent(dc_, plain));
-            auto const create = reinterpret_cast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(
-                reinterpret_cast<void *>(::wglGetProcAddress("wglCreateContextAttribsARB")));
-            rc_ = create(dc_, nullptr, attributes.data());
+            rc_ = ORU::OGL::internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(
+                ::wglGetProcAddress("wglCreateContextAttribsARB"))(dc_, nullptr, attributes.data());
             ::wglMakeCurrent(nullptr, nullptr);
             ::wglDeleteContext(plain);
         }
@@ -92,11 +90,13 @@ private:
     HGLRC rc_ = nullptr;
 };
 
-/// Follows the rendering contexts that the library makes, by either function, and deletes. Only one
-/// is pushed at a time, on one thread and before the library first makes a context.
+/// Follows the rendering contexts that the library makes, by either function, and deletes: one at a
+/// time, on one thread, and pushed before the library first makes a context.
 class ContextCounter : public ORU::OGL::WGLForwarder {
 public:
-    ContextCounter() {
+    /// @param isDeaf whether contexts with attributes are made of OpenGL 3.0, whatever is asked
+    explicit ContextCounter(bool isDeaf = false) {
+        sIsDeaf = isDeaf;
         sMade = 0;
         sAlive.clear();
         sGone.clear();
@@ -113,8 +113,7 @@ public:
         PROC const real = WGLForwarder::wcgmGetProcAddress(file, line, name);
         if (!real || std::string(name) != "wglCreateContextAttribsARB")
             return real;
-        sCreate =
-            reinterpret_cast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(reinterpret_cast<void *>(real));
+        sCreate = ORU::OGL::internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(real);
         return reinterpret_cast<PROC>(reinterpret_cast<void *>(&CreateContextAttribs));
     }
 
@@ -136,9 +135,11 @@ private:
         return made;
     }
     static HGLRC WINAPI CreateContextAttribs(HDC dc, HGLRC share, int const *attributes) {
-        return Counted(sCreate(dc, share, attributes));
+        int const old[] = {WGL_CONTEXT_MAJOR_VERSION_ARB, 3, 0};
+        return Counted(sCreate(dc, share, sIsDeaf ? old : attributes));
     }
 
+    static inline bool sIsDeaf = false;
     static inline int sMade = 0;
     static inline std::set<HGLRC> sAlive, sGone;
     static inline PFNWGLCREATECONTEXTATTRIBSARBPROC sCreate = nullptr;

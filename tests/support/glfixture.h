@@ -2,9 +2,9 @@
 #pragma once
 
 #include "tests/support/coreprofile.h"
-#include "tests/support/pushed.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/interceptorscope.h"
 #include "oru/oru_ogl/extensionator/openglforwarder.h"
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
@@ -14,29 +14,27 @@
 
 #include <map>
 #include <memory>
+#include <numeric>
 #include <optional>
 #include <string>
 
 namespace oru_test {
 
+template<class Decorator>
+using Pushed = ORU::OGL::InterceptorScope<Decorator>;
+
 /// Counts the calls of every operation by name, and forwards them.
 class CountingForwarder : public ORU::OGL::OpenGLInterceptorDecorator {
 public:
     /// Calls of one entry point, named without its `gl`.
-    int count(std::string const &name) const {
-        auto const found = counts_.find(name);
-        return found == counts_.end() ? 0 : found->second;
-    }
+    int count(std::string const &name) const { return counts_.count(name) ? counts_.at(name) : 0; }
 
     int total() const {
-        int sum = 0;
-        for (auto const &entry : counts_)
-            sum += entry.second;
-        return sum;
+        return std::accumulate(counts_.begin(), counts_.end(), 0,
+                               [](int sum, auto const &entry) { return sum + entry.second; });
     }
 
-    /// The names of the calls that are no queries, in their alphabetical order, since the last
-    /// time.
+    /// The calls since the last time that are no queries, in alphabetical order.
     std::string takeChanges() {
         std::string names;
         for (auto const &[name, calls] : counts_) {
