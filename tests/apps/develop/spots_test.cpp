@@ -8,7 +8,6 @@
 
 #include <map>
 #include <random>
-#include <tuple>
 
 using namespace apps_test;
 using App::Image;
@@ -18,36 +17,29 @@ namespace {
 using Develop::Spot;
 using SpotList = std::vector<Spot>;
 
-double StopsAt(SpotList const &spots, double x, double y) {
-    double sum = 0;
-    for (Spot const &spot : spots) {
-        double const d = std::hypot(x - spot.x, y - spot.y);
-        double const t = spot.radius > 0 ? std::min(d / spot.radius, 1.0) : 1.0;
-        sum += spot.stops * (1 - t * t * (3 - 2 * t));
-    }
-    return sum;
-}
-
 /// The light of a picture brightened everywhere and at its spots, by index.
 auto SpottedLight(Image const &photo, SpotList const &spots, double stops) {
     return [&photo, &spots, stops](std::size_t i) {
         std::size_t const pixel = i / photo.channels;
         double const x = static_cast<double>(pixel % photo.width) + 0.5;
         double const y = static_cast<double>(pixel / photo.width) + 0.5;
-        return Light(photo, i) * std::exp2(stops + StopsAt(spots, x, y));
+        double sum = stops;
+        for (Spot const &spot : spots) {
+            double const d = std::hypot(x - spot.x, y - spot.y);
+            double const t = spot.radius > 0 ? std::min(d / spot.radius, 1.0) : 1.0;
+            sum += spot.stops * (1 - t * t * (3 - 2 * t));
+        }
+        return Light(photo, i) * std::exp2(sum);
     };
 }
 
 std::map<std::string, SpotList> SpotSets() {
     std::map<std::string, SpotList> sets = {
-        {"one", {{30.25, 20.5, 12, 1.5}}},
         {"overlapping", {{30, 20, 12, 1}, {36, 22, 9.5, -2}, {31, 20, 3, 4}}},
         {"edges", {{0, 0, 9, 2}, {90, 30, 11, -1}, {45, 61, 7, 3}}},
         {"outside", {{-40, 20, 50, 2}, {45, -1000, 1010.5, 1}, {500, 500, 20, 9}}},
         {"nowhere", {{-100, -100, 50, 2}}},
-        {"zero radius", {{30.5, 20.5, 0, 5}, {50, 20, 4, 1}}},
-        {"tiny", {{30.5, 20.5, 1e-6, 3}, {89.5, 60.5, 0.4, -8}}},
-        {"nothing", {{30, 20, 10, 0}}}};
+        {"tiny", {{30.5, 20.5, 0, 5}, {50.5, 20.5, 1e-6, 3}, {89.5, 60.5, 0.4, -8}}}};
     std::mt19937 random(7);
     std::uniform_real_distribution<double> x(-5, 60), y(-5, 50), radius(0, 6), stops(-1, 1);
     for (int i = 0; i < 5000; ++i)
@@ -100,13 +92,11 @@ TEST_F(SpotRegions, EqualFullFrame) {
         App::Shape shape;
         Develop::Sharpening sharpening;
     };
-    std::vector<Case> cases = {{"none", {91, 62, 3, 8}, {}},
-                               {"none", {91, 62, 2, 16}, {}},
-                               {"none", {33, 80, 4, 16}, {}},
-                               {"none", {64, 1, 1, 8}, {}}};
-    for (char const *const device : {"none", ""})
-        for (double const sigma : {0.3, 1.7, 9.0})
-            cases.push_back({device, {91, 62, 3, 16}, {1.5, sigma}});
+    App::Shape const usual = {91, 62, 3, 16};
+    Case const cases[] = {{"none", {91, 62, 3, 8}, {}}, {"none", {33, 80, 4, 16}, {}},
+                          {"none", {64, 1, 1, 8}, {}},  {"none", usual, {1.5, 0.3}},
+                          {"none", usual, {1.5, 9.0}},  {"", usual, {1.5, 0.3}},
+                          {"", usual, {1.5, 9.0}}};
     for (auto const &[device, shape, sharpening] : cases) {
         useDevice(device);
         Image const photo = RandomPicture(shape, 1);
@@ -145,20 +135,16 @@ TEST_F(Spots, Texts) {
     };
     SpotList const spots = parse("# a face\r\n\r\n\t 30.5  +2e1\t12 -1 # brighter\n   \n#");
     ASSERT_EQ(spots.size(), 1u);
-    auto const [x, y, radius, stops] = spots[0];
-    EXPECT_EQ(std::make_tuple(x, y, radius, stops), std::make_tuple(30.5, 20, 12, -1));
-
-    std::string const count = "4 numbers are needed: centre x, centre y, radius, exposure";
-    std::map<std::string, std::string> const reasons = {{"1 2 3", count},
-                                                        {"1 2 3 4 5", count},
-                                                        {"1 2 x 4", "'x' is not a number"},
-                                                        {"1 2 3 4,", "'4,' is not a number"},
-                                                        {"1 2 -3 4", "the radius is negative"},
-                                                        {"nan 2 3 4", "'nan' is not a number"},
-                                                        {"1e300 2 3 4", "1e300 is out of range"}};
+    EXPECT_EQ(spots[0].y, 20);
+    EXPECT_EQ(spots[0].stops, -1);
+    std::map<std::string, std::string> const reasons = {
+        {"1 2 3", "4 numbers are needed: centre x, centre y, radius, exposure"},
+        {"nan 2 3 4", "'nan' is not a number"},
+        {"1 2 3 4,", "'4,' is not a number"},
+        {"1 2 -3 4", "the radius is negative"},
+        {"1e300 2 3 4", "1e300 is out of range"}};
     for (auto const &row : reasons)
-        EXPECT_FAILURE("line 3: " + row.second,
-                       parse("1 2 3 1\n# fine so far\n" + row.first + "\n1 2\n"));
+        EXPECT_FAILURE("line 3: " + row.second, parse("1 2 3 1\n# fine\n" + row.first + "\n1 2\n"));
 }
 
 } // namespace
