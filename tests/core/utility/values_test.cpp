@@ -1,4 +1,4 @@
-// The small value types and helpers: sizes, rectangles, version texts, boundaries.
+// The small value types and helpers: rectangles, version texts, boundaries.
 #include "oru/core/utility/boundary.h"
 #include "oru/core/utility/composetext.h"
 #include "oru/core/utility/integerrect.h"
@@ -13,17 +13,6 @@ using ORU::IntegerRect;
 using ORU::size2;
 
 namespace {
-
-TEST(Size2, ComputesAndComparesByComponents) {
-    size2 const a(640, 481), b(7, 9);
-    EXPECT_EQ(a / b * b + a % b, a);
-    // A strict order of all pairs: the first component decides, the second between equals.
-    for (std::size_t i = 0; i < 81; ++i) {
-        size2 const x(i / 27, i / 9 % 3), y(i / 3 % 3, i % 3);
-        EXPECT_EQ(x < y, x[0] * 3 + x[1] < y[0] * 3 + y[1]);
-        EXPECT_EQ(x == y, !(x < y) && !(y < x));
-    }
-}
 
 TEST(IntegerRect, MovesComparesAndPrints) {
     IntegerRect rect({10, 20}, size2(640, 480));
