@@ -20,19 +20,15 @@ class TestSummary(unittest.TestCase):
             rows = "".join(f'<testcase name="{n}" status="{s}"/>' for n, s in cases.items())
             results.write_text(f"<testsuite>{rows}</testsuite>")
             expected.write_text(skips)
-            try:
+            with contextlib.suppress(SystemExit):
                 return test_summary.main(expected, results), out.getvalue()
-            except SystemExit:
-                return None, out.getvalue()
+            return None, out.getvalue()
 
     def test_verdicts(self):
         for cases, skips, verdict, text in (
-                ({"A.a": "run", "A.b": "notrun", "A.c": "disabled"},
-                 "# why\nA.b  # no such device\nA.c  # too slow here\n", 0, "skipped: A.b (no such device)"),
+                ({"A.a": "run", "A.b": "disabled"}, "# why\nA.b  # no device\n", 0, "A.b (no device)"),
                 ({"A.a": "run", "A.b": "notrun"}, "", 1, "A.b (NOT EXPECTED"),
-                ({"A.a": "run"}, "A.a  # outdated\n", 0, "note: A.a"),
                 ({"A.a": "run", "A.b": "fail"}, "A.b  # not a licence to fail\n", 1, "failed: A.b"),
-                ({}, "", None, ""),
                 ({"A.b": "notrun"}, "A.b  # everything was skipped\n", None, ""),
                 ({"A.a": "run"}, "A.a\n", None, "")):
             actual, output = self.verdict(cases, skips)

@@ -16,9 +16,4 @@ inline Bytes Foreign(std::string const &name) {
     return Bytes(std::istreambuf_iterator<char>(file), {});
 }
 
-/// A file cut off.
-inline Bytes Beginning(Bytes const &bytes, std::size_t count) {
-    return Bytes(bytes.data(), bytes.data() + count);
-}
-
 } // namespace apps_test

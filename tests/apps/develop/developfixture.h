@@ -9,7 +9,6 @@
 #include "tests/support/program.h"
 
 #include <gmock/gmock.h>
-#include <gtest/gtest.h>
 
 namespace apps_test {
 
