@@ -183,7 +183,7 @@ TEST_F(TransferTest, LevelsFollowTheFirst) {
             Bytes const below(kind.halved(size), 4, value);
             EXPECT_EQ(below.texels, below.read(*texture, kBytes, 1));
         };
-        Pushed<CountingForwarder> calls;
+        InterceptorScope<CountingForwarder> calls;
         texture->enableAutoMIPGeneration(true);
         Upload(*texture, 0, {{}, {1, 1, 1}}, kBytes, kTight, &buffer, std::size_t(0));
         Copy(*texture, 0, {}, 1, 1);
