@@ -20,6 +20,8 @@
 
 namespace oru_test {
 
+using namespace ORU::OGL;
+
 /// A context whose protected members a test may call.
 template<class Kind>
 class Exposed : public Kind {
@@ -40,14 +42,12 @@ public:
     using Kind::UnregisterShareContext;
 };
 
-/// A context of the library in a window of the host.
-inline ORU::OGL::ContextWindowed
-Windowed(TestWindow const &window, ORU::OGL::Context const *share = nullptr,
-         ORU::OGL::BufferFormat const &format = ORU::OGL::BufferFormat::FORMAT_RGBA8_D24,
-         int samples = 1,
-         ORU::OGL::Context::Buffering buffering = ORU::OGL::Context::BUFFERING_DOUBLE) {
-    return ORU::OGL::ContextWindowed(window.hwnd(), format, buffering,
-                                     static_cast<ORU::OGL::Context::Multisampling>(samples), share);
+inline ContextWindowed Windowed(TestWindow const &window, Context const *share = nullptr,
+                                BufferFormat const &format = BufferFormat::FORMAT_RGBA8_D24,
+                                int samples = 1,
+                                Context::Buffering buffering = Context::BUFFERING_DOUBLE) {
+    return ContextWindowed(window.hwnd(), format, buffering,
+                           static_cast<Context::Multisampling>(samples), share);
 }
 
 /// A rendering context that the host makes with plain calls, current for its lifetime.
@@ -63,7 +63,7 @@ public:
         if (!attributes.empty()) {
             HGLRC const plain = rc_;
             EXPECT_TRUE(::wglMakeCurrent(dc_, plain));
-            rc_ = ORU::OGL::internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(
+            rc_ = internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(
                 ::wglGetProcAddress("wglCreateContextAttribsARB"))(dc_, nullptr, attributes.data());
             ::wglMakeCurrent(nullptr, nullptr);
             ::wglDeleteContext(plain);
@@ -92,7 +92,7 @@ private:
 
 /// Follows the rendering contexts that the library makes, by either function, and deletes: one at a
 /// time, on one thread, and pushed before the library first makes a context.
-class ContextCounter : public ORU::OGL::WGLForwarder {
+class ContextCounter : public WGLForwarder {
 public:
     /// @param isDeaf whether contexts with attributes are made of OpenGL 3.0, whatever is asked
     explicit ContextCounter(bool isDeaf = false) {
@@ -113,7 +113,7 @@ public:
         PROC const real = WGLForwarder::wcgmGetProcAddress(file, line, name);
         if (!real || std::string(name) != "wglCreateContextAttribsARB")
             return real;
-        sCreate = ORU::OGL::internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(real);
+        sCreate = internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(real);
         return reinterpret_cast<PROC>(reinterpret_cast<void *>(&CreateContextAttribs));
     }
 
@@ -121,9 +121,8 @@ public:
     static std::size_t Alive() { return sAlive.size(); }
     /// Contexts that are gone and have a record all the same.
     static auto Remembered() {
-        return std::count_if(sGone.begin(), sGone.end(), [](HGLRC rc) {
-            return ORU::OGL::ExtensionManager::Instance(rc) != nullptr;
-        });
+        return std::count_if(sGone.begin(), sGone.end(),
+                             [](HGLRC rc) { return ExtensionManager::Instance(rc) != nullptr; });
     }
 
 private:

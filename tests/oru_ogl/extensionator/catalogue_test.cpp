@@ -15,7 +15,7 @@ namespace {
 
 std::size_t const kEntryCount = sizeof(FunctionTable) / sizeof(PROC);
 
-/// The rows of the table in catalogue order: an entry point, its group, its prototype.
+/// In catalogue order: an entry point, its group, its prototype.
 std::vector<std::vector<std::string>> const &Rows() {
     static auto const rows = oru_test::TableRows(ORU_ENTRY_POINTS);
     return rows;
@@ -26,8 +26,7 @@ std::vector<std::vector<std::string>> const &Rows() {
 template<class Operation>
 std::size_t SlotOf(Operation operation) {
     std::ptrdiff_t words[2];
-    static_assert(sizeof words == sizeof operation, "pointer to member of this ABI");
-    std::memcpy(words, &operation, sizeof words);
+    std::memcpy(words, &operation, sizeof operation);
     return static_cast<std::size_t>(words[0] - 1) / sizeof(void *);
 }
 #endif
@@ -41,7 +40,9 @@ TEST(Catalogue, KeepsItsOrder) {
         {1181, "glVertexWeighthvNV"}};
     for (auto const &[place, name] : places)
         EXPECT_EQ(name, Rows().at(place)[0]);
-
+    std::size_t const first = Rows().size() - kEntryCount; // beyond OpenGL 1.1
+    for (std::size_t i = 0; i < Rows().size(); ++i)
+        EXPECT_EQ(i < first, Rows()[i][1] == "GL_VERSION_1_1") << i;
     // In two arrays: an assertion for each operation would take the compiler minutes.
     char const *const names[] = {
 #define ORU_GL_OPERATION(Result, Name, Parameters, Arguments) "gl" #Name,
@@ -67,9 +68,9 @@ TEST_F(LoaderTest, StoresWhatTheDriverExports) {
     std::size_t const first = Rows().size() - kEntryCount;
     std::map<unsigned int, bool> allFound;
     for (std::size_t i = first; i < Rows().size(); ++i) {
-        OpenGLExtension const e = record.nameToEnumGL(Rows()[i][1].c_str());
-        bool const found = ::wglGetProcAddress(Rows()[i][0].c_str());
-        allFound[e] = allFound.emplace(e, true).first->second && found;
+        bool &found =
+            allFound.emplace(record.nameToEnumGL(Rows()[i][1].c_str()), true).first->second;
+        found = found && ::wglGetProcAddress(Rows()[i][0].c_str());
     }
     for (unsigned int value = 0; value <= UNKNOWN_OPENGL_EXTENSION; ++value) {
         auto const group = allFound.find(value);
@@ -86,9 +87,7 @@ TEST_F(LoaderTest, StoresWhatTheDriverExports) {
 }
 
 TEST_F(LoaderTest, KnowsExactNames) {
-    EXPECT_EQ(34, ExtensionManager::Instance()->nameToEnumGL("GL_ARB_imaging"));
-    for (char const *name : {"gl_arb_imaging", "GL_ARB_imagin", "GL_ARB_imaging ", "",
-                             "WGL_ARB_pbuffer", "GL_ARB_compute_shader"})
-        EXPECT_EQ(UNKNOWN_OPENGL_EXTENSION, ExtensionManager::Instance()->nameToEnumGL(name))
-            << name;
+    EXPECT_EQ(GL_ARB_IMAGING, ExtensionManager::Instance()->nameToEnumGL("GL_ARB_imaging"));
+    for (char const *name : {"gl_arb_imaging", "GL_ARB_imagin", "GL_ARB_imaging ", ""})
+        EXPECT_EQ(UNKNOWN_OPENGL_EXTENSION, ExtensionManager::Instance()->nameToEnumGL(name));
 }

@@ -11,16 +11,13 @@ using namespace oru_test;
 namespace {
 
 /// Filters nothing, or fails in the middle of the drawing.
-class Obstacle : public OpenGLForwarder {
-public:
-    bool filters = false;
+struct Obstacle : OpenGLForwarder {
     bool fails = false;
 
     void cgmTexParameteri(char const *file, unsigned int line, GLenum target, GLenum pname,
                           GLint param) override {
-        if (!filters && param == GL_LINEAR)
-            param = GL_NEAREST;
-        OpenGLForwarder::cgmTexParameteri(file, line, target, pname, param);
+        OpenGLForwarder::cgmTexParameteri(file, line, target, pname,
+                                          param == GL_LINEAR ? GL_NEAREST : param);
     }
     void cgmTexCoord2f(char const *file, unsigned int line, GLfloat s, GLfloat t) override {
         if (fails && s > 0)
@@ -59,18 +56,12 @@ private:
 } // namespace
 
 TEST_F(FilteringTest, DrawsOnceAndLeavesNothingBehind) {
-    ASSERT_TRUE(Record().isSupported(GL_EXT_GPU_SHADER4));
     InterceptorScope<CountingForwarder> calls;
-    EXPECT_TRUE(Record().supportsFloatFiltering()); // as this platform's rasterizer does
-    EXPECT_TRUE(Record().supportsHalfFiltering());
+    for (int i = 0; i < 2; ++i)
+        EXPECT_TRUE(Record().supportsFloatFiltering() && Record().supportsHalfFiltering());
     EXPECT_EQ(4, calls->count("End"));
     EXPECT_EQ(4, calls->count("DeleteTextures"));
     EXPECT_EQ(2, calls->count("DeleteFramebuffersEXT"));
-
-    calls->reset();
-    EXPECT_TRUE(Record().supportsFloatFiltering());
-    EXPECT_TRUE(Record().supportsHalfFiltering());
-    EXPECT_EQ(0, calls->total());
     GLint viewport[4];
     ::glGetIntegerv(GL_VIEWPORT, viewport);
     EXPECT_NE(32, viewport[2]) << "the viewport of the drawing is not the host's";
@@ -78,12 +69,11 @@ TEST_F(FilteringTest, DrawsOnceAndLeavesNothingBehind) {
 }
 
 TEST_F(FilteringTest, KeepsANo) {
-    InterceptorScope<Obstacle> obstacle;
-    EXPECT_FALSE(Record().supportsFloatFiltering());
-    obstacle->fails = true;
-    EXPECT_FALSE(Record().supportsHalfFiltering());
-    obstacle->filters = true;
-    obstacle->fails = false;
-    EXPECT_FALSE(Record().supportsFloatFiltering());
-    EXPECT_FALSE(Record().supportsHalfFiltering());
+    {
+        InterceptorScope<Obstacle> obstacle;
+        EXPECT_FALSE(Record().supportsFloatFiltering());
+        obstacle->fails = true;
+        EXPECT_FALSE(Record().supportsHalfFiltering());
+    }
+    EXPECT_FALSE(Record().supportsFloatFiltering() || Record().supportsHalfFiltering());
 }

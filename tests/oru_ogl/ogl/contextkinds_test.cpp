@@ -10,6 +10,7 @@
 #include <functional>
 #include <list>
 #include <memory>
+#include <optional>
 #include <thread>
 #include <vector>
 
@@ -18,13 +19,13 @@ using namespace oru_test;
 
 namespace {
 
-/// Draws one colour into the window's back buffer and reads a pixel of it.
-unsigned int DrawAndRead() {
+/// Draws one colour into the current window's back buffer and reads a pixel of it.
+void DrawAndRead() {
     ::glClearColor(1, 0.5f, 0, 1);
     ::glClear(GL_COLOR_BUFFER_BIT);
     unsigned int pixel = 0;
-    ::glReadPixels(1, 1, 1, 1, GL_RGBA, GL_UNSIGNED_BYTE, &pixel);
-    return pixel;
+    ::glReadPixels(1, 1, 1, 1, GL_RGB, GL_UNSIGNED_BYTE, &pixel);
+    EXPECT_EQ(0x0080FFu, pixel);
 }
 
 } // namespace
@@ -69,31 +70,24 @@ TEST(ContextKinds, DrawIntoTheHostsWindow) {
     TestWindow const window;
     ContextWindowed context = Windowed(window);
     context.makeCurrent();
-    EXPECT_EQ(0xFF0080FFu, DrawAndRead());
-    context.swapBuffers();
+    DrawAndRead();
     for (bool waits : {true, false}) {
         context.enableSyncToVerticalRetrace(waits);
         EXPECT_EQ(waits, _wcgmGetSwapIntervalEXT());
     }
-    EXPECT_EQ(static_cast<GLenum>(GL_NO_ERROR), ::glGetError());
 }
 
 TEST(ContextKinds, AdoptTheHostsContext) {
     AutoInitializer library;
     EXPECT_FAILURE("ContextWrapped::ctor invalid device", ContextWrapped());
-    TestWindow const window;
-    std::unique_ptr<ContextWindowed> owner(new ContextWindowed(Windowed(window)));
-    HDC const dc = owner->deviceContext();
-    HGLRC const rc = owner->renderContext();
+    std::optional<HostContext> host(std::in_place);
     EXPECT_FAILURE("ContextWrapped::ctor invalid rendering context",
-                   ContextWrapped(dc, nullptr, nullptr));
-    ContextWrapped const byWindow(dc, rc, window.hwnd());
-    byWindow.makeCurrent();
-    EXPECT_EQ(owner->displayDeviceKey().displayName, byWindow.displayDeviceKey().displayName);
-    EXPECT_EQ(rc, ContextWrapped().renderContext());
-    EXPECT_EQ(rc, Context::CurrentContext()) << "the adopted context is left as it is";
-    owner.reset();
-    EXPECT_FAILURE("ContextWrapped Object leaked", byWindow.makeCurrent());
+                   ContextWrapped(host->dc(), nullptr, nullptr));
+    ContextWrapped const adopted;
+    EXPECT_EQ(host->rc(), adopted.renderContext());
+    EXPECT_EQ(host->rc(), Context::CurrentContext()) << "it is left as it is";
+    host.reset();
+    EXPECT_FAILURE("ContextWrapped Object leaked", adopted.makeCurrent());
 }
 
 TEST(ContextKinds, WorkOnOneThreadEachAtOnce) {
@@ -106,7 +100,7 @@ TEST(ContextKinds, WorkOnOneThreadEachAtOnce) {
     for (ContextOffscreen const &context : contexts)
         threads.emplace_back([&context] {
             context.makeCurrent();
-            EXPECT_EQ(0x0080FFu, DrawAndRead() & 0xFFFFFFu);
+            DrawAndRead();
             ReleaseOGLContext();
         });
     for (std::thread &thread : threads)
