@@ -1,6 +1,7 @@
 // What the context tests share: contexts of the host, windowed and opened ones, and their count.
 #pragma once
 
+#include "tests/support/failure.h"
 #include "tests/support/testwindow.h"
 
 #include "oru/oru_ogl/extensionator/interceptorscope.h"
@@ -53,23 +54,19 @@ inline ContextWindowed Windowed(TestWindow const &window, Context const *share =
 /// A rendering context that the host makes with plain calls, current for its lifetime.
 class HostContext {
 public:
-    /// @param attributes for wglCreateContextAttribsARB; without any, a context of wglCreateContext
-    explicit HostContext(HGLRC share = nullptr, std::vector<int> const &attributes = {}) {
+    /// @param attributes for wglCreateContextAttribsARB
+    explicit HostContext(HGLRC share = nullptr, std::vector<int> const &attributes = {0}) {
         PIXELFORMATDESCRIPTOR descriptor = {};
         descriptor.nSize = sizeof descriptor;
         descriptor.dwFlags = PFD_DRAW_TO_WINDOW | PFD_SUPPORT_OPENGL;
         ::SetPixelFormat(dc_, ::ChoosePixelFormat(dc_, &descriptor), &descriptor);
-        rc_ = ::wglCreateContext(dc_);
-        if (!attributes.empty()) {
-            HGLRC const plain = rc_;
-            EXPECT_TRUE(::wglMakeCurrent(dc_, plain));
-            rc_ = internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(
-                ::wglGetProcAddress("wglCreateContextAttribsARB"))(dc_, nullptr, attributes.data());
-            ::wglMakeCurrent(nullptr, nullptr);
-            ::wglDeleteContext(plain);
-        }
-        EXPECT_TRUE(!share || ::wglShareLists(share, rc_));
+        HGLRC const first = ::wglCreateContext(dc_);
+        EXPECT_TRUE(::wglMakeCurrent(dc_, first));
+        auto const create = internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(
+            ::wglGetProcAddress("wglCreateContextAttribsARB"));
+        rc_ = create(dc_, share, attributes.data());
         makeCurrent();
+        ::wglDeleteContext(first);
     }
     ~HostContext() {
         ::wglMakeCurrent(nullptr, nullptr);

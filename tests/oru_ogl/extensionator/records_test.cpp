@@ -1,19 +1,17 @@
 // Where records come from: one per device, one per foreign context, none before the library is
 // open.
 #include "tests/support/contexts.h"
-#include "tests/support/failure.h"
 
-#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 
 #include <atomic>
 #include <cstdint>
 #include <functional>
+#include <list>
 #include <set>
 #include <thread>
 #include <vector>
 
-using namespace ORU::OGL;
 using namespace oru_test;
 
 namespace {
@@ -120,21 +118,19 @@ TEST(ContextRegistry, FindsMoreContextsThanItsIndexHolds) {
     AutoInitializer library;
     ContextOffscreen const real;
     ExtensionManager *const record = ExtensionManager::Instance(&real);
-    std::vector<std::unique_ptr<Exposed<Context>>> contexts;
+    std::list<Exposed<Context>> contexts;
     for (std::uintptr_t i = 1; i <= 400; ++i) {
-        contexts.push_back(std::make_unique<Exposed<Context>>(reinterpret_cast<HGLRC>(i << 16)));
-        contexts.back()->setDisplayDeviceKey(real.displayDeviceKey());
-        ExtensionManager::RegisterContext(*contexts.back());
+        contexts.emplace_back(reinterpret_cast<HGLRC>(i << 16));
+        contexts.back().setDisplayDeviceKey(real.displayDeviceKey());
+        ExtensionManager::RegisterContext(contexts.back());
     }
     OnThreads(4, [&](std::size_t) {
-        int wrong = 0;
-        for (auto const &context : contexts)
-            wrong += &ExtensionManager::CurrentTable(context->renderContext()) != &record->table();
-        EXPECT_EQ(0, wrong);
+        for (Context const &context : contexts)
+            EXPECT_EQ(&record->table(), &ExtensionManager::CurrentTable(context.renderContext()));
     });
-    for (auto const &context : contexts) {
-        ExtensionManager::UnRegisterContext(*context);
-        EXPECT_EQ(nullptr, ExtensionManager::Instance(context->renderContext()));
+    for (Context const &context : contexts) {
+        ExtensionManager::UnRegisterContext(context);
+        EXPECT_EQ(nullptr, ExtensionManager::Instance(context.renderContext()));
     }
     EXPECT_EQ(record, ExtensionManager::Instance(real.renderContext()));
 }

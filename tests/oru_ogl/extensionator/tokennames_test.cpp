@@ -50,12 +50,6 @@ TEST(TokenNames, AreThoseOfTheLatestVersion) {
     }
 }
 
-TEST(TokenNames, OfBooleans) {
-    for (int value = 0; value < 256; ++value)
-        EXPECT_STREQ(value ? "GL_TRUE" : "GL_FALSE",
-                     ORUOGLBoolToString(static_cast<GLboolean>(value)));
-}
-
 TEST(TokenNames, AreExportedUnmangled) {
     HMODULE const library = ::GetModuleHandleA("oru.dll");
     EXPECT_TRUE(::GetProcAddress(library, "ORUOGLTokenName"));

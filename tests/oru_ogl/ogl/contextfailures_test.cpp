@@ -2,18 +2,15 @@
 // behind.
 #include "tests/support/contexts.h"
 #include "tests/support/countinghooks.h"
-#include "tests/support/failure.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
 
 #include <gmock/gmock.h>
-#include <gtest/gtest.h>
 
 #include <functional>
 #include <stdexcept>
 #include <utility>
 
-using namespace ORU::OGL;
 using namespace oru_test;
 using testing::Ge;
 
@@ -73,16 +70,10 @@ TEST(ContextFailures, NameWhatIsWrongAndLeaveNothingBehind) {
     Exposed<Context> const neverMade(DisplayDeviceKey{});
     HDC const dc = context.deviceContext();
     BufferFormat const simple(BufferFormat::FORMAT_RGBA8);
-    auto const windowed = [&simple](Context::Buffering buffering, int samples) {
-        return [=] { Windowed(TestWindow(), nullptr, simple, samples, buffering); };
-    };
-    auto const choose = [&] {
-        Opened::ChoosePixelFormat(dc, simple, Context::BUFFERING_SINGLE,
-                                  Context::MULTISAMPLING_NONE, Context::WINDOWING_WINDOW);
-    };
     std::pair<char const *, std::function<void()>> const failures[] = {
-        {"Double buffering required with multisampling.", windowed(Context::BUFFERING_SINGLE, 4)},
-        {"Can't find suitable pixel format.", windowed(Context::BUFFERING_DOUBLE, 64)},
+        {"Double buffering required with multisampling.",
+         [&] { Windowed(TestWindow(), nullptr, simple, 4, Context::BUFFERING_SINGLE); }},
+        {"Can't find suitable pixel format.", [&] { Windowed(TestWindow(), nullptr, simple, 64); }},
         {"refused", [] { Refusing(TestWindow().hwnd()); }},
         {"outerIter != gVectorOfContextVectors->end()",
          [&] { ContextOffscreen const orphan(&context); }},
@@ -104,7 +95,10 @@ TEST(ContextFailures, NameWhatIsWrongAndLeaveNothingBehind) {
          }}};
     for (HGLRC current : {context.renderContext(), HGLRC(nullptr)}) {
         ::wglMakeCurrent(current ? dc : nullptr, current);
-        EXPECT_FAILURE(current ? "" : "wglChoosePixelFormatARB extension not supported", choose());
+        EXPECT_FAILURE(current ? "" : "wglChoosePixelFormatARB extension not supported",
+                       Opened::ChoosePixelFormat(dc, simple, Context::BUFFERING_SINGLE,
+                                                 Context::MULTISAMPLING_NONE,
+                                                 Context::WINDOWING_WINDOW));
         for (auto const &[text, fail] : failures) {
             EXPECT_EQ(text, MessageOf(fail).substr(0, std::string(text).size()));
             EXPECT_EQ(current, ::wglGetCurrentContext()) << text;
@@ -141,9 +135,9 @@ TEST(ContextFailures, ReleaseEverythingWhenMemoryRunsOut) {
             EXPECT_GT(i, 6);
         } catch (std::bad_alloc const &) {
         }
-        EXPECT_TRUE(hooks.outstanding().empty()) << "allocation " << i;
-        EXPECT_EQ(0, hooks.wrongReleases()) << "allocation " << i;
-        EXPECT_EQ(nullptr, ::wglGetCurrentContext()) << "allocation " << i;
-        EXPECT_EQ(0, InternalWindows()) << "allocation " << i;
+        EXPECT_TRUE(hooks.outstanding().empty()) << i;
+        EXPECT_EQ(0, hooks.wrongReleases()) << i;
+        EXPECT_EQ(nullptr, ::wglGetCurrentContext()) << i;
+        EXPECT_EQ(0, InternalWindows()) << i;
     }
 }

@@ -1,11 +1,8 @@
 // The kinds of contexts: what is current before and after, threads, and what 200 of them leave
 // behind.
 #include "tests/support/contexts.h"
-#include "tests/support/failure.h"
 
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
-
-#include <gtest/gtest.h>
 
 #include <functional>
 #include <list>
@@ -14,7 +11,6 @@
 #include <thread>
 #include <vector>
 
-using namespace ORU::OGL;
 using namespace oru_test;
 
 namespace {
@@ -116,8 +112,7 @@ TEST(ContextKinds, WorkOnOneThreadEachAtOnce) {
 // 200 contexts of every kind, in changing order: no context, record, window or GDI object stays.
 TEST(ContextKinds, LeaveNothingBehind) {
     AutoInitializer library;
-    InterceptorScope<ContextCounter> const
-        counter; // before the record learns how contexts are made
+    InterceptorScope<ContextCounter> const counter;
     {
         ContextOffscreen const keep;
         int const made = ContextCounter::Made();

@@ -1,13 +1,9 @@
 // Share groups: who shares with whom, and how adopted contexts find their group.
 #include "tests/support/contexts.h"
-#include "tests/support/failure.h"
-
-#include <gtest/gtest.h>
 
 #include <memory>
 #include <thread>
 
-using namespace ORU::OGL;
 using namespace oru_test;
 
 TEST(ShareGroups, TellWhoShares) {
