@@ -1,23 +1,15 @@
 // What the context tests share: contexts of the host, windowed and opened ones, and their count.
 #pragma once
 
-#include "tests/support/failure.h"
+#include "tests/support/objecttest.h"
 #include "tests/support/testwindow.h"
 
-#include "oru/oru_ogl/extensionator/interceptorscope.h"
 #include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/wglforwarder.h"
-#include "oru/oru_ogl/libraryogl.h"
-#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
-#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
-
-#include <gtest/gtest.h>
 
 #include <algorithm>
-#include <set>
-#include <vector>
 
 namespace oru_test {
 
@@ -87,8 +79,8 @@ private:
     HGLRC rc_ = nullptr;
 };
 
-/// Follows the rendering contexts that the library makes, by either function, and deletes: one at a
-/// time, on one thread, and pushed before the library first makes a context.
+/// Follows the contexts that the library makes, by either function, and deletes: one at a time, on
+/// one thread, and pushed before the library first makes a context.
 class ContextCounter : public WGLForwarder {
 public:
     /// @param isDeaf whether contexts with attributes are made of OpenGL 3.0, whatever is asked

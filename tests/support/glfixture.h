@@ -13,10 +13,8 @@
 #include <gtest/gtest.h>
 
 #include <map>
-#include <memory>
 #include <numeric>
 #include <optional>
-#include <string>
 
 namespace oru_test {
 
@@ -55,8 +53,7 @@ private:
     std::map<std::string, int> counts_;
 };
 
-/// Every test runs in an open library with an offscreen context current, in a core one where the
-/// run asks for that, and must leave no GL error behind.
+/// Every test runs with an offscreen context current and must leave no GL error behind.
 class OffscreenTest : public ::testing::Test {
 protected:
     void SetUp() override {

@@ -2,7 +2,6 @@
 #include "tests/support/failure.h"
 #include "tests/support/glfixture.h"
 
-#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/openglerrorchecker.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
 
@@ -39,7 +38,6 @@ TEST_F(ChainTest, StartsWithTheLastPushed) {
     EXPECT_EQ(&b, record.popInterceptor());
     EXPECT_EQ(&a, First().popInterceptor());
     EXPECT_EQ(nullptr, First().popInterceptor());
-    EXPECT_EQ(checker, &First());
     OpenGLInterceptor::Destroy();
     OpenGLInterceptor::Destroy(); // an empty chain has nothing to destroy
 }
@@ -67,7 +65,6 @@ TEST_F(ChainTest, NamesErrors) {
 
 TEST_F(ChainTest, BalancesBeginAndEnd) {
     EXPECT_EQ("Unbalanced glEnd()! f:1", ErrorOf([] { First().cgmEnd("f", 1); }));
-    ASSERT_EQ(static_cast<GLenum>(GL_NO_ERROR), ::glGetError()) << "glEnd was not called";
     ORU_GL(Begin, GL_POINTS);
     EXPECT_EQ("Unbalanced glBegin()! f:2", ErrorOf([] { First().cgmBegin("f", 2, GL_LINES); }));
     // No query is allowed here, so the error of this call waits for glEnd.

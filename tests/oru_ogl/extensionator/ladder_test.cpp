@@ -1,10 +1,7 @@
-// What a record reads from implementations that differ: the build runs this program under Mesa's
-// overrides. ORU_TEST_VERSION and ORU_TEST_VENDOR say what the record must find, ORU_TEST_RUNGS
-// which capabilities the versions bring.
-#include "tests/support/glfixture.h"
+// What a record reads under Mesa's overrides: ORU_TEST_VERSION and ORU_TEST_VENDOR say what it must
+// find, ORU_TEST_RUNGS which capabilities the versions bring.
 #include "tests/support/implementation.h"
-
-#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
+#include "tests/support/objecttest.h"
 
 #include <cstdlib>
 
@@ -44,13 +41,12 @@ TEST_F(LadderTest, HoldsEveryVersionUpToItsOwn) {
     for (std::string word; rungs >> word;) {
         if (word[0] != 'G') {
             rung = static_cast<unsigned int>(std::stoi(word));
-            continue;
+        } else {
+            unnamed += Has(word) ? 0 : 1;
+            EXPECT_EQ(version >= rung || Has(word),
+                      record().isSupported(record().nameToEnumGL(word.c_str())))
+                << word;
         }
-        bool const named = Has(word);
-        unnamed += named ? 0 : 1;
-        EXPECT_EQ(version >= rung || named,
-                  record().isSupported(record().nameToEnumGL(word.c_str())))
-            << word;
     }
     EXPECT_TRUE(version < 30 || unnamed >= 30) << "the overrides take only " << unnamed << " out";
 }
@@ -58,8 +54,7 @@ TEST_F(LadderTest, HoldsEveryVersionUpToItsOwn) {
 TEST_F(LadderTest, KeepsEveryNameOfTheImplementation) {
     auto const expected = ExtensionNames();
     auto names = record().supportedExtensionNames();
-    ASSERT_GT(names.size(), expected.size());
-    EXPECT_EQ(0u, names[expected.size()].find("WGL_")) << "those of WGL follow";
+    EXPECT_EQ(0u, names.at(expected.size()).find("WGL_")) << "those of WGL follow";
     names.resize(expected.size());
     EXPECT_EQ(expected, names);
     for (std::string const &name : expected) {
@@ -73,17 +68,14 @@ TEST_F(LadderTest, KnowsItsMaker) {
     ASSERT_FALSE(Has("GL_ARB_texture_non_power_of_two"));
     EXPECT_EQ(Version() >= 20 && record().vendor() != ExtensionManager::VENDOR_NVIDIA,
               record().supportsNonPowerOfTwoTextures());
-    GLint units = 1;
-    ::glGetIntegerv(record().isSupported(GL_ARB_FRAGMENT_PROGRAM) ? GL_MAX_TEXTURE_IMAGE_UNITS
-                                                                  : GL_MAX_TEXTURE_UNITS,
-                    &units);
-    EXPECT_EQ(static_cast<unsigned int>(units), record().numberOfTextureUnits());
+    bool const hasPrograms = record().isSupported(GL_ARB_FRAGMENT_PROGRAM);
+    EXPECT_EQ(Get(hasPrograms ? GL_MAX_TEXTURE_IMAGE_UNITS : GL_MAX_TEXTURE_UNITS),
+              static_cast<GLint>(record().numberOfTextureUnits()));
 }
 
 TEST_F(LadderTest, AnswersWithoutAnyCallForFloatsThatItLacks) {
     bool const hasFloats = !Environment("ORU_TEST_VERSION").empty();
     ASSERT_EQ(hasFloats, record().supportsFloatingPointTextures());
-    ASSERT_EQ(hasFloats, record().isSupported(GL_EXT_GPU_SHADER4));
     InterceptorScope<CountingForwarder> calls;
     EXPECT_FALSE(!hasFloats &&
                  (record().supportsFloatFiltering() || record().supportsHalfFiltering()));

@@ -10,7 +10,6 @@
 #include <algorithm>
 #include <map>
 #include <set>
-#include <string>
 
 TEST(TokenNames, AreThoseOfTheLatestVersion) {
     // By value: the names with their OpenGL version, 0 for those of extensions alone.

@@ -35,9 +35,7 @@ constexpr std::size_t kHostKindCount = std::size(kHostKinds);
 TEST(ContextProfiles, AreAsAskedFor) {
     struct Row {
         Attributes attributes;
-        GLint leastVersion;
-        GLint profile;
-        GLint flags;
+        GLint leastVersion, profile, flags;
     } const rows[] = {
         {Attributes().setProfile(OPENGLPROFILE_CORE), 32, kCore, 0},
         {Attributes().setVersion(4, 5).setProfile(OPENGLPROFILE_CORE).setDebug(), 45, kCore,

@@ -31,8 +31,7 @@ TEST(DisplayDevices, AreFoundForWindowsAndNames) {
     using Devices = Exposed<Context>;
     DisplayDeviceKey const &primary = Devices::PrimaryDisplayDevice();
     auto const origin = Devices::DisplayOrigin(primary.adapterName, false);
-    EXPECT_EQ(0, origin.x);
-    EXPECT_EQ(0, origin.y);
+    EXPECT_TRUE(origin.x == 0 && origin.y == 0);
     EXPECT_FAILURE("Adapter not found", Devices::DisplayOrigin("no such adapter", true));
     EXPECT_FAILURE("GetWindowRect(theWindow, &windowRect)",
                    Devices::DisplayDeviceFromWindow(nullptr));

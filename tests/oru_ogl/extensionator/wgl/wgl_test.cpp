@@ -1,6 +1,5 @@
 // The WGL chain and the WGL extension pointers.
 #include "tests/support/contexts.h"
-#include "tests/support/glfixture.h"
 #include "tests/support/tablerows.h"
 
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
@@ -66,9 +65,4 @@ TEST(WGLRecord, LacksAnExtensionWithoutItsEntryPoint) {
     EXPECT_NE(nullptr, _wcgmSwapIntervalEXT);
     EXPECT_FALSE(Context::SupportsVerticalRetraceControl());
     EXPECT_FALSE(record.supportsRenderToTexture());
-    EXPECT_FALSE(record.supportsFloatFiltering() || record.supportsHalfFiltering());
-    TestWindow const window;
-    ContextWindowed windowed = Windowed(window, &context);
-    EXPECT_FAILURE("ContextWindowed::enableSyncToVerticalRetrace unsupported feature",
-                   windowed.enableSyncToVerticalRetrace(true));
 }
