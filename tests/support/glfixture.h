@@ -20,9 +20,6 @@
 
 namespace oru_test {
 
-template<class Decorator>
-using Pushed = ORU::OGL::InterceptorScope<Decorator>;
-
 /// Counts the calls of every operation by name, and forwards them.
 class CountingForwarder : public ORU::OGL::OpenGLInterceptorDecorator {
 public:
@@ -82,7 +79,7 @@ protected:
 private:
     ORU::OGL::AutoInitializer library_;
     ORU::OGL::ExtensionManager::ScopedInitOptions options_{RunOptions()};
-    std::optional<Pushed<CoreShaders>> coreShaders_;
+    std::optional<ORU::OGL::InterceptorScope<CoreShaders>> coreShaders_;
     std::unique_ptr<ORU::OGL::ContextOffscreen> context_;
 };
 

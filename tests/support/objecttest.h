@@ -88,7 +88,7 @@ protected:
     }
 
 private:
-    Pushed<NameLedger> ledger_;
+    ORU::OGL::InterceptorScope<NameLedger> ledger_;
 };
 
 } // namespace oru_test

@@ -52,7 +52,7 @@ private:
         made_ = ContextCounter::Made();
     }
 
-    Pushed<ContextCounter> counter_;
+    InterceptorScope<ContextCounter> counter_;
     int made_ = 0;
 };
 
@@ -60,7 +60,7 @@ private:
 
 TEST_F(FilteringTest, DrawsOnceAndLeavesNothingBehind) {
     ASSERT_TRUE(Record().isSupported(GL_EXT_GPU_SHADER4));
-    Pushed<CountingForwarder> calls;
+    InterceptorScope<CountingForwarder> calls;
     EXPECT_TRUE(Record().supportsFloatFiltering()); // as this platform's rasterizer does
     EXPECT_TRUE(Record().supportsHalfFiltering());
     EXPECT_EQ(4, calls->count("End"));
@@ -78,7 +78,7 @@ TEST_F(FilteringTest, DrawsOnceAndLeavesNothingBehind) {
 }
 
 TEST_F(FilteringTest, KeepsANo) {
-    Pushed<Obstacle> obstacle;
+    InterceptorScope<Obstacle> obstacle;
     EXPECT_FALSE(Record().supportsFloatFiltering());
     obstacle->fails = true;
     EXPECT_FALSE(Record().supportsHalfFiltering());

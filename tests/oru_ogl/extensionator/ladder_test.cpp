@@ -95,7 +95,7 @@ TEST_F(LadderTest, AnswersWithoutAnyCallForFloatsThatItLacks) {
     ASSERT_EQ(hasFloats, record().isSupported(GL_EXT_GPU_SHADER4));
     if (hasFloats)
         return;
-    Pushed<CountingForwarder> calls;
+    InterceptorScope<CountingForwarder> calls;
     for (int i = 0; i < 2; ++i)
         EXPECT_FALSE(record().supportsFloatFiltering() || record().supportsHalfFiltering());
     EXPECT_EQ(0, calls->total());

@@ -76,7 +76,7 @@ TEST(LibraryStart, HandsOptionsToNewContexts) {
 
 TEST(DeviceRecord, IsBuiltOnceForAllContextsOfADevice) {
     AutoInitializer library;
-    Pushed<ContextCounter> const counter;
+    InterceptorScope<ContextCounter> const counter;
     ContextOffscreen first, second, third(&first);
     EXPECT_EQ(4, ContextCounter::Made()) << "one of them to build the record";
     EXPECT_EQ(3u, ContextCounter::Alive());

@@ -96,7 +96,7 @@ TEST_F(BufferTest, RefusesInOrder) {
     struct Losing : OpenGLForwarder {
         GLboolean cgmUnmapBuffer(char const *, unsigned int, GLenum) override { return GL_FALSE; }
     };
-    EXPECT_FAILURE("Cannot unmap buffer", Pushed<Losing> const losing; buffer.unmap());
+    EXPECT_FAILURE("Cannot unmap buffer", InterceptorScope<Losing> const losing; buffer.unmap());
     EXPECT_TRUE(buffer.isMapped());
     buffer.unmap();
     Buffer::BindDefaultPackBuffer();

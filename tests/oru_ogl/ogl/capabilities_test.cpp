@@ -164,7 +164,7 @@ TEST_F(CapabilitiesTest, ClampsAndUnpacksByVersion) {
     GLint wrap = 0;
     ORU_GL(GetTexParameteriv, GL_TEXTURE_2D, GL_TEXTURE_WRAP_S, &wrap);
     EXPECT_EQ(Version() >= 12 ? GL_CLAMP_TO_EDGE : GL_CLAMP, wrap);
-    Pushed<CountingForwarder> counter;
+    InterceptorScope<CountingForwarder> counter;
     PixelUnpackParameters().apply();
     EXPECT_EQ(Version() >= 12 || Has("GL_EXT_texture3D") ? 8 : 6, counter->count("PixelStorei"));
 }
@@ -172,7 +172,7 @@ TEST_F(CapabilitiesTest, ClampsAndUnpacksByVersion) {
 TEST_F(CapabilitiesTest, ClientStorageIsSetAroundTheAllocation) {
     ASSERT_TRUE(Has("GL_APPLE_client_storage")) << "by the override";
     Image<std::uint16_t> pixels({4, 4, 1}, 4, 0x8000);
-    Pushed<ClientStorage> storage;
+    InterceptorScope<ClientStorage> storage;
     BoundTexture const texture(std::make_unique<Texture2D>(Texture::INTERNALFORMAT_RGBA16, 4, 4,
                                                            false, &pixels.texels[0],
                                                            Texture::TYPE_UNSIGNED_SHORT));

@@ -111,7 +111,7 @@ TEST_F(FramebufferTest, RefusesBeforeItCalls) {
     Texture2DArray layers(Texture::INTERNALFORMAT_RGBA8, 8, 4, 3, false);
     Renderbuffer depth(GL_DEPTH_COMPONENT24, 8, 4);
     unsigned int const over = Framebuffer::MaxColorAttachments();
-    Pushed<CountingForwarder> calls;
+    InterceptorScope<CountingForwarder> calls;
     auto const expect = [&](std::string const &beginning, std::function<void()> const &operation) {
         calls->reset();
         EXPECT_EQ(beginning, MessageOf(operation).substr(0, beginning.size()));

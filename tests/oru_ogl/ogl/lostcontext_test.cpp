@@ -57,7 +57,7 @@ TEST_F(LostContextTest, EndsThrowNothingAndMakeNoCallWithoutAContext) {
         other.reset();
         if (!inAnother)
             ReleaseOGLContext();
-        Pushed<CountingForwarder> calls;
+        InterceptorScope<CountingForwarder> calls;
         EXPECT_NO_THROW(everything.reset());
         EXPECT_EQ(inAnother, calls->total() > 0);
         EXPECT_EQ(inAnother, GetGLString(GL_VENDOR) != "");

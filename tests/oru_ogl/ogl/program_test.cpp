@@ -62,7 +62,7 @@ TEST_F(ProgramTest, ShaderTypesAreThoseOfTheContext) {
             return OpenGLForwarder::cgmCreateShader(file, line, type);
         }
     };
-    Pushed<Types> asked;
+    InterceptorScope<Types> asked;
     TessellationControlShader();
     TessellationEvaluationShader();
     GeometryShader();
@@ -100,7 +100,7 @@ TEST_F(ProgramTest, LinkReportsTheLog) {
     EXPECT_FAILURE("Program Link Error: \n" + LogOf(program), program.link(true));
     EXPECT_FAILURE("Program must be linked before being enabled", program.enable());
 
-    Pushed<Driver> driver;
+    InterceptorScope<Driver> driver;
     EXPECT_FAILURE("Unknown Program Link Error\n", program.link(true));
     driver->isLinked = 1;
     driver->log = "a note does not fail a link";
@@ -134,7 +134,7 @@ TEST_F(ProgramTest, DetachesByType) {
                       {true, &Program::detachAllVertexShaders, 1, 4},
                       {false, &Program::detachAllShaders, 70, 3}};
     Program program;
-    Pushed<CountingForwarder> calls;
+    InterceptorScope<CountingForwarder> calls;
     char const *const source = "void main() {}";
     for (auto const &[refill, operation, detached, passes] : rows) {
         if (refill) {

@@ -72,7 +72,7 @@ protected:
         EXPECT_EQ(before, state());
     }
 
-    Pushed<CountingForwarder> calls_;
+    InterceptorScope<CountingForwarder> calls_;
 };
 
 // With each single value away from what the scope sets, the end makes the one call that it needs.
@@ -96,7 +96,7 @@ TEST_F(ScopesTest, AlphaBlendScopePutsBackWhatDiffers) {
             OpenGLForwarder::cgmBlendEquation(file, line, 0x1234);
         }
     };
-    Pushed<Failing> failing;
+    InterceptorScope<Failing> failing;
     EXPECT_FAILURE("GL_INVALID_ENUM", TemporaryAlphaBlendScope());
     EXPECT_EQ(kOther, Blending());
 }

@@ -61,7 +61,7 @@ TEST_F(TransferTest, EveryClientFormatIsTakenOrRefused) {
 // back into memory and into a buffer. Pixel storage, none of it as it is at first, stays.
 TEST_F(TransferTest, EveryMemoryLayoutGoesThereAndBack) {
     std::vector<GLenum> storage; // of packing the alignment, as others apply
-    for (int i = Texture::PIXELSTOREMODE_PACK_ALIGNMENT;
+    for (unsigned int i = Texture::PIXELSTOREMODE_PACK_ALIGNMENT;
          i <= Texture::PIXELSTOREMODE_UNPACK_ALIGNMENT; ++i)
         storage.push_back(Texture::PixelStoreMode2GL(static_cast<Texture::PixelStoreMode>(i)));
     for (TextureKind const &kind : kTextureKinds) {
@@ -183,7 +183,7 @@ TEST_F(TransferTest, LevelsFollowTheFirst) {
             Bytes const below(kind.halved(size), 4, value);
             EXPECT_EQ(below.texels, below.read(*texture, kBytes, 1));
         };
-        Pushed<CountingForwarder> calls;
+        InterceptorScope<CountingForwarder> calls;
         texture->enableAutoMIPGeneration(true);
         Upload(*texture, 0, {{}, {1, 1, 1}}, kBytes, kTight, &buffer, std::size_t(0));
         Copy(*texture, 0, {}, 1, 1);

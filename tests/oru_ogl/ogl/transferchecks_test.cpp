@@ -41,7 +41,7 @@ TEST_F(TransferChecksTest, PartsAreCheckedInOrder) {
     for (TextureKind const &kind : kTextureKinds) {
         SCOPED_TRACE(kind.name);
         BoundTexture const texture(kind.make(kRGBA8, {16, 8, 4}, false));
-        Pushed<CountingForwarder> counter;
+        InterceptorScope<CountingForwarder> counter;
         for (auto const &[level, size, sides, text] : rows) {
             if (sides > kind.sides)
                 continue;

@@ -116,7 +116,7 @@ TEST_F(UniformsTest, EverySetterInEveryForm) {
             }
             int const location = program.getUniformLocation("u");
             program.enable();
-            Pushed<CountingForwarder> calls;
+            InterceptorScope<CountingForwarder> calls;
             c.set(program, form, location);
             if (form == LOCATION_UNSAFE) {
                 c.set(program, form, -1); // makes no call

@@ -55,7 +55,7 @@ TEST_F(WGLTest, ForwardsToThePlatform) {
     EXPECT_EQ(::wglGetProcAddress("wglSwapIntervalEXT"),
               ORU_WGL(GetProcAddress, "wglSwapIntervalEXT"));
     EXPECT_FALSE(ORU_WGL(DeleteContext, nullptr)) << "failures come back as they are";
-    Pushed<Letters> letters;
+    InterceptorScope<Letters> letters;
     WGLForwarder decorator;
     WGLInterceptor::Instance()->addInterceptor(&decorator);
     EXPECT_FAILURE("Enforce dynamic_cast<WGLErrorChecker*>(sInterceptor_) != NULL",
@@ -67,7 +67,7 @@ TEST_F(WGLTest, ForwardsToThePlatform) {
 }
 
 TEST_F(WGLTest, LoadsEachExtension) {
-    Pushed<Withholder> none;
+    InterceptorScope<Withholder> none;
     for (unsigned int value = 0; value <= UNKNOWN_OPENGL_EXTENSION; ++value)
         EXPECT_EQ(value >= 102 && value <= 112,
                   InitializeWGLExtension(static_cast<OpenGLExtension>(value)))
@@ -87,7 +87,7 @@ TEST_F(WGLTest, LoadsEachExtension) {
 TEST(WGLRecord, LacksAnExtensionWithoutItsEntryPoint) {
     AutoInitializer const library;
     _wcgmSwapIntervalEXT = nullptr;
-    Pushed<Withholder> const without(
+    InterceptorScope<Withholder> const without(
         std::set<std::string>{"wglGetSwapIntervalEXT", "wglBindTexImageARB"});
     ContextOffscreen const context;
     context.makeCurrent();
@@ -99,7 +99,7 @@ TEST(WGLRecord, LacksAnExtensionWithoutItsEntryPoint) {
     EXPECT_FALSE(Context::SupportsVerticalRetraceControl());
     EXPECT_FALSE(record.supportsRenderToTexture());
     ASSERT_TRUE(record.supportsFloatingPointTextures() && record.isSupported(GL_EXT_GPU_SHADER4));
-    Pushed<CountingForwarder> calls;
+    InterceptorScope<CountingForwarder> calls;
     EXPECT_FALSE(record.supportsFloatFiltering() || record.supportsHalfFiltering());
     EXPECT_EQ(0, calls->total());
     TestWindow const window;
