@@ -5,7 +5,6 @@
 #include "apps/common/jpegcodec.h"
 #include "apps/common/pngcodec.h"
 #include "apps/common/unicode.h"
-#include "tests/apps/common/foreignfiles.h"
 #include "tests/support/failure.h"
 #include "tests/support/pictures.h"
 #include "tests/support/program.h"
@@ -37,12 +36,7 @@ TEST(ImageFile, RoundTripOfEveryKind) {
 
 // Palettes, colour keys, few bits and interlacing become plain pixels.
 TEST(ImageFile, ForeignPngs) {
-    struct Row {
-        char const *name;
-        App::Shape shape;
-        Bytes values;
-    };
-    Row const rows[] = {
+    std::tuple<std::string, App::Shape, Bytes> const rows[] = {
         {"1bit.png", {5, 2, 1, 8}, {0, 255, 0, 255, 0, 255, 255, 0, 0, 255}},
         {"colourkey.png", {4, 1, 2, 8}, {0, 255, 85, 0, 170, 255, 255, 255}},
         {"palette-transparent.png", {3, 1, 4, 8}, {255, 0, 0, 255, 0, 200, 0, 128, 0, 0, 100, 0}},
@@ -96,7 +90,6 @@ TEST(ImageFile, TurnedJpegs) {
                 EXPECT_EQ(image.row(row)[3 * column + c], stored.row(y)[3 * x + c])
                     << "orientation " << int{orientation};
         }
-    EXPECT_EQ(Decode(Held(jpeg, 9, false)).pixels, stored.pixels);
 }
 
 // A file cut off anywhere is refused, never read half or beyond its end.
