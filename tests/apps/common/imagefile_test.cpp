@@ -77,7 +77,7 @@ TEST(ImageFile, TurnedJpegs) {
     Bytes const jpeg = Foreign("colour.jpg");
     Image const stored = Decode(jpeg);
     std::size_t const right = stored.width - 1, bottom = stored.height - 1;
-    constexpr std::size_t x = 5, y = 3;
+    std::size_t const x = 5, y = 3;
     std::pair<std::size_t, std::size_t> const places[] = {
         {x, y}, {right - x, y},  {right - x, bottom - y}, {x, bottom - y},
         {y, x}, {bottom - y, x}, {bottom - y, right - x}, {y, right - x}};
