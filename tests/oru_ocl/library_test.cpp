@@ -13,7 +13,6 @@
 #include <stdexcept>
 #include <thread>
 #include <tuple>
-#include <vector>
 
 using namespace ORU::OCL;
 using namespace oru_test;
@@ -173,9 +172,9 @@ TEST_F(LibraryTest, OpensAndClosesAgainAndAgain) {
 }
 
 TEST_F(LibraryTest, OpensAndClosesFromManyThreads) {
-    std::vector<std::thread> threads;
-    for (int i = 0; i < 8; ++i)
-        threads.emplace_back([] {
+    std::thread threads[8];
+    for (std::thread &thread : threads)
+        thread = std::thread([] {
             for (int round = 0; round < 20; ++round) {
                 Library::InitializeIfNecessary();
                 // Another thread may have closed it before.
