@@ -27,9 +27,7 @@ TEST(Extensions, HaveExactNames) {
     }
 }
 
-TEST(Ranges, HoldTheirSizes) {
-    EXPECT_TRUE(Range<3>(4) == Range<3>(4, 4, 4));
-    EXPECT_TRUE(Range<2>(1, 2) != Range<2>(1, 3));
+TEST(Ranges, RefuseOtherDimensions) {
     EXPECT_FAILURE("N==2", Range<1>(1, 2));
     EXPECT_FAILURE("N==3", Range<2>(1, 2, 3));
     EXPECT_FAILURE("i < range_.size()", Range<2>(0)[2]);
@@ -226,10 +224,9 @@ TEST_F(MemoryTest, NullHostMemoryIsRefusedBeforeAnyCall) {
 
 TEST_F(MemoryTest, ImagesAreReadWhereTheirAccessIsKnown) {
     Image2D const image(context, kReads, false, kRGBA8, 7, 5, 0);
-    std::size_t width = 0, size = 0;
-    image.getInfo(Image::IMAGEINFO_WIDTH, sizeof width, &width, &size);
+    std::size_t width = 0;
+    image.getInfo(Image::IMAGEINFO_WIDTH, sizeof width, &width, nullptr);
     EXPECT_EQ(7u, width);
-    EXPECT_EQ(sizeof width, size);
     runtime->answerNumber(CL_MEM_FLAGS, cl_mem_flags(0));
     EXPECT_FAILURE("isCompatible", queue.enqueueRead(image, {}, nullptr, 0));
 }

@@ -103,49 +103,50 @@ inline std::vector<GLint> Sampling(GLenum target, std::size_t sides) {
     return values;
 }
 
-/// `subImage` of whichever class, from memory or (with an offset behind it) from a buffer.
+/// Calls `call` with a texture as the class that it is, and with the numbers of its sides.
+template<class Call>
+void AsItsClass(Texture &texture, Call call) {
+    if (auto *const one = dynamic_cast<Texture1 *>(&texture))
+        call(*one, 0u);
+    else if (auto *const two = dynamic_cast<Texture2 *>(&texture))
+        call(*two, 0u, 1u);
+    else
+        call(dynamic_cast<Texture3 &>(texture), 0u, 1u, 2u);
+}
+
+/// `subImage` from memory, or (with an offset behind it) from a buffer.
 template<class... Source>
 void Upload(Texture &texture, int level, Box const &box, Pixel pixel,
             PixelUnpackParameters const &params, Source... source) {
-    auto const [x, y, z] = box.at;
-    auto const [format, type] = pixel;
-    std::uint64_t const w = Size(box.size[0]), h = Size(box.size[1]), d = Size(box.size[2]);
-    if (auto *const one = dynamic_cast<Texture1 *>(&texture))
-        one->subImage(level, x, w, format, type, source..., params);
-    else if (auto *const two = dynamic_cast<Texture2 *>(&texture))
-        two->subImage(level, x, y, w, h, format, type, source..., params);
-    else
-        dynamic_cast<Texture3 &>(texture).subImage(level, x, y, z, w, h, d, format, type, source...,
-                                                   params);
+    AsItsClass(texture, [&](auto &as, auto... side) {
+        as.subImage(level, box.at[side]..., Size(box.size[side])..., pixel.format, pixel.type,
+                    source..., params);
+    });
 }
 
-/// `copyTexSubImage` of whichever class, from (1, 3) in the framebuffer.
+/// `copyTexSubImage` from (1, 3) in the framebuffer.
 inline void Copy(Texture &texture, int level, Sides const &at, std::uint64_t w, std::uint64_t h) {
-    auto const [x, y, z] = at;
-    if (auto *const one = dynamic_cast<Texture1 *>(&texture))
-        one->copyTexSubImage(level, x, 1, 3, w);
-    else if (auto *const two = dynamic_cast<Texture2 *>(&texture))
-        two->copyTexSubImage(level, x, y, 1, 3, w, h);
-    else
-        dynamic_cast<Texture3 &>(texture).copyTexSubImage(level, x, y, z, 1, 3, w, h);
+    AsItsClass(texture, [&](auto &as, auto... side) {
+        if constexpr (sizeof...(side) == 1)
+            as.copyTexSubImage(level, at[side]..., 1, 3, w);
+        else
+            as.copyTexSubImage(level, at[side]..., 1, 3, w, h);
+    });
 }
 
-/// `getPixelData` of whichever class, into memory or (with an offset behind it) into a buffer.
-template<class... Offset, class Destination>
-void Download(Texture const &texture, int level, Pixel pixel, unsigned int alignment,
+/// `getPixelData` into memory, or (with an offset behind it) into a buffer.
+template<class Destination, class... Offset>
+void Download(Texture &texture, int level, Pixel pixel, unsigned int alignment,
               Destination *destination, Offset... offset) {
-    auto const [format, type] = pixel;
-    if (auto *const one = dynamic_cast<Texture1 const *>(&texture)) {
-        ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, static_cast<GLint>(alignment));
-        one->getPixelData(destination, offset..., level, Texture::Format2GL(format),
-                          Texture::Type2GL(type));
-    } else if (auto *const two = dynamic_cast<Texture2 const *>(&texture)) {
-        two->getPixelData(destination, static_cast<std::size_t>(offset)..., level, format, type,
-                          alignment);
-    } else {
-        dynamic_cast<Texture3 const &>(texture).getPixelData(destination, offset..., level, format,
-                                                             type, alignment);
-    }
+    AsItsClass(texture, [&](auto &as, auto... side) {
+        if constexpr (sizeof...(side) > 1) {
+            as.getPixelData(destination, offset..., level, pixel.format, pixel.type, alignment);
+        } else {
+            ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, static_cast<GLint>(alignment));
+            as.getPixelData(destination, offset..., level, Texture::Format2GL(pixel.format),
+                            Texture::Type2GL(pixel.type));
+        }
+    });
 }
 
 /// The texels of an image, a few components each, x fastest.
@@ -172,13 +173,13 @@ struct Image {
                             &texels[index(to.at[0], to.at[1] + y, to.at[2] + z)]);
     }
 
-    void upload(Texture &texture, Pixel pixel, int level = 0, Sides const &at = {}) const {
+    void upload(Texture &texture, Pixel pixel, int level = 0) const {
         void const *const data = texels.data();
-        Upload(texture, level, {at, size}, pixel, kTight, data);
+        Upload(texture, level, {{}, size}, pixel, kTight, data);
     }
 
     /// A level of a texture, in an image of the same size and components.
-    std::vector<T> read(Texture const &texture, Pixel pixel, int level = 0) const {
+    std::vector<T> read(Texture &texture, Pixel pixel, int level = 0) const {
         std::vector<T> result(texels.size());
         Download(texture, level, pixel, 1, static_cast<void *>(result.data()));
         return result;

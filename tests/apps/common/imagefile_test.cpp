@@ -5,7 +5,6 @@
 #include "apps/common/jpegcodec.h"
 #include "apps/common/pngcodec.h"
 #include "apps/common/unicode.h"
-#include "tests/apps/common/foreignfiles.h"
 #include "tests/support/failure.h"
 #include "tests/support/pictures.h"
 #include "tests/support/program.h"
@@ -37,12 +36,7 @@ TEST(ImageFile, RoundTripOfEveryKind) {
 
 // Palettes, colour keys, few bits and interlacing become plain pixels.
 TEST(ImageFile, ForeignPngs) {
-    struct Row {
-        char const *name;
-        App::Shape shape;
-        Bytes values;
-    };
-    Row const rows[] = {
+    std::tuple<std::string, App::Shape, Bytes> const rows[] = {
         {"1bit.png", {5, 2, 1, 8}, {0, 255, 0, 255, 0, 255, 255, 0, 0, 255}},
         {"colourkey.png", {4, 1, 2, 8}, {0, 255, 85, 0, 170, 255, 255, 255}},
         {"palette-transparent.png", {3, 1, 4, 8}, {255, 0, 0, 255, 0, 200, 0, 128, 0, 0, 100, 0}},
@@ -83,7 +77,7 @@ TEST(ImageFile, TurnedJpegs) {
     Bytes const jpeg = Foreign("colour.jpg");
     Image const stored = Decode(jpeg);
     std::size_t const right = stored.width - 1, bottom = stored.height - 1;
-    constexpr std::size_t x = 5, y = 3;
+    std::size_t const x = 5, y = 3;
     std::pair<std::size_t, std::size_t> const places[] = {
         {x, y}, {right - x, y},  {right - x, bottom - y}, {x, bottom - y},
         {y, x}, {bottom - y, x}, {bottom - y, right - x}, {y, right - x}};
@@ -96,7 +90,6 @@ TEST(ImageFile, TurnedJpegs) {
                 EXPECT_EQ(image.row(row)[3 * column + c], stored.row(y)[3 * x + c])
                     << "orientation " << int{orientation};
         }
-    EXPECT_EQ(Decode(Held(jpeg, 9, false)).pixels, stored.pixels);
 }
 
 // A file cut off anywhere is refused, never read half or beyond its end.

@@ -4,7 +4,6 @@
 #include "apps/common/imagefile.h"
 #include "apps/common/pngcodec.h"
 #include "apps/common/unicode.h"
-#include "tests/apps/common/foreignfiles.h"
 #include "tests/support/pictures.h"
 #include "tests/support/program.h"
 

@@ -24,20 +24,14 @@ std::string Written(ExceptionBase const &e) {
 
 TEST(Checks, ThrowTheirTextAndPosition) {
     long const failed = -1;
-    auto const check = [](std::string const &text, int line, auto const &call) {
-        EXPECT_THROW(call(), InternalException);
-        oru_test::Failure const failure = oru_test::FailureOf(call);
-        EXPECT_EQ(failure.text, text);
-        EXPECT_EQ(failure.file, "tests/core/exceptions/exceptions_test.cpp");
-        EXPECT_EQ(failure.line, line);
-    };
-    // clang-format off
-    check("std::is_same<int, char>::value", __LINE__, [] { ORU_ASSERT(std::is_same<int, char>::value); });
-    check("Enforce failed > 0", __LINE__, [&] { ORU_ENFORCE(failed > 0); });
-    check("Enforce bFound", __LINE__, [&] { ORU_ENFORCE_TEXT("bFound", failed > 0); });
-    check("long(failed)", __LINE__, [&] { ORU_ASSERT_SUCCEEDED(long(failed)); });
-    check("Mode 4711", __LINE__, [] { ORU_THROW_INTERNAL(ComposeText("Mode ", 4711)); });
-    // clang-format on
+    EXPECT_FAILURE("std::is_same<int, char>::value", ORU_ASSERT(std::is_same<int, char>::value));
+    EXPECT_FAILURE("Enforce failed > 0", ORU_ENFORCE(failed > 0));
+    EXPECT_FAILURE("Enforce bFound", ORU_ENFORCE_TEXT("bFound", failed > 0));
+    EXPECT_FAILURE("long(failed)", ORU_ASSERT_SUCCEEDED(long(failed)));
+    EXPECT_FAILURE("Mode 4711", ORU_THROW_INTERNAL(ComposeText("Mode ", 4711)));
+    oru_test::Failure const here = oru_test::FailureOf([&] { ORU_ASSERT(failed > 0); });
+    EXPECT_EQ(here.line, __LINE__ - 1);
+    EXPECT_EQ(here.file, "tests/core/exceptions/exceptions_test.cpp");
 }
 
 // The handler and the exception's class lie in programs with run-times of their own.

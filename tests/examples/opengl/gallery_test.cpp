@@ -24,7 +24,5 @@ TEST(Gallery, DrawsItsPictures) {
 TEST(Gallery, ReportsFailures) {
     TemporaryFolder const folder;
     EXPECT_EQ(2, RunProgram("hello_offscreen.exe", "", folder.path()).exitCode);
-    Outcome const unwritable = RunProgram("hello_offscreen.exe", "no/folder.png", folder.path());
-    EXPECT_EQ(1, unwritable.exitCode);
-    EXPECT_NE("", unwritable.errors);
+    EXPECT_EQ(1, RunProgram("hello_offscreen.exe", "no/folder.png", folder.path()).exitCode);
 }

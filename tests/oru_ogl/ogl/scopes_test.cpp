@@ -14,13 +14,8 @@ namespace {
 using Values = std::vector<GLint>;
 
 /// What an alpha blend scope sets, and other values than those, of no two alike.
-Values const kAlpha = {1,
-                       GL_ONE_MINUS_SRC_ALPHA,
-                       GL_ONE_MINUS_SRC_ALPHA,
-                       GL_SRC_ALPHA,
-                       GL_SRC_ALPHA,
-                       GL_FUNC_ADD,
-                       GL_FUNC_ADD};
+constexpr GLint kOneMinusAlpha = GL_ONE_MINUS_SRC_ALPHA, kAdd = GL_FUNC_ADD;
+Values const kAlpha = {1, kOneMinusAlpha, kOneMinusAlpha, GL_SRC_ALPHA, GL_SRC_ALPHA, kAdd, kAdd};
 Values const kOther = {0, GL_ZERO, GL_ONE, GL_DST_COLOR, GL_DST_ALPHA, GL_MIN, GL_MAX};
 
 Values Blending() {
@@ -46,11 +41,6 @@ void SetBlending(Values const &v) {
     Switch(GL_BLEND, v[0]);
     ORU_GL(BlendFuncSeparate, gl[4], gl[2], gl[3], gl[1]);
     ORU_GL(BlendEquationSeparate, gl[6], gl[5]);
-}
-
-void SetStippling(Values const &v) {
-    Switch(GL_LINE_STIPPLE, v[0]);
-    ORU_GL(LineStipple, v[1], static_cast<GLushort>(v[2]));
 }
 
 } // namespace
@@ -134,16 +124,16 @@ TEST_F(ScopesTest, LineScopesChangeWhatIsNotAsWanted) {
 
 TEST_F(ScopesTest, StippleScopeOverEveryState) {
     if (IsCoreRun()) {
-        calls_->reset();
-        EXPECT_NE("", MessageOf([] { TemporaryLineStippleScope(1, 2, 0xAAAA); }));
-        EXPECT_EQ(0, calls_->total());
+        std::string const text = MessageOf([] { TemporaryLineStippleScope(1, 2, 0xAAAA); });
+        EXPECT_EQ(0u, text.find("Line stippling needs a compatibility context")) << text;
         return;
     }
     Values const stipples[] = {{0, 0, 0}, {1, 3, 0x00FF}, {1, 4, 0x00FF}, {1, 3, 0x0F0F}};
     auto const calls = [](Values const &to) { return to[0] ? "Enable LineStipple " : "Disable "; };
     for (Values const &found : stipples) {
         for (Values const &wanted : stipples) {
-            SetStippling(found);
+            Switch(GL_LINE_STIPPLE, found[0]);
+            ORU_GL(LineStipple, found[1], static_cast<GLushort>(found[2]));
             bool const same = found == wanted;
             expectScope<TemporaryLineStippleScope>(Stippling, wanted, same ? "" : calls(wanted),
                                                    same ? "" : calls(found),

@@ -19,17 +19,6 @@ Sides LevelSides(GLenum target, int level) {
             OfLevel(target, level, GL_TEXTURE_DEPTH)};
 }
 
-/// `setWrap` of whichever class.
-void SetWrap(Texture &texture, std::array<Texture::WrapMode, 3> const &modes) {
-    auto const [s, t, r] = modes;
-    if (auto *const one = dynamic_cast<Texture1 *>(&texture))
-        one->setWrap(s);
-    else if (auto *const two = dynamic_cast<Texture2 *>(&texture))
-        two->setWrap(s, t);
-    else
-        dynamic_cast<Texture3 &>(texture).setWrap(s, t, r);
-}
-
 } // namespace
 
 TEST(TextureTables, TranslateBothWays) {
@@ -74,7 +63,8 @@ TEST_F(TextureTest, KnowsEveryInternalFormat) {
     }
 }
 
-// Every kind: its levels, and the binding that its constructor found.
+// Every kind: its levels, and the binding that its constructor found, also when OpenGL refuses the
+// size (and the fixture misses no name).
 TEST_F(TextureTest, IsAllocatedAndLeavesTheBindingAlone) {
     for (TextureKind const &kind : kTextureKinds) {
         SCOPED_TRACE(kind.name);
@@ -89,6 +79,8 @@ TEST_F(TextureTest, IsAllocatedAndLeavesTheBindingAlone) {
             EXPECT_TRUE(texture->isBound());
             EXPECT_EQ(GL_RGBA8, OfLevel(kind.target, 0, GL_TEXTURE_INTERNAL_FORMAT));
             EXPECT_EQ(4 * level[0] * level[1] * level[2], texture->sizeInBytes());
+            EXPECT_EQ(Size(level[0] / 2), texture->width(1));
+            EXPECT_EQ(0u, texture->width(64));
             int const levels = mipmapped && kind.mipmaps() ? 4 : 1;
             for (int i = 0; i < levels; ++i, level = kind.halved(level))
                 EXPECT_EQ(level, LevelSides(kind.target, i)) << "level " << i;
@@ -97,7 +89,12 @@ TEST_F(TextureTest, IsAllocatedAndLeavesTheBindingAlone) {
             expected.resize(2 + kind.sides, GL_CLAMP_TO_EDGE);
             EXPECT_EQ(expected, Sampling(kind.target, kind.sides));
         }
+        occupant.bind();
+        EXPECT_FAILURE("GL_INVALID_VALUE", kind.make(kRGBA8, {1 << 15, 4, 4}, false));
+        EXPECT_TRUE(occupant->isBound());
     }
+    EXPECT_FAILURE("GL_INVALID_VALUE", Texture2D(kRGBA8, (1ull << 32) + 4, 4, false))
+        << "it would wrap around as a 32-bit number";
 }
 
 // Core contexts refuse GL_CLAMP before any call.
@@ -109,42 +106,22 @@ TEST_F(TextureTest, SetsParametersOfTheBoundTexture) {
         SCOPED_TRACE(kind.name);
         BoundTexture const texture(kind.make(kRGBA8, {4, 4, 4}, false));
         texture->setFilter(Texture::FILTER_LINEAR, Texture::FILTER_NEAREST);
-        auto const border = Texture::WRAPMODE_CLAMP_TO_BORDER,
-                   edge = Texture::WRAPMODE_CLAMP_TO_EDGE, repeat = Texture::WRAPMODE_REPEAT,
-                   clamp = Texture::WRAPMODE_CLAMP;
-        SetWrap(*texture, {border, edge, repeat});
+        auto const setWrap = [&texture](std::array<Texture::WrapMode, 3> const &modes) {
+            AsItsClass(*texture, [&](auto &as, auto... side) { as.setWrap(modes[side]...); });
+        };
+        auto const border = Texture::WRAPMODE_CLAMP_TO_BORDER, repeat = Texture::WRAPMODE_REPEAT,
+                   edge = Texture::WRAPMODE_CLAMP_TO_EDGE, clamp = Texture::WRAPMODE_CLAMP;
+        setWrap({border, edge, repeat});
         std::vector<GLint> expected = {GL_LINEAR, GL_NEAREST, GL_CLAMP_TO_BORDER, GL_CLAMP_TO_EDGE,
                                        GL_REPEAT};
         expected.resize(2 + kind.sides);
         EXPECT_EQ(expected, Sampling(kind.target, kind.sides));
-        EXPECT_FAILURE(refusal, SetWrap(*texture, {clamp, clamp, clamp}));
+        EXPECT_FAILURE(refusal, setWrap({clamp, clamp, clamp}));
         if (!IsCoreRun())
             std::fill(expected.begin() + 2, expected.end(), GL_CLAMP);
         EXPECT_EQ(expected, Sampling(kind.target, kind.sides));
     }
     Texture2D plane(kRGBA8, 4, 4, false);
     EXPECT_FAILURE("Texture must be enabled (bound & active)",
-                   SetWrap(plane, {Texture::WRAPMODE_CLAMP}));
-}
-
-TEST_F(TextureTest, TellsItsSizePerLevel) {
-    Texture2D const plane(Texture::INTERNALFORMAT_RG16, 8, 5, true);
-    std::vector<std::uint64_t> const sizes = {plane.width(3), plane.width(4), plane.width(64),
-                                              plane.height(1), plane.depth(1)};
-    EXPECT_EQ((std::vector<std::uint64_t>{1, 0, 0, 2, 0}), sizes);
-    EXPECT_EQ(1u, Texture1DArray(Texture::INTERNALFORMAT_RED, 8, 6, true).depth(2));
-    EXPECT_EQ(6u, Texture2DArray(Texture::INTERNALFORMAT_RED, 8, 8, 6, true).depth(2));
-    EXPECT_EQ(1u, Texture3D(Texture::INTERNALFORMAT_RED, 8, 8, 6, true).depth(2));
-}
-
-// OpenGL refuses the size: the binding stays (and the fixture misses no name), and a size that
-// would wrap around as a 32-bit number is refused too.
-TEST_F(TextureTest, FailedConstructionLeavesNothing) {
-    for (TextureKind const &kind : kTextureKinds) {
-        SCOPED_TRACE(kind.name);
-        BoundTexture const occupant(kind.make(kRGBA8, {2, 2, 2}, false));
-        EXPECT_FAILURE("GL_INVALID_VALUE", kind.make(kRGBA8, {1 << 15, 4, 4}, false));
-        EXPECT_TRUE(occupant->isBound());
-    }
-    EXPECT_FAILURE("GL_INVALID_VALUE", Texture2D(kRGBA8, (1ull << 32) + 4, 4, false));
+                   plane.setWrap(Texture::WRAPMODE_CLAMP, Texture::WRAPMODE_CLAMP));
 }

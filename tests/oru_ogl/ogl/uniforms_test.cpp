@@ -12,6 +12,8 @@ namespace {
 
 using Floats = std::vector<float>;
 
+std::string const kHead = "#version 120\n#extension GL_ARB_texture_rectangle : enable\nuniform ";
+
 enum Form { LOCATION, NAME, LOCATION_UNSAFE, NAME_UNSAFE };
 
 /// A setter with values for the uniform `u`, and what the program must hold then.
@@ -89,10 +91,6 @@ std::vector<Case> Cases() {
         ORU_MATRIX("mat3", 3, setUniformMatrix3, setUniformMatrices3),
         ORU_MATRIX("mat4", 4, setUniformMatrix4, setUniformMatrices4),
     };
-#undef ORU_MATRIX
-#undef ORU_ARRAYS
-#undef ORU_VALUES
-#undef ORU_CASE
 }
 
 } // namespace
@@ -102,9 +100,7 @@ class UniformsTest : public ObjectTest {};
 // Every setter in every form: its calls, what it sets, and what it refuses.
 TEST_F(UniformsTest, EverySetterInEveryForm) {
     for (Case const &c : Cases()) {
-        std::string const source = "#version 120\n#extension GL_ARB_texture_rectangle : enable\n"
-                                   "uniform " +
-                                   c.type + " u" + c.index(c.elements) +
+        std::string const source = kHead + c.type + " u" + c.index(c.elements) +
                                    "; void main() { gl_FragColor = vec4(float(" + c.use + ")); }";
         for (Form const form : {LOCATION, NAME, LOCATION_UNSAFE, NAME_UNSAFE}) {
             SCOPED_TRACE(c.type + c.index(c.elements) + " in form " + std::to_string(form));
@@ -135,7 +131,6 @@ TEST_F(UniformsTest, EverySetterInEveryForm) {
             bool const asks = form == LOCATION || (form == NAME && !isArray);
             EXPECT_FAILURE(asks ? "Program must be enabled to set uniform parameter" : "",
                            c.set(program, form, location));
-            other.disable();
         }
     }
 }

@@ -246,7 +246,8 @@ auto Call(std::string const &name, Result (CL_API_CALL *FunctionTable::*slot)(Pa
         } else {
             auto const setError = [code](auto argument) {
                 if constexpr (std::is_same_v<decltype(argument), cl_int *>)
-                    *argument = code;
+                    if (argument)
+                        *argument = code;
             };
             (setError(arguments), ...);
             Result const result = code == CL_SUCCESS ? (kFunctions.*slot)(arguments...) : nullptr;
