@@ -37,42 +37,20 @@ bool FiltersHalvesLinearly() {
 }
 } // namespace ORU::OGL::internal
 
-namespace {
-
-/// A rendering context of the host, current for its lifetime.
-class HostContext {
-public:
-    HostContext() {
-        PIXELFORMATDESCRIPTOR format = {};
-        format.nSize = sizeof format;
-        format.dwFlags = PFD_DRAW_TO_WINDOW | PFD_SUPPORT_OPENGL;
-        ::SetPixelFormat(dc_, ::ChoosePixelFormat(dc_, &format), &format);
-        rc_ = ::wglCreateContext(dc_);
-        EXPECT_TRUE(::wglMakeCurrent(dc_, rc_));
-    }
-    ~HostContext() {
-        ::wglMakeCurrent(nullptr, nullptr);
-        ::wglDeleteContext(rc_);
-        ::ReleaseDC(window_.hwnd(), dc_);
-    }
-    HostContext(HostContext const &) = delete;
-    HostContext &operator=(HostContext const &) = delete;
-
-private:
-    oru_test::TestWindow window_;
-    HDC dc_ = ::GetDC(window_.hwnd());
-    HGLRC rc_ = nullptr;
-};
-
 template<class Function>
-PROC Address(Function function) {
+static PROC Address(Function function) {
     return reinterpret_cast<PROC>(reinterpret_cast<void *>(function));
 }
 
-} // namespace
-
 TEST(AppendedRows, LoadAndAreFoundByName) {
-    HostContext const context;
+    oru_test::TestWindow const window; // for a rendering context of the host
+    HDC const dc = ::GetDC(window.hwnd());
+    PIXELFORMATDESCRIPTOR format = {};
+    format.nSize = sizeof format;
+    format.dwFlags = PFD_DRAW_TO_WINDOW | PFD_SUPPORT_OPENGL;
+    ::SetPixelFormat(dc, ::ChoosePixelFormat(dc, &format), &format);
+    HGLRC const rc = ::wglCreateContext(dc);
+    ASSERT_TRUE(::wglMakeCurrent(dc, rc));
     FunctionTable const &table = ExtensionManager::CurrentTable();
     ExtensionManager &record = *ExtensionManager::Instance();
     OpenGLExtension const appended = record.nameToEnumGL("GL_ARB_compute_shader");
@@ -91,4 +69,6 @@ TEST(AppendedRows, LoadAndAreFoundByName) {
     InterceptorScope<OpenGLTracer> const tracer(text);
     EXPECT_THROW(ORU_GL(DispatchCompute, 1, 2, 3), ExceptionOGL) << "no program is in use";
     EXPECT_NE(std::string::npos, text.str().find("glDispatchCompute(1, 2, 3)"));
+    ::wglMakeCurrent(nullptr, nullptr);
+    ::wglDeleteContext(rc);
 }

@@ -17,114 +17,82 @@ namespace {
 using ProgramTest = QueueTest;
 using CommandQueueTest = QueueTest;
 
-char const *const threeKernels = R"(
-#ifndef FACTOR
-#define FACTOR 1
-#endif
-kernel void scale(global int *data) { data[get_global_id(0)] *= FACTOR; }
-kernel void add(global int *data, int amount) { data[get_global_id(0)] += amount; }
-kernel void clear(global int *data) { data[get_global_id(0)] = 0; }
-)";
-
-std::vector<unsigned char> BinaryOf(Program const &program) {
-    std::size_t size = 0;
-    ORU_CL(GetProgramInfo, program.id(), CL_PROGRAM_BINARY_SIZES, sizeof size, &size, nullptr);
-    std::vector<unsigned char> binary(size);
-    unsigned char *pointer = binary.data();
-    ORU_CL(GetProgramInfo, program.id(), CL_PROGRAM_BINARIES, sizeof pointer, &pointer, nullptr);
-    return binary;
-}
-
 } // namespace
 
 TEST_F(ProgramTest, AFailedBuildLeavesALogAndAProgramToBuildAgain) {
-    Device const device = ComputeTest::device();
     Program program(context, "kernel void f(global int *d) { d[0] = VALUE; }");
     EXPECT_EQ(Program::BUILD_STATUS_NONE, program.buildStatus(device));
     EXPECT_FAILURE("OCL Exception: CL_BUILD_PROGRAM_FAILURE", program.build(""));
-    void *const none = nullptr;
-    EXPECT_EQ(TextOf(program.id(), 1, device.id(), "null", none, none),
-              runtime()->arguments("clBuildProgram"));
+    EXPECT_EQ(TextOf(program.id(), 1, device.id(), "null", kNone, kNone),
+              runtime->arguments("clBuildProgram"));
     EXPECT_EQ(Program::BUILD_STATUS_ERROR, program.buildStatus(device));
     std::string const log = program.buildLog(device);
     EXPECT_NE(std::string::npos, log.find("VALUE")) << log;
     EXPECT_EQ(std::string::npos, log.find('\0'));
-    auto const notify = [](cl_program, void *) {};
+    auto *const notify = +[](cl_program, void *) {};
     program.buildAsync({}, "-D VALUE=5", {notify, &program});
-    EXPECT_EQ(TextOf(program.id(), 0, "null", "-D VALUE=5", AddressOf(notify), &program),
-              runtime()->arguments("clBuildProgram"));
+    EXPECT_EQ(
+        TextOf(program.id(), 0, "null", "-D VALUE=5", reinterpret_cast<void *>(notify), &program),
+        runtime->arguments("clBuildProgram"));
     EXPECT_EQ(Program::BUILD_STATUS_SUCCESS, program.buildStatus(device));
-    EXPECT_FAILURE("OCL Exception: CL_INVALID_KERNEL_NAME", program.kernel("g"));
 }
 
 TEST_F(ProgramTest, EveryKernelIsCreatedOnce) {
     // The source ends at its first NUL.
-    Program const program = build(threeKernels + std::string("\0this is no OpenCL C", 20));
-    unsigned int const before = runtime()->liveHandles();
+    std::string const kernels = "kernel void f() {} kernel void g() {}";
+    Program const program = built(kernels + std::string("\0this is no OpenCL C", 20));
     std::set<std::string> names;
     for (Kernel const &kernel : program.kernels()) {
         char name[64] = {};
         ORU_CL(GetKernelInfo, kernel.id(), CL_KERNEL_FUNCTION_NAME, sizeof name, name, nullptr);
         names.insert(name);
-        EXPECT_EQ(1, runtime()->references(kernel.id()));
+        EXPECT_EQ(1, runtime->references().at(kernel.id()));
     }
-    EXPECT_EQ((std::set<std::string>{"scale", "add", "clear"}), names);
-    EXPECT_EQ(before, runtime()->liveHandles());
+    EXPECT_EQ((std::set<std::string>{"f", "g"}), names);
 }
 
 TEST_F(ProgramTest, BinariesMakeTheSameProgram) {
-    // The option, too, is in the binary.
-    std::vector<unsigned char> const binary = BinaryOf(build(threeKernels, "-D FACTOR=7"));
-    Device const device = ComputeTest::device();
-    std::size_t const size = binary.size();
-    unsigned char const *bytes = binary.data();
+    Program const source = built("kernel void f() {}");
+    std::size_t size = 0;
+    ORU_CL(GetProgramInfo, source.id(), CL_PROGRAM_BINARY_SIZES, sizeof size, &size, nullptr);
+    std::vector<unsigned char> binary(size);
+    unsigned char *to = binary.data();
+    ORU_CL(GetProgramInfo, source.id(), CL_PROGRAM_BINARIES, sizeof to, &to, nullptr);
+    unsigned char const *bytes = to;
     for (Program::BinaryArray const &array : {Program::BinaryArray({device}, {size}, {binary}),
                                               Program::BinaryArray({device.id()}, &size, &bytes)}) {
         EXPECT_NE(bytes, array.binaries()[0]);
         Program program(context, array);
         EXPECT_EQ(TextOf(context.id(), 1, device.id(), size),
-                  runtime()->arguments("clCreateProgramWithBinary"));
+                  runtime->arguments("clCreateProgramWithBinary"));
         program.build("");
-        std::vector<int> values = Counting<int>(10);
-        Buffer const buffer = bufferOf(values);
-        queue.enqueueKernel(KernelOf(program, "scale", buffer), Range<1>(10), 0, 0);
-        for (int &value : values)
-            value *= 7;
-        EXPECT_EQ(values, contents<int>(buffer, 10));
+        EXPECT_NE(nullptr, program.kernel("f").id());
     }
     EXPECT_FAILURE("devs.size() == sizes.size()", Program::BinaryArray({device}, {}, {}));
-    EXPECT_FAILURE("sizes.size() == binaries.size()",
-                   Program::BinaryArray({device, device}, {size, size}, {binary}));
-    EXPECT_FAILURE("OCL Exception: CL_INVALID_BINARY",
-                   Program(context, Program::BinaryArray({device}, {4}, {{1, 2, 3, 4}})));
+    EXPECT_FAILURE("sizes.size() == binaries.size()", Program::BinaryArray({device}, {size}, {}));
 }
 
 TEST_F(ProgramTest, ArgumentsArriveInTheirTypes) {
-    Program const program = build(R"(
-kernel void take(global float *f, global int *i, float2 f2, float4 f4, int2 i2, int4 i4, int scalar,
-                 local int *scratch, read_only image2d_t image) {
-    scratch[0] = scalar;
-    vstore2(f2, 0, f); vstore4(f4, 0, f + 2);
-    vstore2(i2, 0, i); vstore4(i4, 0, i + 2);
-    i[6] = scratch[0]; i[7] = get_image_width(image); i[8] = get_image_height(image);
-})");
-    Buffer const floats(context, writes, false, 6 * sizeof(float));
-    Buffer const ints(context, writes, false, 9 * sizeof(int));
-    Image2D const image(context, reads, false, rgba8, 11, 13, 0);
-    int const scalar = 42;
-    Kernel take = KernelOf(program, "take", floats);
-    take.setArg(1, ints);
-    take.setArg(2, TVec2<float>(1.5f, -2.5f));
-    take.setArg(3, TVec4<float>(3, 4, 5, 6));
-    take.setArg(4, TVec2<int>(-7, 8));
-    take.setArg(5, TVec4<int>(9, 10, -11, 12));
-    take.setArg(6, &scalar, sizeof scalar);
-    take.setArg(7, nullptr, 16);
-    take.setArg(8, image);
-    queue.enqueueKernel(take, Range<1>(1), 0, 0);
-    EXPECT_EQ((std::vector<float>{1.5f, -2.5f, 3, 4, 5, 6}), contents<float>(floats, 6));
-    EXPECT_EQ((std::vector<int>{-7, 8, 9, 10, -11, 12, 42, 11, 13}), contents<int>(ints, 9));
-    EXPECT_FAILURE("OCL Exception: CL_INVALID_ARG_INDEX", take.setArg(9, &scalar, sizeof scalar));
+    Kernel kernel = built("kernel void f(float2 a, float4 b, int2 c, int4 d, int e, "
+                          "local int *scratch, read_only image2d_t image) {}")
+                        .kernel("f");
+    auto const passed = [&](unsigned int index, void const *value, std::size_t size) {
+        EXPECT_EQ(TextOf(kernel.id(), index, size, value), runtime->arguments("clSetKernelArg"));
+    };
+    auto const passes = [&](unsigned int index, auto const &value) {
+        kernel.setArg(index, value);
+        passed(index, &value, sizeof value);
+    };
+    passes(0, TVec2<float>(1.5f, -2.5f));
+    passes(1, TVec4<float>(3, 4, 5, 6));
+    passes(2, TVec2<int>(-7, 8));
+    passes(3, TVec4<int>(9, 10, -11, 12));
+    passes(4, 42);
+    kernel.setArg(5, nullptr, 16);
+    passed(5, nullptr, 16);
+    Image2D const image(context, kReads, false, kRGBA8, 11, 13, 0);
+    kernel.setArg(6, image);
+    passed(6, &image.id(), sizeof(cl_mem));
 }
 
 TEST_F(CommandQueueTest, QueuesHaveThePropertiesAskedFor) {
@@ -132,19 +100,19 @@ TEST_F(CommandQueueTest, QueuesHaveThePropertiesAskedFor) {
                                                     CL_QUEUE_OUT_OF_ORDER_EXEC_MODE_ENABLE,
                                                     CL_QUEUE_OUT_OF_ORDER_EXEC_MODE_ENABLE};
     for (int i = 0; i < 4; ++i) {
-        CommandQueue const made(context, device(), i >= 2, i % 2 == 1);
-        EXPECT_EQ(TextOf(context.id(), device().id(), expected[i]),
-                  runtime()->arguments("clCreateCommandQueue"));
+        CommandQueue const made(context, device, i >= 2, i % 2 == 1);
+        EXPECT_EQ(TextOf(context.id(), device.id(), expected[i]),
+                  runtime->arguments("clCreateCommandQueue"));
     }
 }
 
 TEST_F(CommandQueueTest, CommandsPassWhatTheyAreGivenAndTheirWaits) {
     std::vector<int> values(64);
     int *const data = values.data();
-    Buffer buffer = bufferOf(values);
-    Image2D const image(context, both, false, rgba8, 4, 4, 0);
+    Buffer buffer(context, kBoth, false, 256);
+    Image2D const image(context, kBoth, false, kRGBA8, 4, 4, 0);
     ORU::IntegerRect const rect({1, 2}, {3, 1});
-    Kernel const kernel = KernelOf(build(threeKernels), "clear", buffer);
+    Kernel const kernel = built("kernel void f() {}").kernel("f");
     std::vector<Memory> const objects = {image, buffer};
     using Waits = CommandQueue::WaitList;
     struct Command {
@@ -171,10 +139,6 @@ TEST_F(CommandQueueTest, CommandsPassWhatTheyAreGivenAndTheirWaits) {
          [&](Waits const &waits) {
              queue.enqueueKernel(kernel, Range<2>(8, 6), {0, 9}, 0, waits);
          }},
-        {"clEnqueueNDRangeKernel", TextOf(kernel.id(), 3, "null", 8, 6, 4, 4, 3, 2),
-         [&](Waits const &waits) {
-             queue.enqueueKernel(kernel, Range<3>(8, 6, 4), {4, 3, 2}, 0, waits);
-         }},
         {"clEnqueueAcquireGLObjects", TextOf(2, image.id(), buffer.id()),
          [&](Waits const &waits) { queue.enqueueAcquireGLObjects(objects, waits); }},
         {"clEnqueueReleaseGLObjects", TextOf(2, image.id(), buffer.id()),
@@ -188,29 +152,24 @@ TEST_F(CommandQueueTest, CommandsPassWhatTheyAreGivenAndTheirWaits) {
             command.enqueue(waits);
             EXPECT_EQ(TextOf(queue.id()) + command.arguments + TextOf(count) +
                           (count > 0 ? waitsText : TextOf("null")),
-                      runtime()->arguments(command.entryPoint))
+                      runtime->arguments(command.entryPoint))
                 << command.entryPoint;
         }
         waits.push_back(queue.enqueueMarker());
         waitsText += TextOf(waits.back().id());
         Event::WaitForEvents(waits);
-        EXPECT_EQ(TextOf(count + 1) + waitsText, runtime()->arguments("clWaitForEvents"));
+        EXPECT_EQ(TextOf(count + 1) + waitsText, runtime->arguments("clWaitForEvents"));
     }
     queue.finish();
 }
 
 TEST_F(CommandQueueTest, EventsTellAboutTheirCommand) {
-    int const value = 1;
-    Buffer buffer(context, both, false, sizeof value);
-    Event const write = queue.enqueueWrite(buffer, 0, sizeof value, &value);
     Event const marker = queue.enqueueMarker();
     queue.enqueueBarrier();
     queue.finish();
-    EXPECT_EQ(unsigned(CL_COMMAND_WRITE_BUFFER), write.commandType());
     EXPECT_EQ(unsigned(CL_COMMAND_MARKER), marker.commandType());
     EXPECT_EQ(CL_COMPLETE, marker.commandExecutionStatus());
     CommandQueue const same = marker.commandQueue();
     EXPECT_EQ(queue.id(), same.id());
-    EXPECT_EQ(2, runtime()->references(queue.id()));
-    EXPECT_FAILURE("OCL Exception: CL_INVALID_VALUE", Event::WaitForEvents({}));
+    EXPECT_EQ(2, runtime->references().at(queue.id()));
 }

@@ -1,11 +1,14 @@
-// Every entry point that the layer calls is made to fail once.
+// Memory over OpenGL objects, and every entry point that the layer calls made to fail once.
 #include "oru/core/utility/integerrect.h"
 #include "oru/oru_ocl/exceptionocl.h"
 #include "oru/oru_ocl/sampler.h"
+#include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
+#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"
+#include "oru/oru_ogl/platformgl.h"
 #include "tests/support/computetest.h"
 
 #include <fstream>
@@ -17,25 +20,39 @@ using namespace oru_test;
 
 namespace {
 
-constexpr auto RGBA8 = OGL::Texture::INTERNALFORMAT_RGBA8;
+namespace OGL = ORU::OGL;
 
-/// One object of each kind, for the failing calls to work on.
-class FailuresTest : public SharingTest {
+/// With an OpenGL context, current.
+class OpenGLTest : public QueueTest {
 protected:
-    std::vector<int> values = std::vector<int>(64);
+    OpenGLTest() { glContext_.makeCurrent(); }
+
+    void TearDown() override { EXPECT_EQ(GLenum(GL_NO_ERROR), ::glGetError()); }
+
+private:
+    OGL::AutoInitializer library_;
+    OGL::ContextOffscreen glContext_;
+};
+
+/// One object of each kind.
+class FailuresTest : public OpenGLTest {
+protected:
     OGL::Buffer glBuffer{64, OGL::Buffer::TYPE_ARRAY_BUFFER, OGL::Buffer::USAGE_STATIC_DRAW,
                          nullptr};
-    OGL::Texture2D glTexture{RGBA8, 4, 4, false};
-    OGL::Texture3D glVolume{RGBA8, 4, 4, 4, false};
+    OGL::Texture2D glTexture{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4, true};
+    OGL::TextureRECT glRectangle{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4};
+    OGL::Texture3D glVolume{OGL::Texture::INTERNALFORMAT_RGBA8, 4, 4, 4, true};
     OGL::Renderbuffer glRenderbuffer{GL_RGBA8, 4, 4};
-    Buffer buffer{context, both, false, 64};
-    Buffer shared{context, both, glBuffer};
-    Image2D image{context, both, false, rgba8, 4, 4, 0};
+    Buffer buffer{context, kBoth, false, 64};
+    Buffer shared{context, kBoth, glBuffer};
+    Image2D image{context, kBoth, false, kRGBA8, 4, 4, 0};
     Sampler sampler{context, false, Sampler::ADDRESS_CLAMP, Sampler::FILTER_NEAREST};
-    Program program = build("kernel void f(global int *v) { v[0] = 0; }");
+    Program program = built("kernel void f(global int *v) {}");
     Kernel kernel = program.kernel("f");
     Event event = queue.enqueueMarker();
 };
+
+using SharingTest = FailuresTest;
 
 struct Case {
     char const *entryPoint; ///< without its "cl"
@@ -53,36 +70,52 @@ std::string SourceLine(std::string const &file, int line) {
 
 } // namespace
 
+TEST_F(SharingTest, TheRuntimeIsToldTheObject) {
+    // Of an access that is none the runtime is told nothing.
+    cl_mem_flags const flags[] = {CL_MEM_READ_ONLY, CL_MEM_WRITE_ONLY, CL_MEM_READ_WRITE, 0};
+    for (int i = 0; i < 4; ++i) {
+        auto const access = Memory::MemoryAccessFlags(i);
+        auto const passes = [&](Memory const &, char const *entryPoint, auto... object) {
+            EXPECT_EQ(TextOf(context.id(), flags[i], object...), runtime->arguments(entryPoint));
+        };
+        passes(Buffer(context, access, glBuffer), "clCreateFromGLBuffer", glBuffer.objectID());
+        passes(Image2D(context, access, glTexture, 2), "clCreateFromGLTexture2D", GL_TEXTURE_2D, 2,
+               glTexture.objectID());
+        passes(Image2D(context, access, glRectangle, 0), "clCreateFromGLTexture2D",
+               GL_TEXTURE_RECTANGLE, 0, glRectangle.objectID());
+        passes(Image2D(context, access, glRenderbuffer), "clCreateFromGLRenderbuffer",
+               glRenderbuffer.objectID());
+        passes(Image3D(context, access, glVolume, 2), "clCreateFromGLTexture3D", GL_TEXTURE_3D, 2,
+               glVolume.objectID());
+    }
+}
+
 TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
-    ContextProperties const properties(platform());
-    Platform const plat = properties.platform();
-    Device const dev = device();
-    std::size_t const length = 2;
-    unsigned char const bytes[2] = {};
-    unsigned char const *pointer = bytes;
-    Program::BinaryArray const binaries({dev.id()}, &length, &pointer);
+    ContextProperties const properties(platform);
+    Program::BinaryArray const binaries({device}, {2}, {{0, 0}});
     ORU::IntegerRect const rect({0, 0}, {2, 2});
-    void *const data = values.data();
+    int values[16] = {};
+    void *const data = values;
     Case const cases[] = {
         {"GetPlatformIDs", [] { platforms(); }, 2},
-        {"GetPlatformInfo", [&] { plat.profile(); }, 2},
-        {"GetDeviceIDs", [&] { plat.devices(Device::TYPE_ALL); }, 2},
-        {"GetDeviceInfo", [&] { dev.type(); }},
-        {"GetDeviceInfo", [&] { dev.name(); }, 2},
-        {"CreateContext", [&] { Context(properties, dev); }},
+        {"GetPlatformInfo", [&] { platform.profile(); }, 2},
+        {"GetDeviceIDs", [&] { platform.devices(Device::TYPE_ALL); }, 2},
+        {"GetDeviceInfo", [&] { device.type(); }},
+        {"GetDeviceInfo", [&] { device.name(); }, 2},
+        {"CreateContext", [&] { Context(properties, device); }},
         {"CreateContextFromType", [&] { Context(properties, Device::TYPE_ALL); }},
         {"GetContextInfo", [&] { context.devices(); }},
         {"GetContextInfo", [&] { context.platform(); }, 2},
-        {"CreateCommandQueue", [&] { CommandQueue(context, dev, false, false); }},
-        {"CreateBuffer", [&] { Buffer(context, both, false, 4); }},
-        {"CreateBuffer", [&] { Buffer(context, both, std::size_t(4), data); }},
-        {"CreateBuffer", [&] { Buffer(context, both, false, 4, data); }},
-        {"CreateImage2D", [&] { Image2D(context, both, false, rgba8, 2, 2, 0); }},
-        {"CreateImage2D", [&] { Image2D(context, both, rgba8, 2, 2, 0, data); }},
-        {"CreateImage2D", [&] { Image2D(context, both, false, rgba8, 2, 2, 0, data); }},
-        {"CreateImage3D", [&] { Image3D(context, both, false, rgba8, 2, 2, 2, 0, 0); }},
-        {"CreateImage3D", [&] { Image3D(context, both, rgba8, 2, 2, 2, 0, 0, data); }},
-        {"CreateImage3D", [&] { Image3D(context, both, false, rgba8, 2, 2, 2, 0, 0, data); }},
+        {"CreateCommandQueue", [&] { CommandQueue(context, device, false, false); }},
+        {"CreateBuffer", [&] { Buffer(context, kBoth, false, 4); }},
+        {"CreateBuffer", [&] { Buffer(context, kBoth, std::size_t(4), data); }},
+        {"CreateBuffer", [&] { Buffer(context, kBoth, false, 4, data); }},
+        {"CreateImage2D", [&] { Image2D(context, kBoth, false, kRGBA8, 2, 2, 0); }},
+        {"CreateImage2D", [&] { Image2D(context, kBoth, kRGBA8, 2, 2, 0, data); }},
+        {"CreateImage2D", [&] { Image2D(context, kBoth, false, kRGBA8, 2, 2, 0, data); }},
+        {"CreateImage3D", [&] { Image3D(context, kBoth, false, kRGBA8, 2, 2, 2, 0, 0); }},
+        {"CreateImage3D", [&] { Image3D(context, kBoth, kRGBA8, 2, 2, 2, 0, 0, data); }},
+        {"CreateImage3D", [&] { Image3D(context, kBoth, false, kRGBA8, 2, 2, 2, 0, 0, data); }},
         {"GetImageInfo", [&] { image.getInfo(Image::IMAGEINFO_WIDTH, 0, nullptr, nullptr); }},
         {"CreateSampler",
          [&] { Sampler(context, false, Sampler::ADDRESS_CLAMP, Sampler::FILTER_LINEAR); }},
@@ -90,8 +123,8 @@ TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
         {"CreateProgramWithSource", [&] { Program(context, "source"); }},
         {"CreateProgramWithBinary", [&] { Program(context, binaries); }},
         {"BuildProgram", [&] { program.build(""); }},
-        {"GetProgramBuildInfo", [&] { program.buildLog(dev); }},
-        {"GetProgramBuildInfo", [&] { program.buildStatus(dev); }, 2},
+        {"GetProgramBuildInfo", [&] { program.buildLog(device); }},
+        {"GetProgramBuildInfo", [&] { program.buildStatus(device); }, 2},
         {"CreateKernel", [&] { program.kernel("f"); }},
         {"CreateKernelsInProgram", [&] { program.kernels(); }, 2},
         {"SetKernelArg", [&] { kernel.setArg(0, buffer); }},
@@ -109,10 +142,10 @@ TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
         {"EnqueueNDRangeKernel", [&] { queue.enqueueKernel(kernel, Range<1>(1), 0, 0, {event}); }},
         {"EnqueueMarker", [&] { queue.enqueueMarker(); }},
         {"EnqueueBarrier", [&] { queue.enqueueBarrier(); }},
-        {"CreateFromGLBuffer", [&] { Buffer(context, both, glBuffer); }},
-        {"CreateFromGLTexture2D", [&] { Image2D(context, both, glTexture, 0); }},
-        {"CreateFromGLTexture3D", [&] { Image3D(context, both, glVolume, 0); }},
-        {"CreateFromGLRenderbuffer", [&] { Image2D(context, both, glRenderbuffer); }},
+        {"CreateFromGLBuffer", [&] { Buffer(context, kBoth, glBuffer); }},
+        {"CreateFromGLTexture2D", [&] { Image2D(context, kBoth, glTexture, 0); }},
+        {"CreateFromGLTexture3D", [&] { Image3D(context, kBoth, glVolume, 0); }},
+        {"CreateFromGLRenderbuffer", [&] { Image2D(context, kBoth, glRenderbuffer); }},
         {"EnqueueAcquireGLObjects", [&] { queue.enqueueAcquireGLObjects({shared}); }},
         {"EnqueueReleaseGLObjects", [&] { queue.enqueueReleaseGLObjects({shared}); }},
     };
@@ -122,9 +155,9 @@ TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
         --code;
         std::string const entryPoint = std::string("cl") + failing.entryPoint;
         SCOPED_TRACE(entryPoint + " call " + std::to_string(failing.call));
-        runtime()->reset();
-        runtime()->fail(entryPoint, failing.call, code);
-        unsigned int const live = runtime()->liveHandles();
+        runtime->reset();
+        runtime->fail(entryPoint, failing.call, code);
+        std::size_t const live = runtime->references().size();
         Failure const failure = FailureOf(failing.operation);
         EXPECT_EQ(std::string("OCL Exception: ") + ExceptionOCL::ErrorToCString(code),
                   failure.text);
@@ -132,19 +165,19 @@ TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
         std::string const call = "ORU_CL(" + std::string(failing.entryPoint) + ",";
         EXPECT_NE(std::string::npos, SourceLine(failure.file, failure.line).find(call))
             << failure.file << ":" << failure.line;
-        EXPECT_EQ(failing.call, runtime()->calls(entryPoint)) << "nothing after the failure";
-        EXPECT_EQ(live, runtime()->liveHandles());
+        EXPECT_EQ(failing.call, runtime->calls(entryPoint)) << "nothing after the failure";
+        EXPECT_EQ(live, runtime->references().size());
     }
 }
 
 TEST_F(FailuresTest, RetainingAndReleasingGoUnchecked) {
     for (std::string const kind :
          {"Context", "CommandQueue", "MemObject", "Sampler", "Program", "Kernel", "Event"}) {
-        runtime()->reset();
-        runtime()->fail("clRetain" + kind, 1, CL_OUT_OF_RESOURCES);
-        runtime()->fail("clRelease" + kind, 1, CL_OUT_OF_RESOURCES);
+        runtime->reset();
+        runtime->fail("clRetain" + kind, 1, CL_OUT_OF_RESOURCES);
+        runtime->fail("clRelease" + kind, 1, CL_OUT_OF_RESOURCES);
         { std::tuple const copies(context, queue, buffer, sampler, program, kernel, event); }
-        EXPECT_GE(runtime()->calls("clRetain" + kind), 1u) << kind;
-        EXPECT_EQ(runtime()->calls("clRetain" + kind), runtime()->calls("clRelease" + kind));
+        EXPECT_GE(runtime->calls("clRetain" + kind), 1u) << kind;
+        EXPECT_EQ(runtime->calls("clRetain" + kind), runtime->calls("clRelease" + kind));
     }
 }

@@ -7,7 +7,6 @@
 
 #include <cstdint>
 #include <sstream>
-#include <tuple>
 
 using namespace ORU::OCL;
 using namespace oru_test;
@@ -17,28 +16,10 @@ namespace {
 using ObjectsTest = ComputeTest;
 using MemoryTest = QueueTest;
 
-constexpr auto buffer = Memory::MEMORYOBJECTTYPE_BUFFER;
-constexpr auto image2D = Memory::MEMORYOBJECTTYPE_IMAGE2D;
-constexpr auto image3D = Memory::MEMORYOBJECTTYPE_IMAGE3D;
-
-/// Reaches the translations.
-struct Translations : Image, Sampler {
-    using Image::ConvertImageInfo;
-    using Memory::ConvertMemoryInfo;
-    using Memory::ConvertMemoryObjectType;
-    using Sampler::OCLAddressingMode;
-    using Sampler::OCLFilterMode;
-    using Sampler::OpenCLAddressingMode;
-    using Sampler::OpenCLFilterMode;
-};
-
 } // namespace
 
 TEST(Extensions, HaveExactNames) {
     EXPECT_EQ(10, ExtensionManager::nameToExtensionEnum("cl_khr_gl_sharing"));
-    EXPECT_EQ("CL_VERSION_1_0", ExtensionManager::ExtensionEnumToString(Enum::Extension(0)));
-    for (char const *name : {"CL_KHR_GL_SHARING", "", "cl_khr_gl_sharin", "cl_khr_icd "})
-        EXPECT_EQ(16, ExtensionManager::nameToExtensionEnum(std::string(name))) << name;
     for (int e = -1; e <= 16; ++e) {
         std::string const name = ExtensionManager::ExtensionEnumToString(Enum::Extension(e));
         EXPECT_EQ(e < 0 || e > 12, name.empty()) << e;
@@ -46,24 +27,10 @@ TEST(Extensions, HaveExactNames) {
     }
 }
 
-TEST(Extensions, AreTokenizedAtBlanksAndTabs) {
-    std::vector<std::string> tokens = {"kept"};
-    TokenizeExtensionString("\t cl_a  cl_b\t\tcl_c \t", tokens);
-    TokenizeExtensionString("", tokens);
-    TokenizeExtensionString(" \t ", tokens);
-    EXPECT_EQ((std::vector<std::string>{"kept", "cl_a", "cl_b", "cl_c"}), tokens);
-}
-
-TEST(Ranges, HoldTheirSizes) {
-    EXPECT_TRUE(Range<3>(4) == Range<3>(4, 4, 4));
-    EXPECT_TRUE(Range<2>(1, 2) != Range<2>(1, 3));
-    EXPECT_EQ(3u, Range<3>().dimensions());
-    Range<2> changed(0);
-    changed[1] = 7;
-    EXPECT_EQ(7u, *(changed.begin() + 1));
+TEST(Ranges, RefuseOtherDimensions) {
     EXPECT_FAILURE("N==2", Range<1>(1, 2));
     EXPECT_FAILURE("N==3", Range<2>(1, 2, 3));
-    EXPECT_FAILURE("i < range_.size()", changed[2] = 0);
+    EXPECT_FAILURE("i < range_.size()", Range<2>(0)[2]);
 }
 
 TEST(ExceptionOCL, CarriesCodeAndName) {
@@ -71,8 +38,6 @@ TEST(ExceptionOCL, CarriesCodeAndName) {
     for (int code = -2000; code < 2000; ++code)
         named += std::string("UNKNOWN CL ERROR CODE") != ExceptionOCL::ErrorToCString(code);
     EXPECT_EQ(46, named);
-    EXPECT_STREQ("CL_INVALID_MIP_LEVEL", ExceptionOCL::ErrorToCString(-62));
-
     ExceptionOCL const e("file.cpp", 7, "text", static_cast<unsigned int>(-5));
     ORU::ScopedPtr<ORU::ExceptionBase> const clone(e.clone());
     EXPECT_EQ(0xFFFFFFFBu, dynamic_cast<ExceptionOCL const &>(*clone).errorNumber());
@@ -82,32 +47,27 @@ TEST(ExceptionOCL, CarriesCodeAndName) {
 }
 
 TEST_F(ObjectsTest, PlatformsAnswerAsTheRuntimeDoes) {
-    Platform const platform = ComputeTest::platform();
     std::pair<cl_platform_info, std::string (Platform::*)() const> const texts[] = {
         {CL_PLATFORM_NAME, &Platform::name},
         {CL_PLATFORM_VENDOR, &Platform::vendor},
         {CL_PLATFORM_VERSION, &Platform::version},
         {CL_PLATFORM_EXTENSIONS, &Platform::extensions}};
     for (auto const &[query, text] : texts) {
-        runtime()->answerText(query, TextOf("answer to", query));
+        runtime->answerText(query, TextOf("answer to", query));
         EXPECT_EQ(TextOf("answer to", query), (platform.*text)());
     }
-    EXPECT_FAILURE("OCL Exception: CL_DEVICE_NOT_FOUND",
-                   platform.devices(Device::TYPE_ACCELERATOR));
     // By number, as a header of Windows has a macro of an enumerator's name.
     std::pair<std::string, int> const profiles[] = {
         {"FULL_PROFILE", 1}, {"EMBEDDED_PROFILE", 2}, {"FULL", 0}};
     for (auto const &[text, profile] : profiles) {
-        runtime()->answerText(CL_PLATFORM_PROFILE, text);
-        runtime()->answerText(CL_DEVICE_PROFILE, text);
+        runtime->answerText(CL_PLATFORM_PROFILE, text);
+        runtime->answerText(CL_DEVICE_PROFILE, text);
         EXPECT_EQ(profile, platform.profile()) << text;
-        EXPECT_EQ(profile, device().profile()) << text;
+        EXPECT_EQ(profile, device.profile()) << text;
     }
 }
 
 TEST_F(ObjectsTest, DevicesAnswerEveryPropertyByItsType) {
-    Device const device = ComputeTest::device();
-    FunctionTable const &cl = ExtensionManager::instance()->table();
     // Each typed read against the runtime's own bytes; every other type is refused.
     auto const check = [&](Enum::DeviceProperty property, auto value) {
         using T = decltype(value);
@@ -116,7 +76,7 @@ TEST_F(ObjectsTest, DevicesAnswerEveryPropertyByItsType) {
             return 0;
         }
         std::size_t size = 0;
-        cl.clGetDeviceInfo(device.id(), property, sizeof value, &value, &size);
+        ORU_CL(GetDeviceInfo, device.id(), property, sizeof value, &value, &size);
         EXPECT_EQ(sizeof value, size) << property;
         EXPECT_TRUE(device.getInfo<T>(property) == value) << property;
         return 1;
@@ -127,35 +87,27 @@ TEST_F(ObjectsTest, DevicesAnswerEveryPropertyByItsType) {
                    check(property, Range<3>(0)) + check(property, cl_platform_id());
         if (Enum::GetPropertyTypeName(property) == Enum::GetTypeName<char *>()) {
             char text[4096] = {};
-            cl.clGetDeviceInfo(device.id(), property, sizeof text, text, nullptr);
+            ORU_CL(GetDeviceInfo, device.id(), property, sizeof text, text, nullptr);
             EXPECT_EQ(text, device.getInfo<std::string>(property)) << i;
             ++read;
         } else {
             EXPECT_FAILURE("GetPropertyTypeName(property) == Enum::GetTypeName<char*>()",
                            device.getInfo<std::string>(property));
         }
-        bool const refused = i >= 0x1032 && i <= 0x1034;
-        EXPECT_EQ(refused ? 0 : 1, read) << i;
-        EXPECT_EQ(refused, Enum::GetPropertyTypeName(property).empty()) << i;
+        EXPECT_EQ(i >= 0x1032 && i <= 0x1034 ? 0 : 1, read) << i;
     }
-    EXPECT_EQ("cl_platform_id", Enum::GetPropertyTypeName(Enum::DEVICEPROPERTY_PLATFORM));
     EXPECT_FAILURE("property_index < table_size",
                    device.getInfo<unsigned int>(Enum::DeviceProperty(0x103E)));
-    EXPECT_EQ(platform().id(), device.platform().id());
-    EXPECT_EQ(device.type(), platform().devices(device.type()).front().type());
-    EXPECT_EQ(device.getInfo<std::string>(Enum::DEVICEPROPERTY_NAME), device.name());
-    EXPECT_EQ(device.getInfo<std::string>(Enum::DEVICEPROPERTY_VENDOR), device.vendor());
-    for (bool const supported : {false, true}) {
-        runtime()->answerNumber(CL_DEVICE_IMAGE_SUPPORT, cl_bool(supported));
-        EXPECT_EQ(supported, device.supportsImages());
-    }
+    EXPECT_EQ(platform.id(), device.platform().id());
+    runtime->answerNumber(CL_DEVICE_IMAGE_SUPPORT, cl_bool(false));
+    EXPECT_FALSE(device.supportsImages());
 }
 
 TEST_F(ObjectsTest, AnExtensionIsSupportedWhenAllDevicesHaveIt) {
-    Device const device = ComputeTest::device(), none(nullptr);
+    Device const none(nullptr);
     Enum::Extension const has = Enum::EXTENSION_KHR_GL_SHARING, hasNot = Enum::EXTENSION_AMD_FP64;
-    EXPECT_TRUE(platform().isSupported(has));
-    EXPECT_FALSE(platform().isSupported(hasNot));
+    EXPECT_TRUE(platform.isSupported(has));
+    EXPECT_FALSE(platform.isSupported(hasNot));
     EXPECT_FALSE(IsSupported({}, has));
     EXPECT_TRUE(IsSupported({device, device}, has));
     // The first that lacks it decides; the others must have it, too.
@@ -165,63 +117,56 @@ TEST_F(ObjectsTest, AnExtensionIsSupportedWhenAllDevicesHaveIt) {
 }
 
 TEST_F(MemoryTest, CopiesAndMovesShareTheHandle) {
-    auto const references = [](auto const &object) { return runtime()->references(object.id()); };
+    // Each object beside another of its kind.
     auto const check = [&](auto const &object, auto const &other) {
-        int const before = references(object);
+        int const &references = runtime->references().at(object.id());
+        int const before = references;
         {
             auto copy = object;
             auto moved = std::move(copy);
             // A move is a copy.
             // NOLINTNEXTLINE(bugprone-use-after-move,clang-analyzer-cplusplus.Move)
             EXPECT_EQ(object.id(), copy.id());
-            EXPECT_EQ(before + 2, references(object));
+            EXPECT_EQ(before + 2, references);
             copy = other;
             moved = std::move(copy);
-            EXPECT_EQ(before, references(object));
-            EXPECT_EQ(3, references(other));
+            EXPECT_EQ(before, references);
+            EXPECT_EQ(3, runtime->references().at(other.id()));
         }
-        EXPECT_EQ(before, references(object));
-        EXPECT_EQ(1, references(other));
+        EXPECT_EQ(before, references);
+        EXPECT_EQ(1, runtime->references().at(other.id()));
     };
-    Program const program = build("kernel void f(global int *v) {}");
-    EXPECT_EQ(2, references(context)) << "a program holds its context";
-    check(context, makeContext());
-    check(queue, CommandQueue(context, device(), false, false));
-    check(Buffer(context, both, false, 4), Buffer(context, both, false, 4));
-    check(Image2D(context, both, false, rgba8, 2, 2, 0),
-          Image2D(context, both, false, rgba8, 2, 2, 0));
+    Program const program = built("kernel void f() {}");
+    EXPECT_EQ(2, runtime->references().at(context.id())) << "a program holds its context";
+    check(context, Context(ContextProperties(platform), device));
     check(program, Program(context, "kernel void g() {}"));
-    check(program.kernel("f"), program.kernel("f"));
     check(queue.enqueueMarker(), queue.enqueueMarker());
 
-    runtime()->reset();
+    runtime->reset();
     Context const &self = context;
     context = self;
-    EXPECT_EQ(0u, runtime()->calls("clRetainContext") + runtime()->calls("clReleaseContext"));
+    EXPECT_EQ(0u, runtime->calls("clRetainContext") + runtime->calls("clReleaseContext"));
 }
 
 TEST_F(ObjectsTest, ContextsPassTheirPropertiesDevicesAndCallback) {
-    auto const hdc = reinterpret_cast<HDC>(0x1234);
-    auto const hglrc = reinterpret_cast<HGLRC>(0x5678);
-    auto const id = reinterpret_cast<cl_context_properties>(platform().id());
-    ContextProperties properties(platform());
+    auto const id = reinterpret_cast<cl_context_properties>(platform.id());
+    ContextProperties properties(platform);
     // A device context alone shares nothing.
-    properties.setDisplayContext(hdc);
+    properties.setDisplayContext(reinterpret_cast<HDC>(0x1234));
     EXPECT_EQ((std::vector<cl_context_properties>{CL_CONTEXT_PLATFORM, id, 0}),
               properties.properties());
-    properties.setSharedRenderContext(hglrc);
+    properties.setSharedRenderContext(reinterpret_cast<HGLRC>(0x5678));
 
-    Device const device = ComputeTest::device();
-    auto const notify = [](char const *, void const *, std::size_t, void *) {};
+    auto *const notify = +[](char const *, void const *, std::size_t, void *) {};
     Context::NotifyCallback const callback(notify, &properties);
     std::string const sharing =
         TextOf(CL_CONTEXT_PLATFORM, id, CL_WGL_HDC_KHR, 0x1234, CL_GL_CONTEXT_KHR, 0x5678);
-    std::string const told = TextOf(AddressOf(notify), &properties);
+    std::string const told = TextOf(reinterpret_cast<void *>(notify), &properties);
     auto const check = [&](Context const &context, char const *entryPoint, auto... devices) {
-        EXPECT_EQ(sharing + TextOf(devices...) + told, runtime()->arguments(entryPoint));
+        EXPECT_EQ(sharing + TextOf(devices...) + told, runtime->arguments(entryPoint));
         ASSERT_EQ(1u, context.devices().size());
         EXPECT_EQ(device.id(), context.devices().front().id());
-        EXPECT_EQ(platform().id(), context.platform().id());
+        EXPECT_EQ(platform.id(), context.platform().id());
     };
     check(Context(properties, device, callback), "clCreateContext", 1, device.id());
     check(Context(properties, std::vector<Device>{device}, callback), "clCreateContext", 1,
@@ -230,67 +175,59 @@ TEST_F(ObjectsTest, ContextsPassTheirPropertiesDevicesAndCallback) {
 }
 
 TEST_F(MemoryTest, TheRuntimeIsToldWhatToMake) {
-    std::vector<int> host(64);
-    void *const data = host.data();
-    void *const none = nullptr;
+    int host[64];
+    void *const data = host;
     int const use = CL_MEM_USE_HOST_PTR, copy = CL_MEM_COPY_HOST_PTR;
     int const allocate = CL_MEM_ALLOC_HOST_PTR;
-    // Rows of volumes are 5 pixels apart, slices 4 rows.
     auto const passes = [&](Memory const &memory, Memory::MemoryObjectType type,
                             auto... arguments) {
         char const *const entryPoints[] = {"clCreateBuffer", "clCreateImage2D", "clCreateImage3D"};
-        EXPECT_EQ(TextOf(context.id(), arguments...), runtime()->arguments(entryPoints[type]));
+        EXPECT_EQ(TextOf(context.id(), arguments...), runtime->arguments(entryPoints[type]));
         EXPECT_EQ(type, memory.memType());
     };
-    passes(Buffer(context, reads, 16, data), buffer, CL_MEM_READ_ONLY | use, 16, data);
-    passes(Buffer(context, writes, false, 16), buffer, CL_MEM_WRITE_ONLY, 16, none);
-    passes(Buffer(context, both, true, 16), buffer, CL_MEM_READ_WRITE | allocate, 16, none);
-    passes(Buffer(context, reads, false, 16, data), buffer, CL_MEM_READ_ONLY | copy, 16, data);
-    passes(Buffer(context, both, true, 16, data), buffer, CL_MEM_READ_WRITE | copy | allocate, 16,
-           data);
-    passes(Image2D(context, both, rgba8, 2, 3, 20, data), image2D, CL_MEM_READ_WRITE | use, 2, 3,
+    auto const buffer = Memory::MEMORYOBJECTTYPE_BUFFER;
+    passes(Buffer(context, kReads, 16, data), buffer, CL_MEM_READ_ONLY | use, 16, data);
+    passes(Buffer(context, kWrites, false, 16), buffer, CL_MEM_WRITE_ONLY, 16, kNone);
+    passes(Buffer(context, kBoth, true, 16), buffer, CL_MEM_READ_WRITE | allocate, 16, kNone);
+    passes(Buffer(context, kReads, false, 16, data), buffer, CL_MEM_READ_ONLY | copy, 16, data);
+    auto const image2D = Memory::MEMORYOBJECTTYPE_IMAGE2D;
+    passes(Image2D(context, kBoth, kRGBA8, 2, 3, 20, data), image2D, CL_MEM_READ_WRITE | use, 2, 3,
            20, data);
-    passes(Image2D(context, writes, true, rgba8, 2, 3, 0), image2D, CL_MEM_WRITE_ONLY | allocate, 2,
-           3, 0, none);
-    passes(Image2D(context, reads, false, rgba8, 2, 3, 20, data), image2D, CL_MEM_READ_ONLY | copy,
-           2, 3, 20, data);
-    passes(Image3D(context, both, rgba8, 2, 3, 2, 20, 80, data), image3D, CL_MEM_READ_WRITE | use,
+    passes(Image2D(context, kWrites, true, kRGBA8, 2, 3, 0), image2D, CL_MEM_WRITE_ONLY | allocate,
+           2, 3, 0, kNone);
+    passes(Image2D(context, kReads, false, kRGBA8, 2, 3, 20, data), image2D,
+           CL_MEM_READ_ONLY | copy, 2, 3, 20, data);
+    // Rows of volumes are 5 pixels apart, slices 4 rows.
+    auto const image3D = Memory::MEMORYOBJECTTYPE_IMAGE3D;
+    passes(Image3D(context, kBoth, kRGBA8, 2, 3, 2, 20, 80, data), image3D, CL_MEM_READ_WRITE | use,
            2, 3, 2, 20, 80, data);
-    passes(Image3D(context, reads, true, rgba8, 2, 3, 2, 20, 80, data), image3D,
+    passes(Image3D(context, kReads, true, kRGBA8, 2, 3, 2, 20, 80, data), image3D,
            CL_MEM_READ_ONLY | copy | allocate, 2, 3, 2, 20, 80, data);
-    passes(Image3D(context, writes, false, rgba8, 2, 3, 2, 0, 0), image3D, CL_MEM_WRITE_ONLY, 2, 3,
-           2, 0, 0, none);
-    // Runtimes refuse pitches without memory, but hear of them.
-    runtime()->fail("clCreateImage3D", 1, CL_INVALID_IMAGE_SIZE);
-    EXPECT_FAILURE("OCL Exception: CL_INVALID_IMAGE_SIZE",
-                   Image3D(context, writes, false, rgba8, 2, 3, 2, 20, 80));
-    EXPECT_EQ(TextOf(context.id(), CL_MEM_WRITE_ONLY, 2, 3, 2, 20, 80, none),
-              runtime()->arguments("clCreateImage3D"));
+    passes(Image3D(context, kWrites, false, kRGBA8, 2, 3, 2, 0, 0), image3D, CL_MEM_WRITE_ONLY, 2,
+           3, 2, 0, 0, kNone);
 }
 
 TEST_F(MemoryTest, NullHostMemoryIsRefusedBeforeAnyCall) {
     auto const refused = [](std::string const &kind, auto make) {
         EXPECT_FAILURE("NULL host memory pointer passed to " + kind + " constructor.", make());
     };
-    void *const none = nullptr;
-    refused("Buffer", [&] { Buffer(context, reads, std::size_t(4), none); });
-    refused("Image2D", [&] { Image2D(context, reads, rgba8, 4, 4, 0, none); });
-    refused("Image2D", [&] { Image2D(context, reads, true, rgba8, 4, 4, 0, none); });
-    refused("Image3D", [&] { Image3D(context, reads, rgba8, 4, 4, 4, 0, 0, none); });
-    refused("Image3D", [&] { Image3D(context, reads, true, rgba8, 4, 4, 4, 0, 0, none); });
+    refused("Buffer", [&] { Buffer(context, kReads, std::size_t(4), kNone); });
+    refused("Image2D", [&] { Image2D(context, kReads, kRGBA8, 4, 4, 0, kNone); });
+    refused("Image2D", [&] { Image2D(context, kReads, true, kRGBA8, 4, 4, 0, kNone); });
+    refused("Image3D", [&] { Image3D(context, kReads, kRGBA8, 4, 4, 4, 0, 0, kNone); });
+    refused("Image3D", [&] { Image3D(context, kReads, true, kRGBA8, 4, 4, 4, 0, 0, kNone); });
     EXPECT_FAILURE("Must allocate host memory passed to Buffer constructor.",
-                   Buffer(context, reads, true, 4, none));
+                   Buffer(context, kReads, true, 4, kNone));
     for (char const *name : {"clCreateBuffer", "clCreateImage2D", "clCreateImage3D"})
-        EXPECT_EQ(0u, runtime()->calls(name)) << name;
+        EXPECT_EQ(0u, runtime->calls(name)) << name;
 }
 
 TEST_F(MemoryTest, ImagesAreReadWhereTheirAccessIsKnown) {
-    Image2D const image(context, reads, false, rgba8, 7, 5, 0);
-    std::size_t width = 0, size = 0;
-    image.getInfo(Image::IMAGEINFO_WIDTH, sizeof width, &width, &size);
+    Image2D const image(context, kReads, false, kRGBA8, 7, 5, 0);
+    std::size_t width = 0;
+    image.getInfo(Image::IMAGEINFO_WIDTH, sizeof width, &width, nullptr);
     EXPECT_EQ(7u, width);
-    EXPECT_EQ(sizeof width, size);
-    runtime()->answerNumber(CL_MEM_FLAGS, cl_mem_flags(0));
+    runtime->answerNumber(CL_MEM_FLAGS, cl_mem_flags(0));
     EXPECT_FAILURE("isCompatible", queue.enqueueRead(image, {}, nullptr, 0));
 }
 
@@ -305,30 +242,15 @@ TEST_F(MemoryTest, SamplersAnswerWhatTheyAreMadeWith) {
             Sampler const sampler(context, normalized, Sampler::SamplerAddressingMode(addressing),
                                   Sampler::SamplerFilterMode(filter));
             EXPECT_EQ(TextOf(context.id(), normalized, addressings[addressing], filters[filter]),
-                      runtime()->arguments("clCreateSampler"));
+                      runtime->arguments("clCreateSampler"));
             EXPECT_EQ(addressing, sampler.addressingMode());
             EXPECT_EQ(filter, sampler.filterMode());
             EXPECT_EQ(normalized, sampler.usesNormalizedCoordinates());
             EXPECT_FAILURE("Not implemented.", sampler.context());
         }
-}
-
-TEST_F(MemoryTest, EnumerationsAreTranslated) {
-    using T = Translations;
-    // OpenCL numbers each family in the library's order.
-    for (int i = 0; i <= 7; ++i) {
-        auto const constant = [i](int first, int count) {
-            return i < count ? unsigned(first + i) : 0u;
-        };
-        EXPECT_EQ(constant(CL_MEM_TYPE, 7), T::ConvertMemoryInfo(Memory::MemoryInfo(i)));
-        EXPECT_EQ(constant(CL_IMAGE_FORMAT, 7), T::ConvertImageInfo(Image::ImageInfo(i)));
-        EXPECT_EQ(constant(CL_MEM_OBJECT_BUFFER, 3),
-                  T::ConvertMemoryObjectType(Memory::MemoryObjectType(i)));
-    }
     EXPECT_FAILURE("Unknown OCL addressing mode.",
-                   T::OpenCLAddressingMode(Sampler::SamplerAddressingMode(4)));
-    EXPECT_FAILURE("Unknown OpenCL addressing mode.",
-                   T::OCLAddressingMode(CL_ADDRESS_MIRRORED_REPEAT));
-    EXPECT_FAILURE("Unknown OCL filter mode.", T::OpenCLFilterMode(Sampler::SamplerFilterMode(2)));
-    EXPECT_FAILURE("Unknown OpenCL filter mode.", T::OCLFilterMode(0));
+                   Sampler(context, true, Sampler::SamplerAddressingMode(4), {}));
+    runtime->answerNumber(CL_SAMPLER_ADDRESSING_MODE, CL_ADDRESS_MIRRORED_REPEAT);
+    Sampler const sampler(context, true, Sampler::ADDRESS_CLAMP, Sampler::FILTER_LINEAR);
+    EXPECT_FAILURE("Unknown OpenCL addressing mode.", sampler.addressingMode());
 }

@@ -1,23 +1,19 @@
 // What the context tests share: contexts of the host, windowed and opened ones, and their count.
 #pragma once
 
-#include "tests/support/pushed.h"
+#include "tests/support/objecttest.h"
 #include "tests/support/testwindow.h"
 
+#include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/wglforwarder.h"
-#include "oru/oru_ogl/libraryogl.h"
-#include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
-#include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
-
-#include <gtest/gtest.h>
 
 #include <algorithm>
-#include <set>
-#include <vector>
 
 namespace oru_test {
+
+using namespace ORU::OGL;
 
 /// A context whose protected members a test may call.
 template<class Kind>
@@ -39,39 +35,30 @@ public:
     using Kind::UnregisterShareContext;
 };
 
-/// A context of the library in a window of the host.
-inline ORU::OGL::ContextWindowed
-Windowed(TestWindow const &window, ORU::OGL::Context const *share = nullptr,
-         ORU::OGL::BufferFormat const &format = ORU::OGL::BufferFormat::FORMAT_RGBA8_D24,
-         int samples = 1,
-         ORU::OGL::Context::Buffering buffering = ORU::OGL::Context::BUFFERING_DOUBLE) {
-    return ORU::OGL::ContextWindowed(window.hwnd(), format, buffering,
-                                     static_cast<ORU::OGL::Context::Multisampling>(samples), share);
+inline ContextWindowed Windowed(TestWindow const &window, Context const *share = nullptr,
+                                BufferFormat const &format = BufferFormat::FORMAT_RGBA8_D24,
+                                int samples = 1,
+                                Context::Buffering buffering = Context::BUFFERING_DOUBLE) {
+    return ContextWindowed(window.hwnd(), format, buffering,
+                           static_cast<Context::Multisampling>(samples), share);
 }
 
 /// A rendering context that the host makes with plain calls, current for its lifetime.
 class HostContext {
 public:
-    /// @param attributes for wglCreateContextAttribsARB; without any, a context of wglCreateContext
-    explicit HostContext(HGLRC share = nullptr, std::vector<int> const &attributes = {}) {
+    /// @param attributes for wglCreateContextAttribsARB
+    explicit HostContext(HGLRC share = nullptr, std::vector<int> const &attributes = {0}) {
         PIXELFORMATDESCRIPTOR descriptor = {};
         descriptor.nSize = sizeof descriptor;
-        descriptor.nVersion = 1;
         descriptor.dwFlags = PFD_DRAW_TO_WINDOW | PFD_SUPPORT_OPENGL;
-        descriptor.iPixelType = PFD_TYPE_RGBA;
         ::SetPixelFormat(dc_, ::ChoosePixelFormat(dc_, &descriptor), &descriptor);
-        rc_ = ::wglCreateContext(dc_);
-        if (!attributes.empty()) {
-            HGLRC const plain = rc_;
-            EXPECT_TRUE(::wglMakeCurrent(dc_, plain));
-            auto const create = reinterpret_cast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(
-                reinterpret_cast<void *>(::wglGetProcAddress("wglCreateContextAttribsARB")));
-            rc_ = create(dc_, nullptr, attributes.data());
-            ::wglMakeCurrent(nullptr, nullptr);
-            ::wglDeleteContext(plain);
-        }
-        EXPECT_TRUE(!share || ::wglShareLists(share, rc_));
+        HGLRC const first = ::wglCreateContext(dc_);
+        EXPECT_TRUE(::wglMakeCurrent(dc_, first));
+        auto const create = internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(
+            ::wglGetProcAddress("wglCreateContextAttribsARB"));
+        rc_ = create(dc_, share, attributes.data());
         makeCurrent();
+        ::wglDeleteContext(first);
     }
     ~HostContext() {
         ::wglMakeCurrent(nullptr, nullptr);
@@ -92,11 +79,13 @@ private:
     HGLRC rc_ = nullptr;
 };
 
-/// Follows the rendering contexts that the library makes, by either function, and deletes. Only one
-/// is pushed at a time, on one thread and before the library first makes a context.
-class ContextCounter : public ORU::OGL::WGLForwarder {
+/// Follows the contexts that the library makes, by either function, and deletes: one at a time, on
+/// one thread, and pushed before the library first makes a context.
+class ContextCounter : public WGLForwarder {
 public:
-    ContextCounter() {
+    /// @param isDeaf whether contexts with attributes are made of OpenGL 3.0, whatever is asked
+    explicit ContextCounter(bool isDeaf = false) {
+        sIsDeaf = isDeaf;
         sMade = 0;
         sAlive.clear();
         sGone.clear();
@@ -113,8 +102,7 @@ public:
         PROC const real = WGLForwarder::wcgmGetProcAddress(file, line, name);
         if (!real || std::string(name) != "wglCreateContextAttribsARB")
             return real;
-        sCreate =
-            reinterpret_cast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(reinterpret_cast<void *>(real));
+        sCreate = internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(real);
         return reinterpret_cast<PROC>(reinterpret_cast<void *>(&CreateContextAttribs));
     }
 
@@ -122,9 +110,8 @@ public:
     static std::size_t Alive() { return sAlive.size(); }
     /// Contexts that are gone and have a record all the same.
     static auto Remembered() {
-        return std::count_if(sGone.begin(), sGone.end(), [](HGLRC rc) {
-            return ORU::OGL::ExtensionManager::Instance(rc) != nullptr;
-        });
+        return std::count_if(sGone.begin(), sGone.end(),
+                             [](HGLRC rc) { return ExtensionManager::Instance(rc) != nullptr; });
     }
 
 private:
@@ -136,9 +123,11 @@ private:
         return made;
     }
     static HGLRC WINAPI CreateContextAttribs(HDC dc, HGLRC share, int const *attributes) {
-        return Counted(sCreate(dc, share, attributes));
+        int const old[] = {WGL_CONTEXT_MAJOR_VERSION_ARB, 3, 0};
+        return Counted(sCreate(dc, share, sIsDeaf ? old : attributes));
     }
 
+    static inline bool sIsDeaf = false;
     static inline int sMade = 0;
     static inline std::set<HGLRC> sAlive, sGone;
     static inline PFNWGLCREATECONTEXTATTRIBSARBPROC sCreate = nullptr;

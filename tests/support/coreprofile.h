@@ -38,23 +38,20 @@ public:
                         : std::string(strings[i]);
         while (text.find('#') == 0) // a version, or an extension that is no longer one
             text.erase(0, text.find('\n') + 1);
+        GLint type = 0;
+        OpenGLForwarder::cgmGetShaderiv(file, line, shader, GL_SHADER_TYPE, &type);
         if (!text.empty())
-            text.insert(0, prefix(file, line, shader));
+            text.insert(0, type == GL_VERTEX_SHADER ? kVertexPrefix : kFragmentPrefix);
         GLchar const *const source = text.c_str();
         OpenGLForwarder::cgmShaderSource(file, line, shader, 1, &source, nullptr);
     }
 
 private:
-    std::string prefix(char const *file, unsigned int line, GLuint shader) {
-        GLint type = 0;
-        OpenGLForwarder::cgmGetShaderiv(file, line, shader, GL_SHADER_TYPE, &type);
-        return std::string("#version 150\n"
-                           "#define texture1D texture\n#define texture2D texture\n"
-                           "#define texture2DRect texture\n#define texture3D texture\n") +
-               (type == GL_VERTEX_SHADER
-                    ? "#define attribute in\n#define varying out\n"
-                    : "#define varying in\n#define gl_FragColor theColour\nout vec4 theColour;\n");
-    }
+    static constexpr char kVertexPrefix[] =
+        "#version 150\n#define texture2D texture\n#define attribute in\n#define varying out\n";
+    static constexpr char kFragmentPrefix[] =
+        "#version 150\n#define texture2D texture\n#define varying in\n"
+        "#define gl_FragColor theColour\nout vec4 theColour;\n";
 };
 
 } // namespace oru_test

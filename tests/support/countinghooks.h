@@ -10,8 +10,7 @@
 
 namespace oru_test {
 
-/// Installs hooks for its lifetime and keeps what they saw. Unlike a host it takes them out again,
-/// so everything allocated meanwhile must be freed meanwhile.
+/// Installs hooks for its lifetime: everything allocated meanwhile must be freed meanwhile.
 class CountingHooks {
 public:
     struct Allocation {

@@ -2,9 +2,9 @@
 #pragma once
 
 #include "tests/support/coreprofile.h"
-#include "tests/support/pushed.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/interceptorscope.h"
 #include "oru/oru_ogl/extensionator/openglforwarder.h"
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
@@ -13,9 +13,8 @@
 #include <gtest/gtest.h>
 
 #include <map>
-#include <memory>
+#include <numeric>
 #include <optional>
-#include <string>
 
 namespace oru_test {
 
@@ -23,20 +22,14 @@ namespace oru_test {
 class CountingForwarder : public ORU::OGL::OpenGLInterceptorDecorator {
 public:
     /// Calls of one entry point, named without its `gl`.
-    int count(std::string const &name) const {
-        auto const found = counts_.find(name);
-        return found == counts_.end() ? 0 : found->second;
-    }
+    int count(std::string const &name) const { return counts_.count(name) ? counts_.at(name) : 0; }
 
     int total() const {
-        int sum = 0;
-        for (auto const &entry : counts_)
-            sum += entry.second;
-        return sum;
+        return std::accumulate(counts_.begin(), counts_.end(), 0,
+                               [](int sum, auto const &entry) { return sum + entry.second; });
     }
 
-    /// The names of the calls that are no queries, in their alphabetical order, since the last
-    /// time.
+    /// The calls since the last time that are no queries, in alphabetical order.
     std::string takeChanges() {
         std::string names;
         for (auto const &[name, calls] : counts_) {
@@ -60,8 +53,7 @@ private:
     std::map<std::string, int> counts_;
 };
 
-/// Every test runs in an open library with an offscreen context current, in a core one where the
-/// run asks for that, and must leave no GL error behind.
+/// Every test runs with an offscreen context current and must leave no GL error behind.
 class OffscreenTest : public ::testing::Test {
 protected:
     void SetUp() override {
@@ -84,7 +76,7 @@ protected:
 private:
     ORU::OGL::AutoInitializer library_;
     ORU::OGL::ExtensionManager::ScopedInitOptions options_{RunOptions()};
-    std::optional<Pushed<CoreShaders>> coreShaders_;
+    std::optional<ORU::OGL::InterceptorScope<CoreShaders>> coreShaders_;
     std::unique_ptr<ORU::OGL::ContextOffscreen> context_;
 };
 

@@ -7,8 +7,6 @@
 #include <algorithm>
 #include <iterator>
 #include <sstream>
-#include <string>
-#include <vector>
 
 namespace oru_test {
 

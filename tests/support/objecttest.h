@@ -6,9 +6,7 @@
 
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 
-#include <optional>
-#include <set>
-#include <sstream>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -33,11 +31,11 @@ public:
 #define ORU_FOLLOW(Objects)                                                                        \
     void cgmGen##Objects(char const *file, unsigned int line, GLsizei n, GLuint *names) override { \
         OpenGLForwarder::cgmGen##Objects(file, line, n, names);                                    \
-        add(#Objects, n, names);                                                                   \
+        note(#Objects, n, names, 1);                                                               \
     }                                                                                              \
     void cgmDelete##Objects(char const *file, unsigned int line, GLsizei n, GLuint const *names)   \
         override {                                                                                 \
-        remove(#Objects, n, names);                                                                \
+        note(#Objects, n, names, -1);                                                              \
         OpenGLForwarder::cgmDelete##Objects(file, line, n, names);                                 \
     }
     ORU_FOLLOW(Buffers)
@@ -50,11 +48,11 @@ public:
 #define ORU_FOLLOW(Object, Parameters, ...)                                                        \
     GLuint cgmCreate##Object Parameters override {                                                 \
         GLuint const name = OpenGLForwarder::cgmCreate##Object(__VA_ARGS__);                       \
-        add(#Object, 1, &name);                                                                    \
+        note(#Object, 1, &name, 1);                                                                \
         return name;                                                                               \
     }                                                                                              \
     void cgmDelete##Object(char const *file, unsigned int line, GLuint name) override {            \
-        remove(#Object, 1, &name);                                                                 \
+        note(#Object, 1, &name, -1);                                                               \
         OpenGLForwarder::cgmDelete##Object(file, line, name);                                      \
     }
     ORU_FOLLOW(Shader, (char const *file, unsigned int line, GLenum type), file, line, type)
@@ -63,48 +61,34 @@ public:
 
     /// The names that were not deleted or deleted twice, empty when all is well.
     std::string leaks() const {
-        std::ostringstream text;
-        for (auto const &name : alive_)
-            text << name.first << " " << name.second << " lives; ";
-        return text.str() + faults_;
+        std::string text;
+        for (auto const &[name, balance] : balances_)
+            text += balance == 0 ? "" : name + (balance > 0 ? " lives; " : " deleted too often; ");
+        return text;
     }
 
 private:
-    using Name = std::pair<std::string, GLuint>;
-
-    void add(char const *kind, GLsizei n, GLuint const *names) {
+    void note(char const *kind, GLsizei n, GLuint const *names, int change) {
         for (GLsizei i = 0; i < n; ++i)
-            alive_.insert(Name(kind, names[i]));
-    }
-    void remove(char const *kind, GLsizei n, GLuint const *names) {
-        for (GLsizei i = 0; i < n; ++i) {
-            if (!alive_.erase(Name(kind, names[i])))
-                faults_ += std::string(kind) + " deleted that were not made; ";
-        }
+            balances_[kind + std::to_string(names[i])] += change;
     }
 
-    std::set<Name> alive_;
-    std::string faults_;
+    std::map<std::string, int> balances_; ///< generations less deletions
 };
 
 /// Every test ends with the names deleted that it made and the client state popped that it pushed.
 class ObjectTest : public OffscreenTest {
 protected:
-    void SetUp() override {
-        OffscreenTest::SetUp();
-        ledger_.emplace();
-    }
     void TearDown() override {
-        EXPECT_EQ("", (*ledger_)->leaks());
+        EXPECT_EQ("", ledger_->leaks());
         if (!IsCoreRun()) {
             EXPECT_EQ(0, Get(GL_CLIENT_ATTRIB_STACK_DEPTH));
         }
-        ledger_.reset();
         OffscreenTest::TearDown();
     }
 
 private:
-    std::optional<Pushed<NameLedger>> ledger_;
+    ORU::OGL::InterceptorScope<NameLedger> ledger_;
 };
 
 } // namespace oru_test

@@ -26,10 +26,6 @@ inline double Levels(App::Shape const &shape) {
     return shape.bitsPerChannel == 8 ? 255 : 65535;
 }
 
-inline bool IsAlpha(App::Shape const &shape, std::size_t index) {
-    return shape.hasAlpha() && index % shape.channels == shape.channels - 1;
-}
-
 inline App::Image RandomPicture(App::Shape const &shape, unsigned int seed) {
     std::mt19937 random(seed);
     App::Image image(shape);
@@ -71,10 +67,11 @@ double WorstError(App::Image const &original, App::Image const &developed, Exact
         return 1e9;
     double worst = 0;
     for (std::size_t i = 0; i < ValueCount(original); ++i) {
-        double const after = Value(developed, i);
-        worst = std::max(worst, IsAlpha(original, i)
-                                    ? 1e9 * std::abs(after - Value(original, i))
-                                    : std::abs(after - Stored(exactLight(i), Levels(original))));
+        bool const isAlpha = original.hasAlpha() && (i + 1) % original.channels == 0;
+        double const error = isAlpha
+                                 ? 1e9 * (Value(developed, i) - 1.0 * Value(original, i))
+                                 : Value(developed, i) - Stored(exactLight(i), Levels(original));
+        worst = std::max(worst, std::abs(error));
     }
     return worst;
 }

@@ -1,4 +1,4 @@
-// Running a program from a test, and a folder for its files.
+// Running a program from a test, and the files that it works on.
 #include "tests/support/program.h"
 
 #include "apps/common/unicode.h"
@@ -8,11 +8,20 @@
 #include <algorithm>
 #include <fstream>
 #include <iterator>
-#include <system_error>
 
 namespace apps_test {
 
 namespace fs = std::filesystem;
+
+static std::string Contents(fs::path const &path) {
+    std::ifstream file(path, std::ios::binary);
+    return std::string(std::istreambuf_iterator<char>(file), {});
+}
+
+Bytes Foreign(std::string const &name) {
+    std::string const text = Contents(fs::path(ORU_FOREIGN_FILES) / name);
+    return Bytes(text.begin(), text.end());
+}
 
 fs::path ProgramFolder() {
     wchar_t path[MAX_PATH];
@@ -55,15 +64,11 @@ Outcome RunProgram(std::string const &name, std::string const &arguments, fs::pa
         return ::CreateFileW((captures.path() / stream).c_str(), GENERIC_WRITE, FILE_SHARE_READ,
                              &inheritable, CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
     };
-    auto const textOf = [&](char const *stream) {
-        std::ifstream file(captures.path() / stream, std::ios::binary);
-        return std::string(std::istreambuf_iterator<char>(file), {});
-    };
     HANDLE const output = fileFor("output"), errors = fileFor("errors");
     int const exitCode = Process(name, arguments, folder, output, errors).exitCode();
     ::CloseHandle(output);
     ::CloseHandle(errors);
-    return {exitCode, textOf("output"), textOf("errors")};
+    return {exitCode, Contents(captures.path() / "output"), Contents(captures.path() / "errors")};
 }
 
 TemporaryFolder::TemporaryFolder() {

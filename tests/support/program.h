@@ -1,4 +1,4 @@
-// Running a program from a test, and a folder for its files.
+// Running a program from a test, and the files that it works on.
 #pragma once
 
 #include <filesystem>
@@ -7,6 +7,11 @@
 
 namespace apps_test {
 
+using Bytes = std::vector<unsigned char>;
+
+/// A picture of tests/apps/common/data, of a kind that the programs read but do not write.
+Bytes Foreign(std::string const &name);
+
 /// The folder of the test and of what is built beside it.
 std::filesystem::path ProgramFolder();
 
@@ -14,7 +19,6 @@ std::filesystem::path ProgramFolder();
 class Process {
 public:
     /// @param arguments as on a command line, in UTF-8
-    /// @param folder its current folder
     /// @param output, errors handles of its standard streams, if it is to have them
     Process(std::string const &name, std::string const &arguments,
             std::filesystem::path const &folder, void *output = nullptr, void *errors = nullptr);

@@ -7,7 +7,6 @@
 
 namespace oru_test {
 
-/// A window of the host.
 class TestWindow {
 public:
     /// @param style WS_VISIBLE to be shown, for which the system waits a second or two

@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <array>
 #include <memory>
+#include <type_traits>
 #include <vector>
 
 namespace oru_test {
@@ -32,12 +33,13 @@ struct Pixel {
     Texture::Type type;
 };
 
+auto const kRGBA8 = Texture::INTERNALFORMAT_RGBA8;
+Pixel const kBytes{Texture::FORMAT_RGBA, Texture::TYPE_UNSIGNED_BYTE};
 PixelUnpackParameters const kTight;
 
 struct TextureKind {
     char const *name;
     GLenum target;
-    GLenum binding;
     std::size_t sides;
     std::size_t layers; ///< the side that counts layers, 3 for none
     std::unique_ptr<Texture> (*make)(Texture::InternalFormat format, Sides const &size,
@@ -63,23 +65,22 @@ inline std::uint64_t Size(int side) {
     return static_cast<std::uint64_t>(side);
 }
 
-#define ORU_KIND(Class, gl, sides, layers, ...)                                                    \
-    {                                                                                              \
-#Class, GL_TEXTURE_##gl, GL_TEXTURE_BINDING_##gl, sides, layers,                           \
-            [](Texture::InternalFormat format, Sides const &size,                                  \
-               [[maybe_unused]] bool mipmapped) -> std::unique_ptr < Texture>                      \
-        { return std::make_unique<Class>(format, __VA_ARGS__); }                                   \
-    }
+template<class Kind, std::size_t... Side>
+std::unique_ptr<Texture> Make(Texture::InternalFormat format, Sides const &size, bool mipmapped) {
+    if constexpr (std::is_same_v<Kind, TextureRECT>)
+        return std::make_unique<Kind>(format, Size(size[Side])...);
+    else
+        return std::make_unique<Kind>(format, Size(size[Side])..., mipmapped);
+}
+
 inline TextureKind const kTextureKinds[] = {
-    ORU_KIND(Texture1D, 1D, 1, 3, Size(size[0]), mipmapped),
-    ORU_KIND(Texture2D, 2D, 2, 3, Size(size[0]), Size(size[1]), mipmapped),
-    ORU_KIND(TextureRECT, RECTANGLE, 2, 3, Size(size[0]), Size(size[1])),
-    ORU_KIND(Texture1DArray, 1D_ARRAY, 2, 1, Size(size[0]), Size(size[1]), mipmapped),
-    ORU_KIND(Texture3D, 3D, 3, 3, Size(size[0]), Size(size[1]), Size(size[2]), mipmapped),
-    ORU_KIND(Texture2DArray, 2D_ARRAY, 3, 2, Size(size[0]), Size(size[1]), Size(size[2]),
-             mipmapped),
+    {"Texture1D", GL_TEXTURE_1D, 1, 3, Make<Texture1D, 0>},
+    {"Texture2D", GL_TEXTURE_2D, 2, 3, Make<Texture2D, 0, 1>},
+    {"TextureRECT", GL_TEXTURE_RECTANGLE, 2, 3, Make<TextureRECT, 0, 1>},
+    {"Texture1DArray", GL_TEXTURE_1D_ARRAY, 2, 1, Make<Texture1DArray, 0, 1>},
+    {"Texture3D", GL_TEXTURE_3D, 3, 3, Make<Texture3D, 0, 1, 2>},
+    {"Texture2DArray", GL_TEXTURE_2D_ARRAY, 3, 2, Make<Texture2DArray, 0, 1, 2>},
 };
-#undef ORU_KIND
 
 /// A texture that is bound while it lives.
 struct BoundTexture {
@@ -92,7 +93,7 @@ struct BoundTexture {
     Texture *operator->() const { return texture.get(); }
 };
 
-/// Filters and wrap modes of the texture bound to a target, as many of these as it has sides.
+/// Filters of the texture bound to a target, and a wrap mode for each side.
 inline std::vector<GLint> Sampling(GLenum target, std::size_t sides) {
     GLenum const names[] = {GL_TEXTURE_MIN_FILTER, GL_TEXTURE_MAG_FILTER, GL_TEXTURE_WRAP_S,
                             GL_TEXTURE_WRAP_T, GL_TEXTURE_WRAP_R};
@@ -102,49 +103,50 @@ inline std::vector<GLint> Sampling(GLenum target, std::size_t sides) {
     return values;
 }
 
-/// `subImage` of whichever class, from memory or (with an offset behind it) from a buffer.
+/// Calls `call` with a texture as the class that it is, and with the numbers of its sides.
+template<class Call>
+void AsItsClass(Texture &texture, Call call) {
+    if (auto *const one = dynamic_cast<Texture1 *>(&texture))
+        call(*one, 0u);
+    else if (auto *const two = dynamic_cast<Texture2 *>(&texture))
+        call(*two, 0u, 1u);
+    else
+        call(dynamic_cast<Texture3 &>(texture), 0u, 1u, 2u);
+}
+
+/// `subImage` from memory, or (with an offset behind it) from a buffer.
 template<class... Source>
 void Upload(Texture &texture, int level, Box const &box, Pixel pixel,
             PixelUnpackParameters const &params, Source... source) {
-    auto const [x, y, z] = box.at;
-    auto const [format, type] = pixel;
-    std::uint64_t const w = Size(box.size[0]), h = Size(box.size[1]), d = Size(box.size[2]);
-    if (auto *const one = dynamic_cast<Texture1 *>(&texture))
-        one->subImage(level, x, w, format, type, source..., params);
-    else if (auto *const two = dynamic_cast<Texture2 *>(&texture))
-        two->subImage(level, x, y, w, h, format, type, source..., params);
-    else
-        dynamic_cast<Texture3 &>(texture).subImage(level, x, y, z, w, h, d, format, type, source...,
-                                                   params);
+    AsItsClass(texture, [&](auto &as, auto... side) {
+        as.subImage(level, box.at[side]..., Size(box.size[side])..., pixel.format, pixel.type,
+                    source..., params);
+    });
 }
 
-/// `copyTexSubImage` of whichever class, from (1, 3) in the framebuffer.
+/// `copyTexSubImage` from (1, 3) in the framebuffer.
 inline void Copy(Texture &texture, int level, Sides const &at, std::uint64_t w, std::uint64_t h) {
-    auto const [x, y, z] = at;
-    if (auto *const one = dynamic_cast<Texture1 *>(&texture))
-        one->copyTexSubImage(level, x, 1, 3, w);
-    else if (auto *const two = dynamic_cast<Texture2 *>(&texture))
-        two->copyTexSubImage(level, x, y, 1, 3, w, h);
-    else
-        dynamic_cast<Texture3 &>(texture).copyTexSubImage(level, x, y, z, 1, 3, w, h);
+    AsItsClass(texture, [&](auto &as, auto... side) {
+        if constexpr (sizeof...(side) == 1)
+            as.copyTexSubImage(level, at[side]..., 1, 3, w);
+        else
+            as.copyTexSubImage(level, at[side]..., 1, 3, w, h);
+    });
 }
 
-/// `getPixelData` of whichever class, into memory or (with an offset behind it) into a buffer.
-template<class... Offset, class Destination>
-void Download(Texture const &texture, int level, Pixel pixel, unsigned int alignment,
+/// `getPixelData` into memory, or (with an offset behind it) into a buffer.
+template<class Destination, class... Offset>
+void Download(Texture &texture, int level, Pixel pixel, unsigned int alignment,
               Destination *destination, Offset... offset) {
-    auto const [format, type] = pixel;
-    if (auto *const one = dynamic_cast<Texture1 const *>(&texture)) {
-        ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, static_cast<GLint>(alignment));
-        one->getPixelData(destination, offset..., level, Texture::Format2GL(format),
-                          Texture::Type2GL(type));
-    } else if (auto *const two = dynamic_cast<Texture2 const *>(&texture)) {
-        two->getPixelData(destination, static_cast<std::size_t>(offset)..., level, format, type,
-                          alignment);
-    } else {
-        dynamic_cast<Texture3 const &>(texture).getPixelData(destination, offset..., level, format,
-                                                             type, alignment);
-    }
+    AsItsClass(texture, [&](auto &as, auto... side) {
+        if constexpr (sizeof...(side) > 1) {
+            as.getPixelData(destination, offset..., level, pixel.format, pixel.type, alignment);
+        } else {
+            ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, static_cast<GLint>(alignment));
+            as.getPixelData(destination, offset..., level, Texture::Format2GL(pixel.format),
+                            Texture::Type2GL(pixel.type));
+        }
+    });
 }
 
 /// The texels of an image, a few components each, x fastest.
@@ -171,13 +173,13 @@ struct Image {
                             &texels[index(to.at[0], to.at[1] + y, to.at[2] + z)]);
     }
 
-    void upload(Texture &texture, Pixel pixel, int level = 0, Sides const &at = {}) const {
+    void upload(Texture &texture, Pixel pixel, int level = 0) const {
         void const *const data = texels.data();
-        Upload(texture, level, {at, size}, pixel, kTight, data);
+        Upload(texture, level, {{}, size}, pixel, kTight, data);
     }
 
     /// A level of a texture, in an image of the same size and components.
-    std::vector<T> read(Texture const &texture, Pixel pixel, int level = 0) const {
+    std::vector<T> read(Texture &texture, Pixel pixel, int level = 0) const {
         std::vector<T> result(texels.size());
         Download(texture, level, pixel, 1, static_cast<void *>(result.data()));
         return result;

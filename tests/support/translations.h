@@ -9,9 +9,8 @@
 
 namespace oru_test {
 
-/// Both ways through an enumeration of `count` values, the last of which is `last` to OpenGL, and
-/// what lies outside of it. Each value comes back, so no two have the same GL value.
-/// @param name as the failures have it
+/// Both ways through an enumeration of `count` values, and what lies outside of it. Each value
+/// comes back, so no two have the same GL value.
 template<class Enumeration>
 void ExpectTranslation(std::string const &name, unsigned int (*toGL)(Enumeration),
                        Enumeration (*fromGL)(unsigned int), unsigned int count, GLenum last) {

@@ -8,45 +8,29 @@
 
 #include <fstream>
 
-namespace {
-
-void Draw() {
-    ORU_GL(ClearDepth, 0.125);
+static void MakeCalls() {
     ORU_GL(ColorMask, GL_TRUE, GL_FALSE, GL_TRUE, GL_FALSE);
     ORU_GL(BlendFunc, GL_ONE, GL_ZERO);
     ORU_GL(Clear, GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT);
     ORU_GL(Ortho, -1.5, 1.5, -1, 1, -1e-7, 1234567.25);
     ORU_GL(Begin, GL_TRIANGLE_FAN);
     ORU_GL(Color3b, 'a', '#', '~');
-    ORU_GL(Color4ub, 'R', 'G', 'B', 'A');
-    ORU_GL(Color3ui, 0, 1, 4294967295u);
-    ORU_GL(Vertex2s, -32768, 32767);
     ORU_GL(Vertex3i, -2147483647 - 1, 0, 2147483647);
     ORU_GL(Vertex4f, 16777216.f, 1e-30f, -0.0f, -1.f / 3);
     ORU_GL0(End);
     GLubyte const bits[] = {0xAA};
     ORU_GL(Bitmap, 8, 1, 0, 0.5f, 8, 0, bits);
-}
 
-void UseObjects() {
     GLuint buffer = 0;
     ORU_GL(GenBuffers, 1, &buffer);
     ORU_GL(BindBuffer, GL_ARRAY_BUFFER, buffer);
     ORU_GL(BufferData, GL_ARRAY_BUFFER, 4096, nullptr, GL_STREAM_DRAW);
     ORU_GL(VertexPointer, 3, GL_FLOAT, 32, reinterpret_cast<void const *>(16));
-    ORU_GL(MapBufferRange, GL_ARRAY_BUFFER, 64, 128,
-           GL_MAP_WRITE_BIT | GL_MAP_INVALIDATE_RANGE_BIT);
-
     GLhandleARB const program = ORU_GL0(CreateProgramObjectARB);
-    GLhandleARB const shader = ORU_GL(CreateShaderObjectARB, GL_VERTEX_SHADER_ARB);
-    ORU_GL(AttachObjectARB, program, shader);
     ORU_GL(BindAttribLocationARB, program, 3, "lights[2].colour");
-
     GLsync const sync = ORU_GL(FenceSync, GL_SYNC_GPU_COMMANDS_COMPLETE, 0);
     ORU_GL(ClientWaitSync, sync, GL_SYNC_FLUSH_COMMANDS_BIT, 10000000000u);
 }
-
-} // namespace
 
 int main(int count, char **arguments) {
     if (count != 2)
@@ -55,10 +39,7 @@ int main(int count, char **arguments) {
     ORU::OGL::ContextOffscreen const context;
     context.makeCurrent();
     std::ofstream file(arguments[1], std::ios_base::binary);
-    {
-        ORU::OGL::InterceptorScope<ORU::OGL::OpenGLTracer> const tracer(file);
-        Draw();
-        UseObjects();
-    }
+    ORU::OGL::InterceptorScope<ORU::OGL::OpenGLTracer> const tracer(file);
+    MakeCalls();
     return file.flush() ? 0 : 1;
 }

@@ -4,12 +4,10 @@
 #include "apps/common/imagefile.h"
 #include "apps/common/pngcodec.h"
 #include "apps/common/unicode.h"
-#include "tests/apps/common/foreignfiles.h"
 #include "tests/support/pictures.h"
 #include "tests/support/program.h"
 
 #include <gmock/gmock.h>
-#include <gtest/gtest.h>
 
 namespace apps_test {
 

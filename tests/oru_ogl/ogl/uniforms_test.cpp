@@ -1,12 +1,9 @@
 // The uniform setters: every one in its four forms, read back from the program.
 #include "tests/support/objecttest.h"
 
-#include "oru/oru_ogl/ogl/internal/programimplcore.h"
 #include "oru/oru_ogl/ogl/programogl.h"
 
-#include <algorithm>
 #include <functional>
-#include <type_traits>
 
 using namespace ORU::OGL;
 using namespace oru_test;
@@ -15,16 +12,21 @@ namespace {
 
 using Floats = std::vector<float>;
 
-enum Form { LOCATION, NAME, LOCATION_UNSAFE, NAME_UNSAFE, FORMS };
+std::string const kHead = "#version 120\n#extension GL_ARB_texture_rectangle : enable\nuniform ";
 
-/// A setter with values, and what the program must hold then.
-template<class AnyProgram>
+enum Form { LOCATION, NAME, LOCATION_UNSAFE, NAME_UNSAFE };
+
+/// A setter with values for the uniform `u`, and what the program must hold then.
 struct Case {
-    std::string type;      ///< of the uniform, in GLSL
-    int elements;          ///< of an array, 0 for none
-    unsigned int asserted; ///< the GL type that the guarded form asserts, 0 for none
-    Floats element;        ///< the last element's components
-    std::function<void(AnyProgram &, Form, int, char const *)> set;
+    std::string type; ///< of the uniform, in GLSL
+    int elements;     ///< of an array, 0 for none
+    std::string use;  ///< an expression in GLSL without which it would be left out
+    Floats element;   ///< the last element's components
+    std::function<void(Program &, Form, int)> set;
+
+    std::string index(int number) const {
+        return elements ? "[" + std::to_string(number) + "]" : "";
+    }
 };
 
 // Values of no two alike, so that an exchanged pair shows.
@@ -46,161 +48,89 @@ Floats Transposed(float const *data, int n) {
     return result;
 }
 
-template<class AnyProgram>
-std::vector<Case<AnyProgram>> Cases() {
+std::vector<Case> Cases() {
     unsigned char const two = 2, zero = 0, nine = 9, one = 1;
-#define ORU_CASE(type, elements, asserted, expected, setter, ...)                                  \
+#define ORU_CASE(type, elements, use, expected, setter, ...)                                       \
     {                                                                                              \
-        type, elements, asserted, expected,                                                        \
-            [=](AnyProgram &p, Form form, int location, char const *name) {                        \
-                form == LOCATION          ? p.setter(location, __VA_ARGS__)                        \
-                : form == NAME            ? p.setter(name, __VA_ARGS__)                            \
-                : form == LOCATION_UNSAFE ? p.setter##_Unsafe(location, __VA_ARGS__)               \
-                                          : p.setter##_Unsafe(name, __VA_ARGS__);                  \
-            }                                                                                      \
+        type, elements, use, expected, [=](Program &p, Form form, int location) {                  \
+            form == LOCATION          ? p.setter(location, __VA_ARGS__)                            \
+            : form == NAME            ? p.setter("u", __VA_ARGS__)                                 \
+            : form == LOCATION_UNSAFE ? p.setter##_Unsafe(location, __VA_ARGS__)                   \
+                                      : p.setter##_Unsafe("u", __VA_ARGS__);                       \
+        }                                                                                          \
     }
 // One to four of the values, in a uniform of as many components.
-#define ORU_VALUES(scalar, vector, asserted, a, b, c, d)                                           \
-    ORU_CASE(scalar, 0, asserted, ToFloats(a), setUniform, a),                                     \
-        ORU_CASE(vector "2", 0, asserted##_VEC2, ToFloats(a, b), setUniform, a, b),                \
-        ORU_CASE(vector "3", 0, asserted##_VEC3, ToFloats(a, b, c), setUniform, a, b, c),          \
-        ORU_CASE(vector "4", 0, asserted##_VEC4, ToFloats(a, b, c, d), setUniform, a, b, c, d)
+#define ORU_VALUES(scalar, vector, a, b, c, d)                                                     \
+    ORU_CASE(scalar, 0, "u", ToFloats(a), setUniform, a),                                          \
+        ORU_CASE(vector "2", 0, "u", ToFloats(a, b), setUniform, a, b),                            \
+        ORU_CASE(vector "3", 0, "u", ToFloats(a, b, c), setUniform, a, b, c),                      \
+        ORU_CASE(vector "4", 0, "u", ToFloats(a, b, c, d), setUniform, a, b, c, d)
 #define ORU_ARRAYS(ints, floats, n, setter)                                                        \
-    ORU_CASE(ints, 3, 0, Floats(kInts + 2 * n, kInts + 3 * n), setter, 3, kInts),                  \
-        ORU_CASE(floats, 3, 0, Floats(kFloats + 2 * n, kFloats + 3 * n), setter, 3, kFloats)
+    ORU_CASE(ints, 3, "u[2]", Floats(kInts + 2 * n, kInts + 3 * n), setter, 3, kInts),             \
+        ORU_CASE(floats, 3, "u[2]", Floats(kFloats + 2 * n, kFloats + 3 * n), setter, 3, kFloats)
 // One matrix, and two that are turned over.
-#define ORU_MATRIX(type, n, asserted, single, several)                                             \
-    ORU_CASE(type, 0, asserted, Floats(kFloats, kFloats + n * n), single, kFloats, zero),          \
-        ORU_CASE(type, 2, asserted, Transposed(kFloats + n * n, n), several, 2, kFloats, one)
+#define ORU_MATRIX(type, n, single, several)                                                       \
+    ORU_CASE(type, 0, "u[0]", Floats(kFloats, kFloats + n * n), single, kFloats, zero),            \
+        ORU_CASE(type, 2, "u[1][0]", Transposed(kFloats + n * n, n), several, 2, kFloats, one)
     return {
-        ORU_VALUES("bool", "bvec", GL_BOOL, true, false, true, true),
+        ORU_VALUES("bool", "bvec", true, false, true, true),
         // The bytes themselves, in an integer.
-        ORU_VALUES("int", "ivec", GL_BOOL, two, zero, nine, one),
-        ORU_VALUES("int", "ivec", GL_INT, -5, 6, 7, 8),
-        ORU_VALUES("float", "vec", GL_FLOAT, 0.5f, -2.f, 3.f, 4.f),
-        ORU_CASE("sampler1D", 0, GL_SAMPLER_1D, Floats{3}, setUniformSampler1D, 3),
-        ORU_CASE("sampler2D", 0, GL_SAMPLER_2D, Floats{4}, setUniformSampler2D, 4),
-        ORU_CASE("sampler2DRect", 0, GL_SAMPLER_2D_RECT, Floats{5}, setUniformSampler2DRECT, 5),
-        ORU_CASE("sampler3D", 0, GL_SAMPLER_3D, Floats{6}, setUniformSampler3D, 6),
+        ORU_VALUES("int", "ivec", two, zero, nine, one),
+        ORU_VALUES("int", "ivec", -5, 6, 7, 8),
+        ORU_VALUES("float", "vec", 0.5f, -2.f, 3.f, 4.f),
+        ORU_CASE("sampler1D", 0, "texture1D(u, 0.0)", Floats{3}, setUniformSampler1D, 3),
+        ORU_CASE("sampler2D", 0, "texture2D(u, vec2(0))", Floats{4}, setUniformSampler2D, 4),
+        ORU_CASE("sampler2DRect", 0, "texture2DRect(u, vec2(0))", Floats{5},
+                 setUniformSampler2DRECT, 5),
+        ORU_CASE("sampler3D", 0, "texture3D(u, vec3(0))", Floats{6}, setUniformSampler3D, 6),
         ORU_ARRAYS("int", "float", 1, setUniform),
         ORU_ARRAYS("ivec2", "vec2", 2, setUniform2),
         ORU_ARRAYS("ivec3", "vec3", 3, setUniform3),
         ORU_ARRAYS("ivec4", "vec4", 4, setUniform4),
-        ORU_MATRIX("mat2", 2, GL_FLOAT_MAT2, setUniformMatrix2, setUniformMatrices2),
-        ORU_MATRIX("mat3", 3, GL_FLOAT_MAT3, setUniformMatrix3, setUniformMatrices3),
-        ORU_MATRIX("mat4", 4, GL_FLOAT_MAT4, setUniformMatrix4, setUniformMatrices4),
+        ORU_MATRIX("mat2", 2, setUniformMatrix2, setUniformMatrices2),
+        ORU_MATRIX("mat3", 3, setUniformMatrix3, setUniformMatrices3),
+        ORU_MATRIX("mat4", 4, setUniformMatrix4, setUniformMatrices4),
     };
-#undef ORU_MATRIX
-#undef ORU_ARRAYS
-#undef ORU_VALUES
-#undef ORU_CASE
-}
-
-/// The number in brackets, for arrays.
-std::string Index(int elements, int number) {
-    return elements ? "[" + std::to_string(number) + "]" : "";
-}
-
-/// A fragment shader in which every case has a uniform of its own, and none is left out as unused.
-template<class Cases>
-std::string Source(Cases const &cases) {
-    std::string uniforms = "#version 120\n#extension GL_ARB_texture_rectangle : enable\n", sum;
-    for (std::size_t i = 0; i < cases.size(); ++i) {
-        auto const &[type, elements, asserted, element, set] = cases[i];
-        std::string const name = "u" + std::to_string(i);
-        uniforms += "uniform " + type + " " + name + Index(elements, elements) + ";\n";
-        std::string use = name + Index(elements, elements - 1);
-        if (type.find("mat") == 0)
-            use += "[0]";
-        if (type.find("sampler") == 0)
-            use = "texture" + type.substr(7) + "(" + use +
-                  (type[7] == '1' ? ", 0.0)" : ", vec" + type.substr(7, 1) + "(0))");
-        sum += " + float(" + use + ")";
-    }
-    return uniforms + "void main() { gl_FragColor = vec4(0.0" + sum + "); }";
-}
-
-/// Notes what it is asked to assert.
-class Body : public ProgramImplCore {
-public:
-    using ProgramImplCore::setUniform;
-    mutable std::vector<int> asserted;
-    void assertActiveUniformType(int location, unsigned int type,
-                                 unsigned int count) const override {
-        asserted = {location, static_cast<int>(type), static_cast<int>(count)};
-    }
-};
-
-/// Every setter in one form: its calls, what it asserts and sets, and what it refuses.
-template<class AnyProgram>
-void ExpectSetters(Form form) {
-    auto const cases = Cases<AnyProgram>();
-    std::string const source = Source(cases);
-    char const *const text = source.c_str();
-    AnyProgram program, other;
-    for (AnyProgram *const each : {&program, &other}) {
-        each->loadFragmentShader(1, &text, nullptr);
-        each->link(true);
-    }
-    bool const isNamed = form == NAME || form == NAME_UNSAFE;
-    for (std::size_t i = 0; i < cases.size(); ++i) {
-        auto const &c = cases[i];
-        std::string const name = "u" + std::to_string(i);
-        SCOPED_TRACE(testing::Message() << name << ", " << c.type << ", in form " << form);
-        int const location = program.getUniformLocation(name.c_str());
-        auto const set = [&](int at) { c.set(program, form, at, name.c_str()); };
-        auto const read = [&] {
-            std::string const last = name + Index(c.elements, c.elements - 1);
-            Floats values(16);
-            ORU_GL(GetUniformfv, static_cast<GLuint>(Get(GL_CURRENT_PROGRAM)),
-                   program.getUniformLocation(last.c_str()), values.data());
-            values.resize(c.element.size());
-            return values;
-        };
-        program.enable();
-        EXPECT_EQ(Floats(c.element.size()), read());
-        bool const isArray = c.asserted == 0, isMatrix = c.type.find("mat") == 0;
-        {
-            Pushed<CountingForwarder> calls;
-            set(location);
-            // By name it is asked twice whether the program is current, for matrices once.
-            int const queries = form == LOCATION          ? 1
-                                : form != NAME || isArray ? 0
-                                : isMatrix                ? 1
-                                                          : 2;
-            EXPECT_EQ(isNamed ? 1 : 0, calls->count("GetUniformLocation"));
-            EXPECT_EQ(queries, calls->count("GetIntegerv"));
-            EXPECT_EQ(queries + (isNamed ? 2 : 1), calls->total());
-            calls->reset();
-            if (form == LOCATION_UNSAFE)
-                set(-1);
-            EXPECT_EQ(0, calls->total());
-        }
-        EXPECT_EQ(c.element, read());
-        if constexpr (std::is_same_v<AnyProgram, Body>) {
-            std::vector<int> asserted = {location, static_cast<int>(c.asserted),
-                                         std::max(c.elements, 1)};
-            if (isArray || form >= LOCATION_UNSAFE)
-                asserted.clear();
-            EXPECT_EQ(asserted, program.asserted);
-            program.asserted.clear();
-        }
-        // An array set by name goes to the program that is current, as what is set unsafely.
-        other.enable();
-        bool const asks = form == LOCATION || (form == NAME && !isArray);
-        EXPECT_FAILURE(asks ? "Program must be enabled to set uniform parameter" : "",
-                       set(location));
-    }
-    other.disable();
 }
 
 } // namespace
 
 class UniformsTest : public ObjectTest {};
 
+// Every setter in every form: its calls, what it sets, and what it refuses.
 TEST_F(UniformsTest, EverySetterInEveryForm) {
-    for (int form = 0; form < FORMS; ++form) {
-        ExpectSetters<Program>(static_cast<Form>(form));
-        ExpectSetters<Body>(static_cast<Form>(form));
+    for (Case const &c : Cases()) {
+        std::string const source = kHead + c.type + " u" + c.index(c.elements) +
+                                   "; void main() { gl_FragColor = vec4(float(" + c.use + ")); }";
+        for (Form const form : {LOCATION, NAME, LOCATION_UNSAFE, NAME_UNSAFE}) {
+            SCOPED_TRACE(c.type + c.index(c.elements) + " in form " + std::to_string(form));
+            Program program, other;
+            for (Program *const each : {&program, &other}) {
+                char const *const text = source.c_str();
+                each->loadFragmentShader(1, &text, nullptr);
+                each->link(true);
+            }
+            int const location = program.getUniformLocation("u");
+            program.enable();
+            InterceptorScope<CountingForwarder> calls;
+            c.set(program, form, location);
+            if (form == LOCATION_UNSAFE) {
+                c.set(program, form, -1); // makes no call
+                EXPECT_EQ(1, calls->total());
+            }
+            Floats values(16);
+            ORU_GL(GetUniformfv, static_cast<GLuint>(Get(GL_CURRENT_PROGRAM)),
+                   program.getUniformLocation(("u" + c.index(c.elements - 1)).c_str()),
+                   values.data());
+            values.resize(c.element.size());
+            EXPECT_EQ(c.element, values);
+
+            // An array set by name goes to the program that is current, as what is set unsafely.
+            other.enable();
+            bool const isArray = c.elements == 3;
+            bool const asks = form == LOCATION || (form == NAME && !isArray);
+            EXPECT_FAILURE(asks ? "Program must be enabled to set uniform parameter" : "",
+                           c.set(program, form, location));
+        }
     }
 }
