@@ -52,15 +52,6 @@ int ReleaseHandle(T handle) {
 #define ORU_CL_HANDLE(Handle)                                                                      \
     template ORU_API int RetainHandle(Handle);                                                     \
     template ORU_API int ReleaseHandle(Handle);
-
-ORU_CL_HANDLE(cl_platform_id)
-ORU_CL_HANDLE(cl_device_id)
-ORU_CL_HANDLE(cl_context)
-ORU_CL_HANDLE(cl_command_queue)
-ORU_CL_HANDLE(cl_mem)
-ORU_CL_HANDLE(cl_sampler)
-ORU_CL_HANDLE(cl_program)
-ORU_CL_HANDLE(cl_kernel)
-ORU_CL_HANDLE(cl_event)
+#include "oru/oru_ocl/openclhandles.inc"
 
 } // namespace ORU::OCL

@@ -19,6 +19,14 @@ ORU_API int RetainHandle(T handle);
 template<class T>
 ORU_API int ReleaseHandle(T handle);
 
+#if !defined(ORU_BUILDING)
+// For hosts, whose compilers would look for the definitions otherwise.
+#define ORU_CL_HANDLE(Handle)                                                                      \
+    extern template ORU_API int RetainHandle(Handle);                                              \
+    extern template ORU_API int ReleaseHandle(Handle);
+#include "oru/oru_ocl/openclhandles.inc"
+#endif
+
 /// Holds one OpenCL handle of type `T`, or null, and one reference to it: copying retains,
 /// destroying releases, and a move is a copy.
 template<class T>

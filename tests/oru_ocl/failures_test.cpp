@@ -161,6 +161,10 @@ TEST_F(FailuresTest, EachSaysWhatFailedAndWhere) {
         Failure const failure = FailureOf(failing.operation);
         EXPECT_EQ(std::string("OCL Exception: ") + ExceptionOCL::ErrorToCString(code),
                   failure.text);
+        bool const isNamed = failure.text.find("UNKNOWN") == std::string::npos;
+        EXPECT_EQ(0u, failure.note.find("in " + entryPoint));
+        EXPECT_NE(isNamed, failure.note.find(std::to_string(code)) != std::string::npos)
+            << failure.note;
         EXPECT_EQ(0u, failure.file.find("oru/oru_ocl/"));
         std::string const call = "ORU_CL(" + std::string(failing.entryPoint) + ",";
         EXPECT_NE(std::string::npos, SourceLine(failure.file, failure.line).find(call))

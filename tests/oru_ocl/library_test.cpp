@@ -94,7 +94,10 @@ TEST_P(LibraryTest, LooksWhereTheFirstPathSays) {
     bool const found = GetParam() < 2;
     EXPECT_EQ(found, Library::IsOpenCLAvailable(paths[GetParam()]));
     EXPECT_EQ(found, Library::IsOpenCLAvailable(paths[3 - GetParam()]));
-    EXPECT_FAILURE(found ? "" : "openCLLibraryHandle", Library::Initialize());
+    oru_test::Failure const failure = oru_test::FailureOf([] { Library::Initialize(); });
+    EXPECT_EQ(found ? "" : "openCLLibraryHandle", failure.text);
+    EXPECT_EQ(found ? std::string::npos : 0u,
+              failure.note.find("no OpenCL runtime at " + paths[GetParam()] + "OpenCL.dll ("));
     EXPECT_EQ(found, ExtensionManager::instance() != nullptr);
     EXPECT_FAILURE(found ? "" : "bInitialized_", Library::Terminate());
 }

@@ -15,6 +15,7 @@ struct Failure {
     std::string text; ///< the message, or what() of an exception without one; empty: no failure
     std::string file;
     int line = 0;
+    std::string note;
 };
 
 /// What a call throws.
@@ -23,11 +24,11 @@ Failure FailureOf(Call call) {
     try {
         call();
     } catch (ORU::LogicalException const &e) {
-        return {*e.message() != '\0' ? e.message() : e.what(), e.file(), e.line()};
+        return {*e.message() != '\0' ? e.message() : e.what(), e.file(), e.line(), e.note()};
     } catch (std::bad_alloc const &) {
         throw; // no exception of a check: the test's own matter
     } catch (std::exception const &e) {
-        return {e.what(), "", 0};
+        return {e.what(), "", 0, ""};
     }
     return {};
 }

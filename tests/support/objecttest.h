@@ -30,7 +30,12 @@ class NameLedger : public ORU::OGL::OpenGLForwarder {
 public:
 #define ORU_FOLLOW(Objects)                                                                        \
     void cgmGen##Objects(char const *file, unsigned int line, GLsizei n, GLuint *names) override { \
-        OpenGLForwarder::cgmGen##Objects(file, line, n, names);                                    \
+        try {                                                                                      \
+            OpenGLForwarder::cgmGen##Objects(file, line, n, names);                                \
+        } catch (...) { /* of an error that was pending: the names are made */                     \
+            note(#Objects, n, names, 1);                                                           \
+            throw;                                                                                 \
+        }                                                                                          \
         note(#Objects, n, names, 1);                                                               \
     }                                                                                              \
     void cgmDelete##Objects(char const *file, unsigned int line, GLsizei n, GLuint const *names)   \

@@ -1,14 +1,17 @@
 // What failures say besides their fixed texts, and calls of functions that are not there.
-#include "tests/support/failure.h"
-#include "tests/support/glfixture.h"
+#include "tests/support/objecttest.h"
 
 #include "oru/core/exceptions/calledfrom.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/ogl/bufferogl.h"
+#include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/programogl.h"
+#include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 
 #include <cstring>
 #include <iterator>
+#include <memory>
 #include <sstream>
 #include <string>
 #include <vector>
@@ -58,7 +61,7 @@ std::vector<Extended> ExtendedOperations() {
 
 } // namespace
 
-class NotesTest : public oru_test::OffscreenTest {};
+class NotesTest : public oru_test::ObjectTest {};
 
 // Hosts that called such a function saw a jump to address 0.
 TEST_F(NotesTest, AFunctionThatIsNotThereIsNamed) {
@@ -118,9 +121,43 @@ TEST_F(NotesTest, AnAttributeThatIsNotUsedIsNamed) {
     program.loadVertexShader(1, &vertex, nullptr);
     program.loadFragmentShader(1, &fragment, nullptr);
     program.link(true);
-    VertexBuffer buffer(
+    VertexBuffer misspelt(
         {{"positoin", VertexBuffer::ATTRIBUTETYPE_FLOAT2, VertexBuffer::EXPECTEDUSAGE_STATIC_DRAW}},
         3, VertexBuffer::PRIMITIVETYPE_TRIANGLES);
     EXPECT_EQ("the program has no active attribute \"positoin\"",
-              NoteOf([&] { buffer.setupWithProgram(&program); }));
+              NoteOf([&] { misspelt.setupWithProgram(&program); }));
+}
+
+// What the host left pending ends the library's next call, after its work is done: no name may leak
+// or be deleted twice for that, and a buffer knows whether it is mapped.
+TEST_F(NotesTest, APendingErrorOfTheHostLosesNothing) {
+    auto const failsAfterError = [](auto call) {
+        ::glEnable(0);
+        EXPECT_EQ("GL_INVALID_ENUM", MessageOf(call));
+    };
+    failsAfterError([] { Texture2D(Texture::INTERNALFORMAT_RGBA8, 4, 4, false); });
+    failsAfterError([] { Framebuffer(); });
+    auto const make = [] {
+        return std::make_unique<Buffer>(4, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW,
+                                        nullptr);
+    };
+    failsAfterError(make);
+
+    auto const buffer = make();
+    buffer->bind();
+    failsAfterError([&] { buffer->map(GL_WRITE_ONLY); });
+    EXPECT_TRUE(buffer->isMapped());
+    failsAfterError([&] { buffer->unmap(); });
+    EXPECT_FALSE(buffer->isMapped());
+    Buffer::BindDefaultArrayBuffer();
+
+    Program program;
+    char const *const vertex = "attribute vec2 p; void main() { gl_Position = p.xyxy; }";
+    program.loadVertexShader(1, &vertex, nullptr);
+    program.link(false);
+    VertexBuffer vertices(
+        {{"p", VertexBuffer::ATTRIBUTETYPE_FLOAT2, VertexBuffer::EXPECTEDUSAGE_STATIC_DRAW}}, 3,
+        VertexBuffer::PRIMITIVETYPE_TRIANGLES);
+    vertices.setupWithProgram(&program);
+    failsAfterError([&] { vertices.setupWithProgram(&program); });
 }
