@@ -7,6 +7,7 @@
 #include <algorithm>
 #include <iterator>
 #include <sstream>
+#include <vector>
 
 namespace oru_test {
 

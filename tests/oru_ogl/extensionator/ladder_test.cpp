@@ -42,7 +42,7 @@ TEST_F(LadderTest, HoldsEveryVersionUpToItsOwn) {
         if (word[0] != 'G') {
             rung = static_cast<unsigned int>(std::stoi(word));
         } else {
-            unnamed += Has(word) ? 0 : 1;
+            unnamed += Has(word) ? 0u : 1u;
             EXPECT_EQ(version >= rung || Has(word),
                       record().isSupported(record().nameToEnumGL(word.c_str())))
                 << word;
