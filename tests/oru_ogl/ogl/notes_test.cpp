@@ -61,10 +61,11 @@ std::vector<Extended> ExtendedOperations() {
 
 } // namespace
 
+using MissingFunctionsTest = oru_test::OffscreenTest;
 class NotesTest : public oru_test::ObjectTest {};
 
 // Hosts that called such a function saw a jump to address 0.
-TEST_F(NotesTest, AFunctionThatIsNotThereIsNamed) {
+TEST_F(MissingFunctionsTest, AreNamed) {
     auto const operations = ExtendedOperations();
     std::vector<PROC> entries(operations.size());
     std::memcpy(entries.data(), &ExtensionManager::CurrentTable(), sizeof(FunctionTable));
