@@ -2,6 +2,7 @@
 #include "tests/support/objecttest.h"
 
 #include "oru/core/exceptions/calledfrom.h"
+#include "oru/oru_ogl/extensionator/openglerrorchecker.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
@@ -21,11 +22,12 @@ using oru_test::MessageOf;
 
 namespace {
 
-/// What the call of an operation with zeros says.
+/// What the call of an operation with zeros says, of the chain's last link.
 template<class Result, class... Arguments>
 std::string SaidBy(Result (OpenGLInterceptor::*operation)(char const *, unsigned int,
                                                           Arguments...)) {
-    return MessageOf([&] { (OpenGLInterceptor::Instance()->*operation)("f", 1, Arguments()...); });
+    OpenGLErrorChecker checker;
+    return MessageOf([&] { (checker.*operation)("f", 1, Arguments()...); });
 }
 
 /// What streaming the failure of a call gives behind its fixed form.
