@@ -57,7 +57,8 @@ TEST(Exceptions, AreClonedWholeAndFreedThroughTheHooks) {
         oru_test::CountingHooks hooks;
         ScopedPtr<ExceptionBase> clone(original->clone());
         EXPECT_EQ(hooks.outstanding().count(clone.get()), 1u);
-        EXPECT_EQ(typeid(*clone), typeid(*original));
+        ORU::ExceptionBase const &copied = *clone;
+        EXPECT_EQ(typeid(copied), typeid(*original));
         EXPECT_EQ(Written(*clone), written);
         clone.reset();
         EXPECT_TRUE(hooks.outstanding().empty());
