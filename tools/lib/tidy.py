@@ -20,7 +20,7 @@ def dependencies(build):
     """What each object was made from, as Ninja recorded it."""
     text = subprocess.run(["ninja", "-C", build, "-t", "deps"], capture_output=True, text=True,
                           check=True).stdout
-    for block in text.split("\n\n"):
+    for block in text.strip().split("\n\n"):
         head, *files = block.splitlines()
         yield head.partition(":")[0], [file.strip() for file in files]
 
@@ -63,7 +63,8 @@ def main(tidy, build):
         if not FOLDERS.match(str(source.relative_to(ROOT))):
             continue
         total += 1
-        state = digest(entry["command"], objects.get(entry["output"], [str(source)]), configuration)
+        made = re.search(r" -o (\S+)", entry["command"])[1]
+        state = digest(entry["command"], objects.get(made, [str(source)]), configuration)
         if not (clean_folder / state).exists():
             waiting[str(source)] = state
     print(f"{total - len(waiting)} of {total} files are known to be clean", flush=True)
