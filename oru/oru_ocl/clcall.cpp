@@ -48,13 +48,12 @@ void ThrowOCL(char const *file, unsigned int line, cl_int code) {
 }
 
 void ThrowOCL(char const *file, unsigned int line, cl_int code, char const *function) {
-    ExceptionOCL failure(file, line, "", static_cast<unsigned int>(code));
-    failure.addNote(ComposeText("in ", function));
+    std::string note = ComposeText("in ", function);
     if (std::string_view(ExceptionOCL::ErrorToCString(code)) == "UNKNOWN CL ERROR CODE") {
         char const *const name = LaterErrorName(code);
-        failure.addNote(ComposeText(name ? name : "code", ' ', code));
+        note += ComposeText(", ", name ? name : "code", ' ', code);
     }
-    throw failure;
+    throw ORU_private::Noted(ExceptionOCL(file, line, "", static_cast<unsigned int>(code)), note);
 }
 
 } // namespace ORU::OCL

@@ -13,9 +13,7 @@ void ThrowInternal(char const *file, int line, std::string const &message) {
 
 void ThrowInternalNoted(char const *file, int line, std::string const &message,
                         std::string const &note) {
-    ORU::InternalException failure(file, line, message.c_str());
-    failure.addNote(note);
-    throw failure;
+    throw Noted(ORU::InternalException(file, line, message.c_str()), note);
 }
 
 } // namespace ORU_private

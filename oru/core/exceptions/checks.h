@@ -26,6 +26,13 @@ namespace ORU_private {
 [[noreturn]] ORU_API ORU_COLD void
 ThrowInternalNoted(char const *file, int line, std::string const &message, std::string const &note);
 
+/// A failure with a note more, to be thrown.
+template<class Failure>
+Failure Noted(Failure failure, std::string const &note) {
+    failure.addNote(note);
+    return failure;
+}
+
 } // namespace ORU_private
 
 /// Throws `InternalException` with the expression's source text when the expression is false; with

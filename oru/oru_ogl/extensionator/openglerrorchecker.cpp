@@ -40,11 +40,11 @@ char const kWithoutContext[] =
 void ThrowOpenGLError(char const *file, unsigned int line, unsigned int error,
                       char const *function) {
     auto const *name = OpenGLErrorChecker::GetOpenGLErrorString(error);
-    ExceptionOGL failure(file, line, reinterpret_cast<char const *>(name), error);
-    failure.addNote(ComposeText("in ", function));
+    std::string note = ComposeText("in ", function);
     if (!::wglGetCurrentContext())
-        failure.addNote(kWithoutContext);
-    throw failure;
+        note += ComposeText(", ", kWithoutContext);
+    throw ORU_private::Noted(ExceptionOGL(file, line, reinterpret_cast<char const *>(name), error),
+                             note);
 }
 
 void ThrowMissingFunction(char const *file, unsigned int line, char const *function,

@@ -218,8 +218,8 @@ DisplayDeviceKey Context::DisplayDeviceFromWindow(HWND const &window) {
 }
 
 DisplayDeviceKey const &Context::PrimaryDisplayDevice() {
-    static DisplayDeviceKey const primary = FindPrimary(); // tried again after a failure
-    return primary;
+    static DisplayDeviceKey const kPrimary = FindPrimary(); // tried again after a failure
+    return kPrimary;
 }
 
 ambra::lumo::TVec2<int> Context::DisplayOrigin(std::string const &adapterName,
