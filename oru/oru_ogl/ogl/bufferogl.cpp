@@ -2,6 +2,7 @@
 #include "oru/oru_ogl/ogl/bufferogl.h"
 
 #include "oru/core/utility/composetext.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"

@@ -80,8 +80,7 @@ void BoundingRect::include(BoundingRegionBase const &region) {
     BoundingRect const r = rect ? *rect : RectAround(region);
     if (isEmpty()) {
         *this = r;
-    } else if (!region.isEmpty()) { // the rectangle around numbers and NaNs can be empty where the
-                                    // region is not
+    } else if (!region.isEmpty()) { // r, where NaNs are left out, can be empty when it is not
         minimum_ = Lower(minimum_, r.minimum_);
         maximum_ = Higher(maximum_, r.maximum_);
     }
