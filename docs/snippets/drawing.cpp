@@ -247,3 +247,28 @@ TEST_F(DrawingGuide, ScopesPutStateBack) {
     EXPECT_FALSE(::glIsEnabled(GL_BLEND));
     EXPECT_FALSE(::glIsEnabled(GL_LINE_STIPPLE));
 }
+
+TEST_F(DrawingGuide, NamesComeAndGo) {
+    unsigned int name = 0;
+    ORU_GL(GenTextures, 1, &name);
+    ORU_GL(BindTexture, GL_TEXTURE_2D, name);
+    ORU_GL(TexImage2D, GL_TEXTURE_2D, 0, GL_RGBA8, 8, 4, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
+    unsigned int storage = 0;
+    ORU_GL(GenRenderbuffersEXT, 1, &storage);
+    ORU_GL(BindRenderbufferEXT, GL_RENDERBUFFER_EXT, storage);
+    ORU_GL(RenderbufferStorageEXT, GL_RENDERBUFFER_EXT, GL_DEPTH_COMPONENT24, 8, 4);
+    Program shading;
+    {
+        // [names]
+        Texture2D const camera(name, borrow_name_tag());    // the name stays its owner's
+        Renderbuffer const depth(storage, take_name_tag()); // deleted with the object
+        unsigned int const program = shading.disown();      // the caller's to delete now
+        // [names]
+        EXPECT_EQ(8u, camera.width(0));
+        EXPECT_EQ(4, depth.height());
+        ORU_GL(DeleteProgram, program);
+    }
+    EXPECT_TRUE(ORU_GL(IsTexture, name));
+    EXPECT_FALSE(ORU_GL(IsRenderbufferEXT, storage));
+    ORU_GL(DeleteTextures, 1, &name);
+}

@@ -24,6 +24,6 @@ Buffer::Buffer(Context const &context, MemoryAccessFlags access, bool allocHost,
 }
 
 Buffer::Buffer(Context const &context, MemoryAccessFlags access, OGL::Buffer &buffer)
-    : Memory(ORU_CL(CreateFromGLBuffer, context.id(), AccessFlags(access), buffer.objectID())) {}
+    : Memory(ORU_CL(CreateFromGLBuffer, context.id(), AccessFlags(access), buffer.checkedID())) {}
 
 } // namespace ORU::OCL

@@ -36,6 +36,15 @@ public:
     /// Commands use it between `CommandQueue::enqueueAcquireGLObjects` and
     /// `enqueueReleaseGLObjects`.
     Buffer(Context const &context, MemoryAccessFlags access, OGL::Buffer &buffer);
+
+    /// @name Over a handle that was made elsewhere
+    /// @throws InternalException when it is memory of another type
+    /// @{
+    Buffer(cl_mem handle, take_ref_tag const &tag)
+        : Memory(Checked(handle, MEMORYOBJECTTYPE_BUFFER), tag) {}
+    Buffer(cl_mem handle, add_ref_tag const &tag)
+        : Memory(Checked(handle, MEMORYOBJECTTYPE_BUFFER), tag) {}
+    /// @}
 };
 
 } // namespace ORU::OCL

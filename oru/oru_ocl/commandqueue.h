@@ -33,6 +33,14 @@ public:
     /// @param profiling whether to keep times (clGetEventProfilingInfo of the function table)
     CommandQueue(Context const &context, Device const &device, bool outOfOrder, bool profiling);
 
+    /// @name Over a handle that was made elsewhere
+    /// @{
+    CommandQueue(cl_command_queue handle, take_ref_tag const &tag)
+        : OpenCLObjectWrapper(handle, tag) {}
+    CommandQueue(cl_command_queue handle, add_ref_tag const &tag)
+        : OpenCLObjectWrapper(handle, tag) {}
+    /// @}
+
     /// @name Buffer transfers
     /// clEnqueueWriteBuffer, clEnqueueReadBuffer. Offset and size are in bytes.
     /// @{
@@ -95,12 +103,6 @@ public:
     void flush();
 
 private:
-    friend class Event;
-
-    /// Adds a reference of its own.
-    CommandQueue(cl_command_queue queue, add_ref_tag const &tag)
-        : OpenCLObjectWrapper(queue, tag) {}
-
     Event enqueueWriteImpl(Buffer &buffer, bool blocking, std::size_t offset, std::size_t size,
                            void const *source, WaitList const &waitList);
     Event enqueueReadImpl(Buffer const &buffer, bool blocking, std::size_t offset, std::size_t size,

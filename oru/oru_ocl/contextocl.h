@@ -62,6 +62,12 @@ public:
     Context(ContextProperties const &properties, Device::Type type,
             NotifyCallback const &callback = {});
 
+    /// @name Over a handle that was made elsewhere
+    /// @{
+    Context(cl_context handle, take_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    Context(cl_context handle, add_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    /// @}
+
     /// The devices in the runtime's order (clGetContextInfo).
     std::vector<Device> devices() const;
 

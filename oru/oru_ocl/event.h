@@ -16,6 +16,12 @@ class CommandQueue;
 /// The operations throw ExceptionOCL when the runtime refuses, or a waited-for command failed.
 class ORU_API Event : public OpenCLObjectWrapper<cl_event> {
 public:
+    /// @name Over a handle that was made elsewhere
+    /// @{
+    Event(cl_event handle, take_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    Event(cl_event handle, add_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    /// @}
+
     /// The queue of the command (clGetEventInfo).
     CommandQueue commandQueue() const;
 
@@ -38,9 +44,6 @@ private:
 
     /// Takes over the caller's reference.
     explicit Event(cl_event event) : OpenCLObjectWrapper(event) {}
-
-    /// Adds a reference of its own; has its place in the binary interface.
-    Event(cl_event event, add_ref_tag const &tag) : OpenCLObjectWrapper(event, tag) {}
 };
 
 } // namespace ORU::OCL

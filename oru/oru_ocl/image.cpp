@@ -24,7 +24,7 @@ static_assert(kImageInfos.isInOrder());
 cl_mem FromTexture2D(Context const &context, cl_mem_flags flags, OGL::Object const &texture,
                      unsigned int mipLevel) {
     return ORU_CL(CreateFromGLTexture2D, context.id(), flags, texture.target(),
-                  static_cast<cl_GLint>(mipLevel), texture.objectID());
+                  static_cast<cl_GLint>(mipLevel), texture.checkedID());
 }
 
 } // namespace
@@ -69,7 +69,7 @@ Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::TextureR
 
 Image2D::Image2D(Context const &context, MemoryAccessFlags access, OGL::Renderbuffer &renderbuffer)
     : Image(ORU_CL(CreateFromGLRenderbuffer, context.id(), AccessFlags(access),
-                   renderbuffer.objectID())) {}
+                   renderbuffer.checkedID())) {}
 
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, cl_image_format format,
                  std::size_t width, std::size_t height, std::size_t depth, std::size_t rowPitch,
@@ -98,6 +98,6 @@ Image3D::Image3D(Context const &context, MemoryAccessFlags access, bool allocHos
 Image3D::Image3D(Context const &context, MemoryAccessFlags access, OGL::Texture3D &texture,
                  unsigned int mipLevel)
     : Image(ORU_CL(CreateFromGLTexture3D, context.id(), AccessFlags(access), texture.target(),
-                   static_cast<cl_GLint>(mipLevel), texture.objectID())) {}
+                   static_cast<cl_GLint>(mipLevel), texture.checkedID())) {}
 
 } // namespace ORU::OCL

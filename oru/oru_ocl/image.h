@@ -37,6 +37,8 @@ public:
 
 protected:
     explicit Image(cl_mem handle) : Memory(handle) {}
+    Image(cl_mem handle, take_ref_tag const &tag) : Memory(handle, tag) {}
+    Image(cl_mem handle, add_ref_tag const &tag) : Memory(handle, tag) {}
 
     /// OpenCL's constant; 0 for a value outside the enumeration.
     static unsigned int ConvertImageInfo(ImageInfo info);
@@ -78,6 +80,15 @@ public:
     Image2D(Context const &context, MemoryAccessFlags access, OGL::TextureRECT &texture,
             unsigned int mipLevel);
     Image2D(Context const &context, MemoryAccessFlags access, OGL::Renderbuffer &renderbuffer);
+
+    /// @name Over a handle that was made elsewhere
+    /// @throws InternalException when it is memory of another type
+    /// @{
+    Image2D(cl_mem handle, take_ref_tag const &tag)
+        : Image(Checked(handle, MEMORYOBJECTTYPE_IMAGE2D), tag) {}
+    Image2D(cl_mem handle, add_ref_tag const &tag)
+        : Image(Checked(handle, MEMORYOBJECTTYPE_IMAGE2D), tag) {}
+    /// @}
     /// @}
 
 private:
@@ -101,6 +112,15 @@ public:
     /// Over one level of an OpenGL texture (clCreateFromGLTexture3D).
     Image3D(Context const &context, MemoryAccessFlags access, OGL::Texture3D &texture,
             unsigned int mipLevel);
+
+    /// @name Over a handle that was made elsewhere
+    /// @throws InternalException when it is memory of another type
+    /// @{
+    Image3D(cl_mem handle, take_ref_tag const &tag)
+        : Image(Checked(handle, MEMORYOBJECTTYPE_IMAGE3D), tag) {}
+    Image3D(cl_mem handle, add_ref_tag const &tag)
+        : Image(Checked(handle, MEMORYOBJECTTYPE_IMAGE3D), tag) {}
+    /// @}
 
 private:
     Image3D() = default;

@@ -14,6 +14,12 @@ namespace ORU::OCL {
 /// `CommandQueue::enqueueKernel`. Copies are the same kernel and share the arguments.
 class ORU_API Kernel : public OpenCLObjectWrapper<cl_kernel> {
 public:
+    /// @name Over a handle that was made elsewhere
+    /// @{
+    Kernel(cl_kernel handle, take_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    Kernel(cl_kernel handle, add_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    /// @}
+
     /// Sets an argument from raw bytes (clSetKernelArg), for example null with the size of a piece
     /// of local memory.
     /// @param index argument number from 0
@@ -58,9 +64,6 @@ private:
 
     /// Takes over the caller's reference.
     explicit Kernel(cl_kernel kernel) : OpenCLObjectWrapper(kernel) {}
-
-    /// Adds a reference of its own; has its place in the binary interface.
-    Kernel(cl_kernel kernel, add_ref_tag const &tag) : OpenCLObjectWrapper(kernel, tag) {}
 };
 
 } // namespace ORU::OCL

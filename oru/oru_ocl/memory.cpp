@@ -1,6 +1,7 @@
 // The base of OpenCL buffers and images.
 #include "oru/oru_ocl/memory.h"
 
+#include "oru/core/utility/composetext.h"
 #include "oru/core/utility/enumtable.h"
 #include "oru/oru_ocl/clcall.h"
 
@@ -30,6 +31,16 @@ constexpr EnumTable<Memory::MemoryObjectType, cl_mem_object_type, 3> kObjectType
      {Memory::MEMORYOBJECTTYPE_IMAGE3D, CL_MEM_OBJECT_IMAGE3D}}};
 static_assert(kObjectTypes.isInOrder());
 
+/// By MemoryObjectType.
+constexpr char const *kTypeNames[] = {"a buffer", "a 2-D image", "a 3-D image",
+                                      "of a type that OpenCL 1.1 does not have"};
+
+Memory::MemoryObjectType TypeOf(cl_mem handle) {
+    cl_mem_object_type type = 0;
+    ORU_CL(GetMemObjectInfo, handle, CL_MEM_TYPE, sizeof type, &type, nullptr);
+    return kObjectTypes.valueOr(type, Memory::MEMORYOBJECTTYPE_OTHER);
+}
+
 } // namespace
 
 void Memory::getInfo(MemoryInfo info, std::size_t size, void *value,
@@ -38,9 +49,14 @@ void Memory::getInfo(MemoryInfo info, std::size_t size, void *value,
 }
 
 Memory::MemoryObjectType Memory::memType() const {
-    cl_mem_object_type type = 0;
-    getInfo(MEMORYINFO_TYPE, sizeof type, &type, nullptr);
-    return kObjectTypes.valueOr(type, MEMORYOBJECTTYPE_OTHER);
+    return TypeOf(id());
+}
+
+cl_mem Memory::Checked(cl_mem handle, MemoryObjectType type) {
+    if (MemoryObjectType const actual = TypeOf(handle); actual != type)
+        ORU_THROW_INTERNAL(
+            ComposeText("The memory to make ", kTypeNames[type], " of is ", kTypeNames[actual]));
+    return handle;
 }
 
 cl_mem_flags Memory::AccessFlags(MemoryAccessFlags access) {

@@ -38,6 +38,12 @@ public:
     /// No memory.
     Memory() = default;
 
+    /// @name Over a handle that was made elsewhere
+    /// @{
+    Memory(cl_mem handle, take_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    Memory(cl_mem handle, add_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    /// @}
+
     /// Reads one property (clGetMemObjectInfo).
     /// @param size bytes at `value`, which may be null to ask for the size only
     /// @param sizeReturned receives the size of the answer in bytes; may be null
@@ -51,6 +57,10 @@ public:
 protected:
     /// Takes over the caller's reference.
     explicit Memory(cl_mem handle) : OpenCLObjectWrapper(handle) {}
+
+    /// A handle that was made elsewhere, which must be memory of a type.
+    /// @throws InternalException when it is of another type, ExceptionOCL when it is none
+    static cl_mem Checked(cl_mem handle, MemoryObjectType type);
 
     // Translations into OpenCL's constants; 0 for a value outside the enumeration.
     static cl_mem_flags AccessFlags(MemoryAccessFlags access);

@@ -5,10 +5,22 @@
 #include "oru/core/utility/export.h"
 #include "oru/oru_ocl/openclheaders.h"
 
+#include <utility>
+
 namespace ORU::OCL {
 
-/// Selects the constructor that retains the handle it is given.
+/// @name What becomes of a handle that was made elsewhere
+/// The last argument of the constructors that make an object over such a handle:
+///
+///     Event written(event, take_ref_tag());
+/// @{
+
+/// The object adds a reference of its own; the caller keeps and releases theirs.
 struct add_ref_tag {};
+
+/// The object takes over the caller's reference; after a failure it is the caller's as before.
+struct take_ref_tag {};
+/// @}
 
 /// Counts a reference to a handle up or down; platforms and devices have no count, for them and
 /// for a null handle the result is 0 and no call is made.
@@ -36,9 +48,15 @@ public:
     T const &handle() const { return handle_; }
     T const &id() const { return handle_; }
 
+    /// Gives up the handle with its reference, which is the caller's to release now. This object
+    /// holds none afterwards: the runtime refuses what it is asked.
+    T disown() { return std::exchange(handle_, nullptr); }
+
 protected:
     /// Takes over the caller's reference.
     explicit OpenCLObjectWrapper(T handle = nullptr) : handle_(handle) {}
+
+    OpenCLObjectWrapper(T handle, take_ref_tag const &) : handle_(handle) {}
 
     /// Adds a reference of its own.
     OpenCLObjectWrapper(T handle, add_ref_tag const &) : handle_(handle) { retain(); }

@@ -31,6 +31,12 @@ cl_program CreateWithBinaries(Context const &context, Program::BinaryArray const
                   array.devices().data(), array.sizes(), binaries.data(), nullptr);
 }
 
+Context ContextOf(cl_program program) {
+    cl_context context = nullptr;
+    ORU_CL(GetProgramInfo, program, CL_PROGRAM_CONTEXT, sizeof context, &context, nullptr);
+    return {context, add_ref_tag()};
+}
+
 } // namespace
 
 Program::Program(Context const &context, std::string const &source)
@@ -40,6 +46,15 @@ Program::Program(Context const &context, std::string const &source)
 
 Program::Program(Context const &context, BinaryArray const &binaries) : context_(context) {
     adopt(CreateWithBinaries(context, binaries));
+}
+
+Program::Program(cl_program handle, take_ref_tag const &) : context_(ContextOf(handle)) {
+    adopt(handle);
+}
+
+Program::Program(cl_program handle, add_ref_tag const &) : context_(ContextOf(handle)) {
+    adopt(handle);
+    retain();
 }
 
 void Program::build(std::string const &options) {

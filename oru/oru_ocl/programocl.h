@@ -33,6 +33,13 @@ public:
     /// From the binaries of an earlier build (clCreateProgramWithBinary).
     Program(Context const &context, BinaryArray const &binaries);
 
+    /// @name Over a handle that was made elsewhere
+    /// The context is asked for (clGetProgramInfo).
+    /// @{
+    Program(cl_program handle, take_ref_tag const &tag);
+    Program(cl_program handle, add_ref_tag const &tag);
+    /// @}
+
     /// Builds for all devices of the context and returns when that is done (clBuildProgram).
     /// @param options the compiler's command line, such as "-D SIZE=4 -cl-fast-relaxed-math"
     /// @throws ExceptionOCL CL_BUILD_PROGRAM_FAILURE when the source is wrong; `buildLog` then

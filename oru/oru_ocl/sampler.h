@@ -26,6 +26,12 @@ public:
     Sampler(Context const &context, bool normalizedCoordinates, SamplerAddressingMode addressing,
             SamplerFilterMode filter);
 
+    /// @name Over a handle that was made elsewhere
+    /// @{
+    Sampler(cl_sampler handle, take_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    Sampler(cl_sampler handle, add_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
+    /// @}
+
     // Properties (clGetSamplerInfo). InternalException for a mode that OpenCL 1.0 does not have.
     SamplerAddressingMode addressingMode() const;
     SamplerFilterMode filterMode() const;

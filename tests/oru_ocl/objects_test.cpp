@@ -148,6 +148,40 @@ TEST_F(MemoryTest, CopiesAndMovesShareTheHandle) {
     EXPECT_EQ(0u, runtime->calls("clRetainContext") + runtime->calls("clReleaseContext"));
 }
 
+TEST_F(MemoryTest, HandlesAreTakenOverAndGivenUp) {
+    auto const check = [&](auto object) {
+        using Object = decltype(object);
+        auto const handle = object.id();
+        int const &references = runtime->references().at(handle);
+        int const before = references;
+        {
+            Object const added(handle, add_ref_tag());
+            EXPECT_EQ(before + 1, references);
+        }
+        EXPECT_EQ(before, references);
+        EXPECT_EQ(handle, object.disown());
+        EXPECT_EQ(nullptr, object.id());
+        Object const taken(handle, take_ref_tag());
+        EXPECT_EQ(handle, taken.id());
+        EXPECT_EQ(before, references);
+    };
+    check(Context(ContextProperties(platform), device));
+    check(CommandQueue(context, device, false, false));
+    check(Buffer(context, kBoth, false, 16));
+    check(Image2D(context, kBoth, false, kRGBA8, 4, 4, 0));
+    check(Image3D(context, kBoth, false, kRGBA8, 4, 4, 4, 0, 0));
+    check(Sampler(context, false, Sampler::ADDRESS_CLAMP, Sampler::FILTER_NEAREST));
+    check(queue.enqueueMarker());
+    Program program = built("kernel void f() {}");
+    check(program.kernel("f"));
+    check(program);
+    Program(program.disown(), take_ref_tag()).build("-w"); // for the devices of its context
+
+    Buffer const buffer(context, kBoth, false, 16);
+    EXPECT_FAILURE("The memory to make a 2-D image of is a buffer",
+                   Image2D(buffer.id(), take_ref_tag()));
+}
+
 TEST_F(ObjectsTest, ContextsPassTheirPropertiesDevicesAndCallback) {
     auto const id = reinterpret_cast<cl_context_properties>(platform.id());
     ContextProperties properties(platform);

@@ -4,11 +4,14 @@
 #include "oru/core/utility/composetext.h"
 #include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/objects/adopting.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
 #include "oru/oru_ogl/platformgl.h"
+
+#include <utility>
 
 namespace ORU::OGL {
 
@@ -60,12 +63,44 @@ Buffer::Buffer(std::int64_t size, Type type, Usage usage, void const *data)
     }
 }
 
+Buffer::Buffer(unsigned int name, Type type, ownership_tag ownership)
+    : Object(GL_PIXEL_UNPACK_BUFFER, GL_PIXEL_UNPACK_BUFFER_BINDING, name, ownership) {
+    ORU_ASSERT_SUPPORTED(GL_VERSION_1_5);
+    internal::RequireName(ORU_GL(IsBuffer, name), name, "buffer");
+    if (TypeRow const *row = kTypes.find(type))
+        changeTarget(row->gl, row->binding);
+    internal::BoundObjectScope bound(*this, ORU_BINDER(BindBuffer));
+    auto const parameter = [this](GLenum query) {
+        GLint value = 0;
+        ORU_GL(GetBufferParameteriv, target(), query, &value);
+        return value;
+    };
+    usagePolicy_ = GL2Usage(static_cast<unsigned int>(parameter(GL_BUFFER_USAGE)));
+    mapped_ = parameter(GL_BUFFER_MAPPED) != 0;
+    if (internal::Supports(GL_VERSION_3_2)) // for stores of 2 GiB and more
+        ORU_GL(GetBufferParameteri64v, target(), GL_BUFFER_SIZE, &size_);
+    else
+        size_ = parameter(GL_BUFFER_SIZE);
+    bound.restore();
+}
+
+Buffer &Buffer::operator=(Buffer &&other) noexcept {
+    if (this == &other)
+        return *this;
+    deleteObject();
+    Object::operator=(std::move(other));
+    size_ = other.size_;
+    usagePolicy_ = other.usagePolicy_;
+    mapped_ = other.mapped_;
+    return *this;
+}
+
 Buffer::~Buffer() {
     deleteObject();
 }
 
 void Buffer::deleteObject() noexcept {
-    if (objectID_)
+    if (ownsName())
         internal::Release([this] { ORU_GL(DeleteBuffers, 1, &objectID_); });
 }
 
@@ -136,7 +171,7 @@ void Buffer::convertToUnpackBuffer() {
 }
 
 void *Buffer::map(unsigned int access) {
-    if (mapped_)
+    if (isMapped())
         ORU_THROW_INTERNAL("Buffer is already mapped (this will cause a GL error)");
     try {
         void *const address = ORU_GL(MapBuffer, target(), access);
@@ -157,7 +192,7 @@ void Buffer::askWhetherMapped() noexcept {
 }
 
 void Buffer::unmap() {
-    if (!mapped_) // the check's text is what hosts see, with its slip
+    if (!isMapped()) // the check's text is what hosts see, with its slip
         ORU_THROW_INTERNAL("Buffer must be mapped before umapping it (this will cause a GL error)");
     bool isIntact = false;
     try {
@@ -172,7 +207,7 @@ void Buffer::unmap() {
 }
 
 void Buffer::checkTransfer(char const *operation, std::int64_t offset, void const *data) const {
-    if (mapped_)
+    if (isMapped())
         ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " buffer cannot be mapped"));
     if (!data)
         ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " pointer to data must not be NULL"));

@@ -51,7 +51,18 @@ public:
     /// @note glGenBuffers, glBufferData
     Buffer(std::int64_t size, Type type, Usage usage, void const *data);
 
-    /// Deletes the buffer, which need not be unmapped. @note glDeleteBuffers
+    /// A buffer that was made elsewhere; size, usage and whether it is mapped are what OpenGL
+    /// tells. After a failure the name is the caller's as before.
+    /// @param type a number that is no Type makes a pixel unpack buffer
+    /// @throws InternalException for a name that is no buffer
+    /// @note glIsBuffer, glBindBuffer, glGetBufferParameteriv, with OpenGL 3.2
+    ///       glGetBufferParameteri64v
+    Buffer(unsigned int name, Type type, ownership_tag ownership);
+
+    Buffer(Buffer &&other) noexcept = default;
+    Buffer &operator=(Buffer &&other) noexcept;
+
+    /// Deletes the buffer that the object owns, which need not be unmapped. @note glDeleteBuffers
     ~Buffer() override;
 
     /// @note glBindBuffer
@@ -90,7 +101,10 @@ public:
     /// @note glUnmapBuffer
     void unmap();
 
-    bool isMapped() const { return mapped_; }
+    bool isMapped() const {
+        requireObject();
+        return mapped_;
+    }
 
     /// Writes a range of the store.
     /// @param offset, size bytes; a range that leaves the store is an ExceptionOGL
@@ -109,8 +123,14 @@ public:
     bool isUnpackBuffer() const;
 
     /// Size of the store in bytes.
-    std::uint64_t size() const { return static_cast<std::uint64_t>(size_); }
-    Usage usagePolicy() const { return usagePolicy_; }
+    std::uint64_t size() const {
+        requireObject();
+        return static_cast<std::uint64_t>(size_);
+    }
+    Usage usagePolicy() const {
+        requireObject();
+        return usagePolicy_;
+    }
 
     /// Kept for hosts that call it; there is nothing to verify.
     void verifyCurrentBufferObject() const {}

@@ -18,6 +18,9 @@ namespace ORU::OGL {
 /// Hosts make one of the derived kinds: ContextWindowed, ContextOffscreen, ContextWrapped. Making
 /// one leaves the thread's current context as it was; call `makeCurrent()` to use it. A context is
 /// used on one thread at a time.
+///
+/// A context stays where it is, neither copied nor moved: share groups and the registry of contexts
+/// know it by its address. Keep one that is handed on by std::unique_ptr.
 class ORU_API Context {
 public:
     enum Buffering { BUFFERING_SINGLE = 0, BUFFERING_DOUBLE = 1 };

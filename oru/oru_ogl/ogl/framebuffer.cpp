@@ -4,12 +4,15 @@
 #include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
+#include "oru/oru_ogl/ogl/internal/objects/adopting.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"
 #include "oru/oru_ogl/platformgl.h"
+
+#include <utility>
 
 namespace ORU::OGL {
 
@@ -46,12 +49,26 @@ Framebuffer::Framebuffer() : Object(GL_FRAMEBUFFER_EXT, GL_FRAMEBUFFER_BINDING_E
     ORU_ASSERT(objectID_ != 0);
 }
 
+Framebuffer::Framebuffer(unsigned int name, ownership_tag ownership)
+    : Object(GL_FRAMEBUFFER_EXT, GL_FRAMEBUFFER_BINDING_EXT, name, ownership) {
+    ORU_ASSERT_SUPPORTED(GL_EXT_FRAMEBUFFER_OBJECT);
+    internal::RequireName(ORU_GL(IsFramebufferEXT, name), name, "framebuffer");
+}
+
+Framebuffer &Framebuffer::operator=(Framebuffer &&other) noexcept {
+    if (this != &other) {
+        deleteObject();
+        Object::operator=(std::move(other));
+    }
+    return *this;
+}
+
 Framebuffer::~Framebuffer() {
     deleteObject();
 }
 
 void Framebuffer::deleteObject() noexcept {
-    if (objectID_)
+    if (ownsName())
         internal::Release([this] { ORU_GL(DeleteFramebuffersEXT, 1, &objectID_); });
 }
 

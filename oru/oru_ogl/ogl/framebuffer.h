@@ -27,7 +27,15 @@ public:
     /// @note glGenFramebuffersEXT
     Framebuffer();
 
-    /// @note glDeleteFramebuffersEXT
+    /// A framebuffer that was made elsewhere. After a failure the name is the caller's as before.
+    /// @throws InternalException without the extension, and for a name that is no framebuffer
+    /// @note glIsFramebufferEXT
+    Framebuffer(unsigned int name, ownership_tag ownership);
+
+    Framebuffer(Framebuffer &&other) noexcept = default;
+    Framebuffer &operator=(Framebuffer &&other) noexcept;
+
+    /// Deletes the framebuffer that the object owns. @note glDeleteFramebuffersEXT
     ~Framebuffer() override;
 
     /// @note glBindFramebufferEXT

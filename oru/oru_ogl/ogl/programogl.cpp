@@ -13,6 +13,12 @@ Program::Program() {
     ORU_ENFORCE_TEXT("actualProgram_ != NULL", actualProgram_);
 }
 
+Program::Program(unsigned int name, ownership_tag ownership) {
+    if (!ProgramImplCore::IsSupported())
+        ORU_THROW_INTERNAL("OpenGL shader programs must be supported");
+    actualProgram_.reset(ORU_NEW ProgramImplCore(name, ownership));
+}
+
 Program::Program(Program &&other) noexcept = default;
 Program &Program::operator=(Program &&other) noexcept = default;
 Program::~Program() = default;
@@ -21,9 +27,30 @@ bool Program::IsSupported() {
     return ProgramImplCore::IsSupported();
 }
 
+namespace {
+
+[[noreturn]] ORU_COLD void ThrowWithoutBody() {
+    ORU_private::ThrowInternalNoted(__FILE__, __LINE__, "Enforce actualProgram_ != NULL",
+                                    "the program is empty: it was moved from, or has given up its "
+                                    "name");
+}
+
+} // namespace
+
 ProgramImpl &Program::body() const {
-    ORU_ENFORCE_TEXT("actualProgram_ != NULL", actualProgram_);
+    if (!actualProgram_)
+        ThrowWithoutBody();
     return *actualProgram_;
+}
+
+unsigned int Program::programID() const {
+    return body().programID();
+}
+
+unsigned int Program::disown() {
+    unsigned int const name = body().disown();
+    actualProgram_.reset();
+    return name;
 }
 
 void Program::attach(Shader *shader) {

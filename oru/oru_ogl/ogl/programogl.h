@@ -3,6 +3,7 @@
 
 #include "oru/core/utility/export.h"
 #include "oru/core/utility/scopedptr.h"
+#include "oru/oru_ogl/ogl/ownershiptag.h"
 
 #include <string>
 
@@ -28,10 +29,25 @@ public:
     /// @throws InternalException when the current context has no programs
     /// @note glCreateProgram
     Program();
+
+    /// A program that was made elsewhere. After a failure the name is the caller's as before.
+    /// @throws InternalException also for a name that is no program
+    /// @note glIsProgram
+    Program(unsigned int name, ownership_tag ownership);
+
     Program(Program &&other) noexcept;
     Program &operator=(Program &&other) noexcept;
+    /// Deletes the program that the object owns.
     /// @note glDeleteProgram; OpenGL keeps the program while it is current
     ~Program();
+
+    /// The GL name.
+    unsigned int programID() const;
+
+    /// Gives up the program, which is the caller's to delete now; this is as if moved from
+    /// afterwards.
+    /// @return its GL name
+    unsigned int disown();
 
     /// Whether the current context has programs: OpenGL 2.0.
     static bool IsSupported();

@@ -3,10 +3,13 @@
 
 #include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/objects/adopting.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/platformgl.h"
+
+#include <utility>
 
 namespace ORU::OGL {
 
@@ -64,12 +67,41 @@ void Renderbuffer::makeStorage() {
     bound.restore();
 }
 
+Renderbuffer::Renderbuffer(unsigned int name, ownership_tag ownership)
+    : Object(GL_RENDERBUFFER_EXT, GL_RENDERBUFFER_BINDING_EXT, name, ownership) {
+    ORU_ASSERT_SUPPORTED(GL_EXT_FRAMEBUFFER_OBJECT);
+    internal::RequireName(ORU_GL(IsRenderbufferEXT, name), name, "renderbuffer");
+    internal::BoundObjectScope bound(*this, ORU_BINDER(BindRenderbufferEXT));
+    auto const parameter = [this](GLenum query) {
+        GLint value = 0;
+        ORU_GL(GetRenderbufferParameterivEXT, target(), query, &value);
+        return value;
+    };
+    format_ = static_cast<unsigned int>(parameter(GL_RENDERBUFFER_INTERNAL_FORMAT_EXT));
+    attachment_ = AttachmentOf(format_);
+    width_ = parameter(GL_RENDERBUFFER_WIDTH_EXT);
+    height_ = parameter(GL_RENDERBUFFER_HEIGHT_EXT);
+    bound.restore();
+}
+
+Renderbuffer &Renderbuffer::operator=(Renderbuffer &&other) noexcept {
+    if (this == &other)
+        return *this;
+    deleteObject();
+    Object::operator=(std::move(other));
+    format_ = other.format_;
+    attachment_ = other.attachment_;
+    width_ = other.width_;
+    height_ = other.height_;
+    return *this;
+}
+
 Renderbuffer::~Renderbuffer() {
     deleteObject();
 }
 
 void Renderbuffer::deleteObject() noexcept {
-    if (objectID_)
+    if (ownsName())
         internal::Release([this] { ORU_GL(DeleteRenderbuffersEXT, 1, &objectID_); });
 }
 

@@ -18,12 +18,30 @@ public:
     /// @note glGenRenderbuffersEXT, glRenderbufferStorageEXT
     Renderbuffer(unsigned int format, int width, int height);
 
-    /// @note glDeleteRenderbuffersEXT
+    /// A renderbuffer that was made elsewhere; size and format are what OpenGL tells. After a
+    /// failure the name is the caller's as before.
+    /// @throws InternalException without the extension, and for a name that is no renderbuffer
+    /// @note glIsRenderbufferEXT, glBindRenderbufferEXT, glGetRenderbufferParameterivEXT
+    Renderbuffer(unsigned int name, ownership_tag ownership);
+
+    Renderbuffer(Renderbuffer &&other) noexcept = default;
+    Renderbuffer &operator=(Renderbuffer &&other) noexcept;
+
+    /// Deletes the renderbuffer that the object owns. @note glDeleteRenderbuffersEXT
     ~Renderbuffer() override;
 
-    unsigned int format() const { return format_; }
-    int width() const { return width_; }
-    int height() const { return height_; }
+    unsigned int format() const {
+        requireObject();
+        return format_;
+    }
+    int width() const {
+        requireObject();
+        return width_;
+    }
+    int height() const {
+        requireObject();
+        return height_;
+    }
 
     /// @note glBindRenderbufferEXT
     void bind();
@@ -43,7 +61,10 @@ protected:
     friend class Framebuffer;
 
     /// The GL attachment point that the format asks for.
-    unsigned int attachment() const { return attachment_; }
+    unsigned int attachment() const {
+        requireObject();
+        return attachment_;
+    }
 
 private:
     void makeStorage();

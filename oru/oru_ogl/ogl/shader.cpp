@@ -14,6 +14,12 @@ Shader::Shader(ShaderType type) {
     actualShader_.reset(ORU_NEW ShaderImplCore(type));
 }
 
+Shader::Shader(unsigned int name, ownership_tag ownership) {
+    if (!IsSupported(SHADERTYPE_VERTEX))
+        ORU_THROW_INTERNAL("Shader not supported by core OpenGL");
+    actualShader_.reset(ORU_NEW ShaderImplCore(name, ownership));
+}
+
 Shader::Shader(Shader &&other) noexcept = default;
 Shader &Shader::operator=(Shader &&other) noexcept = default;
 Shader::~Shader() = default;
@@ -23,8 +29,20 @@ bool Shader::IsSupported(ShaderType type) {
 }
 
 ShaderImpl &Shader::body() const {
-    ORU_ENFORCE_TEXT("actualShader_ != NULL", actualShader_);
+    ORU_ASSERT_NOTED("Enforce actualShader_ != NULL",
+                     "the shader is empty: it was moved from, or has given up its name",
+                     actualShader_);
     return *actualShader_;
+}
+
+unsigned int Shader::shaderID() const {
+    return body().shaderID();
+}
+
+unsigned int Shader::disown() {
+    unsigned int const name = body().disown();
+    actualShader_.reset();
+    return name;
 }
 
 void Shader::load(unsigned int count, char const *const *strings, int const *lengths) {

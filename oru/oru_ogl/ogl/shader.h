@@ -3,6 +3,7 @@
 
 #include "oru/core/utility/export.h"
 #include "oru/core/utility/scopedptr.h"
+#include "oru/oru_ogl/ogl/ownershiptag.h"
 
 #include <string>
 
@@ -28,10 +29,25 @@ public:
     /// @throws InternalException when the current context does not support the type
     /// @note glCreateShader
     explicit Shader(ShaderType type);
+
+    /// A shader that was made elsewhere. After a failure the name is the caller's as before.
+    /// @throws InternalException before OpenGL 2.0, and for a name that is no shader
+    /// @note glIsShader
+    Shader(unsigned int name, ownership_tag ownership);
+
     Shader(Shader &&other) noexcept;
     Shader &operator=(Shader &&other) noexcept;
+    /// Deletes the shader that the object owns.
     /// @note glDeleteShader; OpenGL keeps the shader while it is attached to a program
     ~Shader();
+
+    /// The GL name.
+    unsigned int shaderID() const;
+
+    /// Gives up the shader, which is the caller's to delete now; this is as if moved from
+    /// afterwards.
+    /// @return its GL name
+    unsigned int disown();
 
     /// Whether the current context has shaders of a type: fragment and vertex shaders with OpenGL
     /// 2.0, geometry shaders with 3.2, tessellation with GL_ARB_tessellation_shader.

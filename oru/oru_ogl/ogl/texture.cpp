@@ -5,6 +5,8 @@
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
+#include "oru/oru_ogl/ogl/internal/objects/adopting.h"
+#include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
@@ -12,6 +14,7 @@
 #include "oru/oru_ogl/platformgl.h"
 
 #include <ostream>
+#include <utility>
 
 namespace ORU::OGL {
 
@@ -22,6 +25,20 @@ constexpr std::uint64_t kNotComputed = ~std::uint64_t(0) >> 1;
 /// A size halved `level` times.
 std::uint64_t AtLevel(std::uint64_t size, unsigned int level) {
     return level < 64 ? size >> level : 0;
+}
+
+/// The format of a texture that was made elsewhere.
+Texture::InternalFormat FormatOf(GLenum gl) {
+    // What RED and RG make, by the name that OpenGL gives it.
+    if (gl == GL_R8)
+        return Texture::INTERNALFORMAT_RED;
+    if (gl == GL_RG8)
+        return Texture::INTERNALFORMAT_RG;
+    auto const *const row = internal::kInternalFormats.findGL(gl);
+    if (!row)
+        ORU_THROW_INTERNAL(ComposeText("A texture of the format ", ORUOGLTokenName(gl),
+                                       " cannot be taken over: no InternalFormat stands for it"));
+    return row->value;
 }
 
 } // namespace
@@ -41,28 +58,66 @@ Texture::Texture(Target target, TargetBinding binding, InternalFormat format, st
         ORU_THROW_INTERNAL("Texture:: contructor failed to allocate new GPU texture resource");
 }
 
+Texture::Texture(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership)
+    : Object(Target2GL(target), TargetBinding2GL(binding), name, ownership), depth_(1),
+      sizeInBytes_(kNotComputed), generatesMipmaps_(0) {
+    internal::RequireName(ORU_GL(IsTexture, name), name, "texture");
+    internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
+    auto const ofLevel0 = [&](GLenum parameter) {
+        GLint value = 0;
+        ORU_GL(GetTexLevelParameteriv, this->target(), 0, parameter, &value);
+        return static_cast<unsigned int>(value);
+    };
+    width_ = ofLevel0(GL_TEXTURE_WIDTH);
+    height_ = ofLevel0(GL_TEXTURE_HEIGHT);
+    if (target == TARGET_TEXTURE_3D || target == TARGET_TEXTURE_2D_ARRAY)
+        depth_ = ofLevel0(GL_TEXTURE_DEPTH);
+    if (width_ == 0)
+        ORU_THROW_INTERNAL(ComposeText("The texture ", name, " has no level 0 yet"));
+    format_ = FormatOf(ofLevel0(GL_TEXTURE_INTERNAL_FORMAT));
+    bound.restore();
+}
+
+Texture &Texture::operator=(Texture &&other) noexcept {
+    if (this == &other)
+        return *this;
+    deleteObject();
+    Object::operator=(std::move(other));
+    format_ = other.format_;
+    width_ = other.width_;
+    height_ = other.height_;
+    depth_ = other.depth_;
+    sizeInBytes_ = other.sizeInBytes_;
+    generatesMipmaps_ = other.generatesMipmaps_;
+    return *this;
+}
+
 Texture::~Texture() {
     deleteObject();
 }
 
 void Texture::deleteObject() noexcept {
-    if (objectID_)
+    if (ownsName())
         internal::Release([this] { ORU_GL(DeleteTextures, 1, &objectID_); });
 }
 
 std::uint64_t Texture::width(unsigned int level) const {
+    requireObject();
     return AtLevel(width_, level);
 }
 
 std::uint64_t Texture::height(unsigned int level) const {
+    requireObject();
     return AtLevel(height_, level);
 }
 
 std::uint64_t Texture::depth(unsigned int level) const {
+    requireObject();
     return AtLevel(depth_, level);
 }
 
 int Texture::sizeInBytes() const {
+    requireObject();
     if (sizeInBytes_ == kNotComputed)
         sizeInBytes_ = SizeInBytes(format_, width_, height_, depth_) & kNotComputed;
     return static_cast<int>(sizeInBytes_);
@@ -86,6 +141,7 @@ void Texture::setBorderColor(float const *rgba) {
 }
 
 void Texture::enableAutoMIPGeneration(bool on) {
+    requireObject();
     bool const isCore = internal::IsCoreContext();
     generatesMipmaps_ = isCore && on;
     if (!isCore)

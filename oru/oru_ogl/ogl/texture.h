@@ -186,13 +186,19 @@ public:
         PIXELSTOREMODE_UNPACK_ALIGNMENT
     };
 
-    /// Deletes the texture. @note glDeleteTextures
+    Texture(Texture &&other) noexcept = default;
+    Texture &operator=(Texture &&other) noexcept;
+
+    /// Deletes the texture that the object owns. @note glDeleteTextures
     ~Texture() override;
 
-    InternalFormat format() const { return format_; }
+    InternalFormat format() const {
+        requireObject();
+        return format_;
+    }
 
     /// Channels of the format. @throws InternalException for INTERNALFORMAT_RGB4
-    std::size_t channels() const { return Channels(format_); }
+    std::size_t channels() const { return Channels(format()); }
 
     /// @name Size of a mip level in texels
     /// The size of level 0 halved `level` times and rounded down, so it can be 0.
@@ -278,6 +284,14 @@ protected:
     /// @note glGenTextures
     Texture(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
             std::uint64_t height, std::uint64_t depth);
+
+    /// A texture that was made elsewhere. Sizes and format are what level 0 has; GL_R8 and GL_RG8
+    /// count as INTERNALFORMAT_RED and INTERNALFORMAT_RG. After a failure the name is the caller's
+    /// as before.
+    /// @throws InternalException for a name that is no texture, one without level 0, and a format
+    ///         that no InternalFormat stands for; ExceptionOGL for a texture of another target
+    /// @note glIsTexture, glBindTexture, glGetTexLevelParameteriv
+    Texture(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership);
 
     /// What follows a change of a level's image by the classes; see `enableAutoMIPGeneration`.
     void imageChanged(int level) {

@@ -39,6 +39,9 @@ Texture1::Texture1(Target target, TargetBinding binding, InternalFormat format, 
     bound.restore();
 }
 
+Texture1::Texture1(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership)
+    : Texture(target, binding, name, ownership) {}
+
 Texture1::~Texture1() = default;
 
 void Texture1::setWrap(WrapMode s) {
@@ -91,5 +94,8 @@ std::size_t Texture1::pixelDataSize(int /*level*/, Format format, Type type) con
 
 Texture1D::Texture1D(InternalFormat format, std::uint64_t width, bool mipmapped)
     : Texture1(TARGET_TEXTURE_1D, TARGETBINDING_TEXTURE_BINDING_1D, format, width, mipmapped) {}
+
+Texture1D::Texture1D(unsigned int name, ownership_tag ownership)
+    : Texture1(TARGET_TEXTURE_1D, TARGETBINDING_TEXTURE_BINDING_1D, name, ownership) {}
 
 } // namespace ORU::OGL

@@ -10,6 +10,8 @@ class Buffer;
 /// A texture of one row of texels. The transfers act on the texture bound to the target.
 class ORU_API Texture1 : public Texture {
 public:
+    Texture1(Texture1 &&other) noexcept = default;
+    Texture1 &operator=(Texture1 &&other) noexcept = default;
     ~Texture1() override;
 
     /// @note glTexParameteri
@@ -63,6 +65,9 @@ protected:
     Texture1(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
              bool mipmapped);
 
+    /// A texture that was made elsewhere, see Texture.
+    Texture1(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership);
+
 private:
     void checkPart(char const *operation, int level, std::uint64_t width) const;
 };
@@ -73,6 +78,13 @@ public:
     /// @param width texels of level 0
     /// @param mipmapped whether the levels down to one texel are allocated too
     Texture1D(InternalFormat format, std::uint64_t width, bool mipmapped);
+
+    /// A texture that was made elsewhere; sizes and format are what its level 0 has. After a
+    /// failure the name is the caller's as before.
+    /// @throws InternalException for a name that is no texture, one without level 0, and a format
+    ///         that no InternalFormat stands for; ExceptionOGL for a texture of another target
+    /// @note glIsTexture, glBindTexture, glGetTexLevelParameteriv
+    Texture1D(unsigned int name, ownership_tag ownership);
 };
 
 } // namespace ORU::OGL

@@ -53,6 +53,9 @@ Texture2::Texture2(Target target, TargetBinding binding, InternalFormat format, 
     bound.restore();
 }
 
+Texture2::Texture2(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership)
+    : Texture(target, binding, name, ownership) {}
+
 Texture2::~Texture2() = default;
 
 void Texture2::allocate(bool mipmapped, Type type) {
@@ -145,10 +148,17 @@ Texture2D::Texture2D(InternalFormat format, std::uint64_t width, std::uint64_t h
     : Texture2(TARGET_TEXTURE_2D, TARGETBINDING_TEXTURE_BINDING_2D, format, width, height,
                mipmapped, clientStorage, type) {}
 
+Texture2D::Texture2D(unsigned int name, ownership_tag ownership)
+    : Texture2(TARGET_TEXTURE_2D, TARGETBINDING_TEXTURE_BINDING_2D, name, ownership) {}
+
 TextureRECT::TextureRECT(InternalFormat format, std::uint64_t width, std::uint64_t height,
                          void *clientStorage, Type type)
     : Texture2(TARGET_TEXTURE_RECTANGLE, TARGETBINDING_TEXTURE_BINDING_RECTANGLE, format, width,
                height, false, clientStorage, type) {}
+
+TextureRECT::TextureRECT(unsigned int name, ownership_tag ownership)
+    : Texture2(TARGET_TEXTURE_RECTANGLE, TARGETBINDING_TEXTURE_BINDING_RECTANGLE, name, ownership) {
+}
 
 bool TextureRECT::IsSupported() {
     return internal::Supports(GL_ARB_TEXTURE_RECTANGLE);
@@ -158,6 +168,9 @@ Texture1DArray::Texture1DArray(InternalFormat format, std::uint64_t width, std::
                                bool mipmapped)
     : Texture2(TARGET_TEXTURE_1D_ARRAY, TARGETBINDING_TEXTURE_BINDING_1D_ARRAY, format, width,
                layers, mipmapped, nullptr, TYPE_NONE) {}
+
+Texture1DArray::Texture1DArray(unsigned int name, ownership_tag ownership)
+    : Texture2(TARGET_TEXTURE_1D_ARRAY, TARGETBINDING_TEXTURE_BINDING_1D_ARRAY, name, ownership) {}
 
 std::uint64_t Texture1DArray::depth(unsigned int /*level*/) const {
     return Texture::depth(0);

@@ -11,10 +11,15 @@ class Buffer;
 /// texture bound to the target.
 class ORU_API Texture2 : public Texture {
 public:
+    Texture2(Texture2 &&other) noexcept = default;
+    Texture2 &operator=(Texture2 &&other) noexcept = default;
     ~Texture2() override;
 
     /// The caller's memory that the texture was made over, or null.
-    void *clientStorage() const { return clientStorage_; }
+    void *clientStorage() const {
+        requireObject();
+        return clientStorage_;
+    }
 
     /// @throws InternalException when the texture is not bound
     /// @note glGetIntegerv, glTexParameteri
@@ -79,12 +84,15 @@ protected:
     Texture2(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
              std::uint64_t height, bool mipmapped, void *clientStorage, Type type);
 
+    /// A texture that was made elsewhere, see Texture.
+    Texture2(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership);
+
 private:
     void checkPart(char const *operation, int level, std::uint64_t width,
                    std::uint64_t height) const;
     void allocate(bool mipmapped, Type type);
 
-    void *clientStorage_;
+    void *clientStorage_ = nullptr;
 };
 
 /// GL_TEXTURE_2D.
@@ -96,6 +104,13 @@ public:
     Texture2D(InternalFormat format, std::uint64_t width, std::uint64_t height, bool mipmapped,
               void *clientStorage = nullptr, Type type = TYPE_NONE);
 
+    /// A texture that was made elsewhere; sizes and format are what its level 0 has. After a
+    /// failure the name is the caller's as before.
+    /// @throws InternalException for a name that is no texture, one without level 0, and a format
+    ///         that no InternalFormat stands for; ExceptionOGL for a texture of another target
+    /// @note glIsTexture, glBindTexture, glGetTexLevelParameteriv
+    Texture2D(unsigned int name, ownership_tag ownership);
+
     static bool IsSupported() { return true; }
 };
 
@@ -106,6 +121,9 @@ public:
     TextureRECT(InternalFormat format, std::uint64_t width, std::uint64_t height,
                 void *clientStorage = nullptr, Type type = TYPE_NONE);
 
+    /// See Texture2D.
+    TextureRECT(unsigned int name, ownership_tag ownership);
+
     /// GL_ARB_texture_rectangle.
     static bool IsSupported();
 };
@@ -115,6 +133,9 @@ class ORU_API Texture1DArray : public Texture2 {
 public:
     Texture1DArray(InternalFormat format, std::uint64_t width, std::uint64_t layers,
                    bool mipmapped);
+
+    /// See Texture2D.
+    Texture1DArray(unsigned int name, ownership_tag ownership);
 
     /// Always 1.
     std::uint64_t depth(unsigned int level) const override;

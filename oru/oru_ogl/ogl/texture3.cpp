@@ -68,6 +68,9 @@ Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, 
     });
 }
 
+Texture3::Texture3(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership)
+    : Texture(target, binding, name, ownership) {}
+
 Texture3::~Texture3() = default;
 
 void Texture3::setWrap(WrapMode s, WrapMode t, WrapMode r) {
@@ -151,10 +154,16 @@ Texture3D::Texture3D(InternalFormat format, int level, std::uint64_t width, std:
     : Texture3(TARGET_TEXTURE_3D, TARGETBINDING_TEXTURE_BINDING_3D, format, level, width, height,
                depth, clientFormat, type, data, params) {}
 
+Texture3D::Texture3D(unsigned int name, ownership_tag ownership)
+    : Texture3(TARGET_TEXTURE_3D, TARGETBINDING_TEXTURE_BINDING_3D, name, ownership) {}
+
 Texture2DArray::Texture2DArray(InternalFormat format, std::uint64_t width, std::uint64_t height,
                                std::uint64_t layers, bool mipmapped)
     : Texture3(TARGET_TEXTURE_2D_ARRAY, TARGETBINDING_TEXTURE_BINDING_2D_ARRAY, format, width,
                height, layers, mipmapped) {}
+
+Texture2DArray::Texture2DArray(unsigned int name, ownership_tag ownership)
+    : Texture3(TARGET_TEXTURE_2D_ARRAY, TARGETBINDING_TEXTURE_BINDING_2D_ARRAY, name, ownership) {}
 
 std::uint64_t Texture2DArray::depth(unsigned int /*level*/) const {
     return Texture::depth(0);

@@ -11,6 +11,8 @@ class Buffer;
 /// the texture bound to the target.
 class ORU_API Texture3 : public Texture {
 public:
+    Texture3(Texture3 &&other) noexcept = default;
+    Texture3 &operator=(Texture3 &&other) noexcept = default;
     ~Texture3() override;
 
     /// @note glTexParameteri
@@ -75,6 +77,9 @@ protected:
              std::uint64_t width, std::uint64_t height, std::uint64_t depth, Format clientFormat,
              Type type, void const *data, PixelUnpackParameters const &params);
 
+    /// A texture that was made elsewhere, see Texture.
+    Texture3(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership);
+
 private:
     void checkPart(int level, std::uint64_t width, std::uint64_t height, std::uint64_t depth) const;
     template<class Allocate>
@@ -94,6 +99,9 @@ public:
               std::uint64_t depth, Format clientFormat, Type type, void const *data,
               PixelUnpackParameters const &params);
 
+    /// As Texture2D's.
+    Texture3D(unsigned int name, ownership_tag ownership);
+
     static bool IsSupported() { return true; }
 };
 
@@ -102,6 +110,9 @@ class ORU_API Texture2DArray : public Texture3 {
 public:
     Texture2DArray(InternalFormat format, std::uint64_t width, std::uint64_t height,
                    std::uint64_t layers, bool mipmapped);
+
+    /// As Texture2D's.
+    Texture2DArray(unsigned int name, ownership_tag ownership);
 
     /// The number of layers.
     std::uint64_t depth(unsigned int level) const override;

@@ -46,7 +46,7 @@ void TextureUnit::bind(unsigned int target, unsigned int name) const {
 // One row per target: its name here, its GL target and the class that is bound to it.
 #define ORU_BINDING(Target, gl, Class)                                                             \
     void TextureUnit::bind(Class const *texture) const {                                           \
-        ORU_GL(BindTexture, gl, texture->objectID());                                              \
+        ORU_GL(BindTexture, gl, texture->checkedID());                                             \
     }                                                                                              \
     void TextureUnit::bind##Target##Default() const {                                              \
         ORU_GL(BindTexture, gl, 0);                                                                \

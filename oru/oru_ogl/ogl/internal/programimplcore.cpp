@@ -4,6 +4,7 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
+#include "oru/oru_ogl/ogl/internal/objects/adopting.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/programs/infolog.h"
@@ -42,11 +43,24 @@ ProgramImplCore::ProgramImplCore() {
     ORU_ASSERT(programID_ != 0);
 }
 
+ProgramImplCore::ProgramImplCore(unsigned int name, ownership_tag ownership)
+    : programID_(name), isOwner_(false) {
+    internal::RequireName(ORU_GL(IsProgram, name), name, "program");
+    isOwner_ = ownership.isOwner;
+}
+
 ProgramImplCore::~ProgramImplCore() {
+    if (!isOwner_)
+        return;
     internal::Release([this] {
         ORU_ASSERT(programID_ != 0);
         ORU_GL(DeleteProgram, programID_);
     });
+}
+
+unsigned int ProgramImplCore::disown() noexcept {
+    isOwner_ = false;
+    return programID_;
 }
 
 bool ProgramImplCore::IsSupported() {

@@ -10,6 +10,10 @@ namespace ORU::OGL {
 class ORU_API ProgramImplCore : public ProgramImpl {
 public:
     ProgramImplCore();
+
+    /// Over a program that was made elsewhere.
+    /// @throws InternalException for a name that is no program
+    ProgramImplCore(unsigned int name, ownership_tag ownership);
     ~ProgramImplCore() override;
 
     static bool IsSupported();
@@ -48,6 +52,10 @@ public:
     int getInfoLogLength() const override;
     void getInfoLog(int maxLength, char *buffer) override;
     std::string compileLogs() const override;
+    unsigned int programID() const override {
+        return programID_;
+    }
+    unsigned int disown() noexcept override;
 
 private:
     int parameter(unsigned int name) const;
@@ -58,6 +66,7 @@ private:
     void detachAllOfType(unsigned int shaderType);
 
     unsigned int programID_ = 0;
+    bool isOwner_ = true;
 };
 
 } // namespace ORU::OGL

@@ -3,6 +3,7 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/objects/adopting.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
@@ -32,11 +33,24 @@ ShaderImplCore::ShaderImplCore(Shader::ShaderType type) {
     shaderID_ = ORU_GL(CreateShader, kTypes.toGL(type, __FILE__, __LINE__));
 }
 
+ShaderImplCore::ShaderImplCore(unsigned int name, ownership_tag ownership)
+    : shaderID_(name), isOwner_(false) {
+    internal::RequireName(ORU_GL(IsShader, name), name, "shader");
+    isOwner_ = ownership.isOwner;
+}
+
 ShaderImplCore::~ShaderImplCore() {
+    if (!isOwner_)
+        return;
     internal::Release([this] {
         ORU_ASSERT(shaderID_ != 0);
         ORU_GL(DeleteShader, shaderID_);
     });
+}
+
+unsigned int ShaderImplCore::disown() noexcept {
+    isOwner_ = false;
+    return shaderID_;
 }
 
 bool ShaderImplCore::IsSupported(Shader::ShaderType type) {

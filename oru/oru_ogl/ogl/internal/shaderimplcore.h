@@ -10,6 +10,10 @@ namespace ORU::OGL {
 class ORU_API ShaderImplCore : public ShaderImpl {
 public:
     explicit ShaderImplCore(Shader::ShaderType type);
+
+    /// Over a shader that was made elsewhere.
+    /// @throws InternalException for a name that is no shader
+    ShaderImplCore(unsigned int name, ownership_tag ownership);
     ~ShaderImplCore() override;
 
     static bool IsSupported(Shader::ShaderType type);
@@ -22,12 +26,14 @@ public:
     void load(std::string const &source) override;
     void load(unsigned int count, char const *const *strings, int const *lengths) override;
 
-    unsigned int shaderID() const { return shaderID_; }
+    unsigned int shaderID() const override { return shaderID_; }
+    unsigned int disown() noexcept override;
 
 private:
     int parameter(unsigned int name) const;
 
     unsigned int shaderID_ = 0;
+    bool isOwner_ = true;
 };
 
 } // namespace ORU::OGL

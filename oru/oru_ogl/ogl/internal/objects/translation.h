@@ -42,13 +42,20 @@ struct Translation {
         ORU_private::ThrowInternal(file, line, failure);
     }
 
+    /// The row of a GL value, or null for one without an enumerator.
+    constexpr Row const *findGL(unsigned int gl) const {
+        for (Row const &row : rows) {
+            if (row.gl == gl)
+                return &row;
+        }
+        return nullptr;
+    }
+
     /// @param file, line position of the failure
     /// @throws InternalException for a GL value without an enumerator
     Enumeration fromGL(unsigned int gl, char const *file, int line) const {
-        for (Row const &row : rows) {
-            if (row.gl == gl)
-                return row.value;
-        }
+        if (Row const *row = findGL(gl))
+            return row->value;
         ORU_private::ThrowInternal(file, line, failure);
     }
 };

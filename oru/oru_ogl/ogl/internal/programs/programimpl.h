@@ -53,6 +53,10 @@ public:
     virtual int getInfoLogLength() const = 0;
     virtual void getInfoLog(int maxLength, char *buffer) = 0;
     virtual std::string compileLogs() const = 0;
+    virtual unsigned int programID() const = 0;
+
+    /// @return the name, which the body deletes no more
+    virtual unsigned int disown() noexcept = 0;
 };
 
 } // namespace ORU::OGL

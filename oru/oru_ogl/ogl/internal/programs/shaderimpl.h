@@ -22,6 +22,10 @@ public:
     virtual bool isLoaded() const = 0;
     virtual void load(std::string const &source) = 0;
     virtual void load(unsigned int count, char const *const *strings, int const *lengths) = 0;
+    virtual unsigned int shaderID() const = 0;
+
+    /// @return the name, which the body deletes no more
+    virtual unsigned int disown() noexcept = 0;
 };
 
 } // namespace ORU::OGL
