@@ -9,6 +9,10 @@ SOURCE = "catalogue/gl_entry_points.tsv and gl_extensions.tsv by emit_gl.py"
 # Written by hand in openglerrorchecker.cpp: they keep or read the begin/end state.
 HAND_CHECKED = {"glBegin", "glEnd", "glGetError"}
 
+# Functions that make a name, and what deletes it when the check after the call throws: the caller never
+# gets the name then.
+UNDONE_BY = {"glCreateProgram": "glDeleteProgram", "glCreateShader": "glDeleteShader"}
+
 # Names that the generated bodies use themselves; a parameter of that name would hide them.
 RESERVED_NAMES = {"file", "line", "insideBeginEnd_", "function_", "value_"}
 
@@ -234,6 +238,9 @@ def error_checker(entries):
         if entry.result == "void":
             lines += [f"{call};", check]
         else:
+            if entry.name in UNDONE_BY:
+                check = (f'CheckOpenGLError(insideBeginEnd_, file, line, "{entry.name}",\n'
+                         f"                     ExtensionManager::CurrentTable().{UNDONE_BY[entry.name]}, value_);")
             lines += [f"{entry.result} const value_ = {call};", check, "return value_;"]
         body = "\n".join(f"    {text}" for text in lines)
         bodies.append(f"{entry.result} OpenGLErrorChecker::{entry.operation}({entry.full_declarations}) {{\n"

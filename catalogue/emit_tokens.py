@@ -2,9 +2,11 @@
 
 Among the constants of a value, the one of gl_token_choices.tsv is taken when there is one. Otherwise:
 a name without a vendor's suffix before _ARB, _EXT and the vendors' names in this order; of several core
-names the one of the latest OpenGL version, which today's documentation uses; then the shortest. The
-constants that GL_ARB_fragment_program alone adds are left out: the names of assembly programs are those
-that vertex programs have too.
+names the one of the latest OpenGL version, which today's documentation uses; then the shortest.
+
+The thirteen constants that GL_ARB_fragment_program alone adds (0x8804 to 0x8810, its target and its counts
+of instructions) get no name: hosts know them as unknown tokens. What it shares with GL_ARB_vertex_program
+has one.
 """
 import itertools
 import re

@@ -70,6 +70,8 @@ TEST_F(ProgramTest, BinariesMakeTheSameProgram) {
     }
     EXPECT_FAILURE("devs.size() == sizes.size()", Program::BinaryArray({device}, {}, {}));
     EXPECT_FAILURE("sizes.size() == binaries.size()", Program::BinaryArray({device}, {size}, {}));
+    EXPECT_FAILURE("Program::BinaryArray binary 0 holds 1 bytes, not the 2 given as its size",
+                   Program::BinaryArray({device}, {2}, {{0}}));
 }
 
 TEST_F(ProgramTest, ArgumentsArriveInTheirTypes) {

@@ -9,6 +9,9 @@
 #include "tests/support/pictures.h"
 #include "tests/support/program.h"
 
+#include <algorithm>
+#include <iterator>
+
 using namespace apps_test;
 using App::Image;
 
@@ -58,6 +61,30 @@ TEST(ImageFile, Jpegs) {
     }
     EXPECT_FAILURE("a JPEG in CMYK, which is not supported; convert it to RGB first",
                    Decode(Foreign("cmyk.jpg")));
+}
+
+// What is sound but of a kind that is not read is not called damaged.
+TEST(ImageFile, JpegsOfOtherKinds) {
+    constexpr unsigned char kBaseline[] = {0xFF, 0xC0, 0, 17, 8}; // a frame, its length, bits
+    std::pair<std::ptrdiff_t, unsigned char> const kinds[] = {{1, 0xC3 /* lossless */}, {4, 12}};
+    for (auto const &[at, value] : kinds) {
+        Bytes jpeg = Foreign("colour.jpg");
+        auto const frame =
+            std::search(jpeg.begin(), jpeg.end(), std::begin(kBaseline), std::end(kBaseline));
+        ASSERT_NE(frame, jpeg.end());
+        frame[at] = value;
+        EXPECT_EQ(0u, oru_test::MessageOf([&] {
+                          Decode(jpeg);
+                      }).find("this kind of JPEG is not supported"))
+            << int{value};
+    }
+}
+
+// Before memory is taken and before anything else is looked at.
+TEST(ImageFile, PngTooShortForItsSize) {
+    Bytes png = App::EncodePng(RandomPicture({9, 4, 3, 8}, 1));
+    png[18] = png[22] = 0x0F; // 3849 by 3844 pixels
+    EXPECT_FAILURE("damaged PNG: the file is cut off", Decode(png));
 }
 
 /// A JPEG with Exif data that tell its orientation, in either byte order.

@@ -7,6 +7,7 @@
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/programogl.h"
+#include "oru/oru_ogl/ogl/shader.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 
@@ -140,6 +141,10 @@ TEST_F(NotesTest, APendingErrorOfTheHostLosesNothing) {
     };
     failsAfterError([] { Texture2D(Texture::INTERNALFORMAT_RGBA8, 4, 4, false); });
     failsAfterError([] { Framebuffer(); });
+    failsAfterError([] { Program(); });
+    failsAfterError([] { VertexShader(); });
+    for (GLuint name = 1; name < 100; ++name) // the ledger does not see what the call lost
+        EXPECT_FALSE(ORU_GL(IsProgram, name) || ORU_GL(IsShader, name)) << name;
     auto const make = [] {
         return std::make_unique<Buffer>(4, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW,
                                         nullptr);

@@ -28,4 +28,17 @@ inline void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const
         ThrowOpenGLError(file, line, error, function);
 }
 
+/// The same after a call that made a name, which goes before the exception does: nobody else has
+/// it.
+inline void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const *file,
+                             unsigned int line, char const *function,
+                             void(ORU_APIENTRY *deleteName)(GLuint), GLuint name) {
+    if (insideBeginEnd.load(std::memory_order_relaxed))
+        return;
+    if (GLenum const error = ::glGetError()) {
+        deleteName(name);
+        ThrowOpenGLError(file, line, error, function);
+    }
+}
+
 } // namespace ORU::OGL

@@ -47,6 +47,9 @@ TEST(BoundingRect, LosesNoBoundToANaN) {
     EXPECT_EQ(BoundingRect(Vec(3, kNaN), Vec(1, 2)), Rect(1, 2, 3, 2));
     EXPECT_EQ(After(square, [&](auto &r) { r.include(Vec(kNaN, 3)); }), Rect(0, 0, 2, 3));
     EXPECT_EQ(After(square, [&](auto &r) { r.include(moved); }), Rect(0, 0, 2, 3));
+    BoundingRegion ofOtherKind; // whose corners are asked
+    ofOtherKind.include(moved);
+    EXPECT_EQ(After(square, [&](auto &r) { r.include(ofOtherKind); }), Rect(0, 0, 2, 3));
     EXPECT_EQ(After(square, [&](auto &r) { r.intersect(moved); }), Rect(0, 1, 2, 2));
     EXPECT_FALSE(square.contains(moved));
     // The hull of the moved rectangle bounds no x: it is empty where only a hull is seen.
