@@ -186,7 +186,7 @@ using Kinds = testing::Types<Texture1D, Texture2D, TextureRECT, Texture1DArray, 
 
 } // namespace
 
-TYPED_TEST_SUITE(Handles, Kinds);
+TYPED_TEST_SUITE(Handles, Kinds, ); // with the comma, as clang wants an argument there
 
 TYPED_TEST(Handles, Move) {
     using It = Handled<TypeParam>;
