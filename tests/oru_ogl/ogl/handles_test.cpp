@@ -1,4 +1,5 @@
 // Objects that move, take over names made elsewhere, and give up their own.
+#include "tests/support/textof.h"
 #include "tests/support/texturekinds.h"
 
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
@@ -6,10 +7,8 @@
 #include "oru/oru_ogl/ogl/programogl.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/shader.h"
-#include "oru/oru_ogl/ogl/textureunit.h"
 
 #include <functional>
-#include <sstream>
 #include <type_traits>
 #include <utility>
 
@@ -20,85 +19,67 @@ static_assert(!std::is_move_constructible_v<ContextOffscreen>);
 
 namespace {
 
-// What the test does with every class: makes one, looks whether a name lives, tells all that is
-// known of an object, and the uses that an empty one refuses.
-template<class Object>
-struct Handled;
+auto const kNearest = Texture::FILTER_NEAREST;
 
-template<class Kind, auto make>
-struct HandledTexture {
-    static Kind Make() {
-        auto const format = Texture::INTERNALFORMAT_RGBA16;
-        return make(format);
-    }
+/// What the tests do with an object of each class: whether a name lives, what is known of one, and
+/// its uses, all of which an empty one refuses.
+struct TextureHandling {
     static bool Lives(unsigned int name) { return ORU_GL(IsTexture, name); }
-    static unsigned int Name(Kind const &texture) { return texture.objectID(); }
-    static std::string Tell(Kind const &t) {
-        std::ostringstream text;
-        text << t.target() << ' ' << t.format() << ' ' << t.width(0) << 'x' << t.height(0) << 'x'
-             << t.depth(0) << ' ' << t.sizeInBytes();
-        return text.str();
+    static std::string Tell(Texture const &t) {
+        return TextOf(t.target(), t.format(), t.width(0), t.height(0), t.depth(0), t.sizeInBytes());
     }
-    static std::vector<std::function<void(Kind &)>> Uses() {
-        auto const nearest = Texture::FILTER_NEAREST;
-        return {[](Kind &t) { t.isBound(); },
-                [](Kind &t) { t.target(); },
-                [](Kind &t) { t.format(); },
-                [](Kind &t) { t.height(0); },
-                [](Kind &t) { t.sizeInBytes(); },
-                [](Kind &t) { t.enableAutoMIPGeneration(true); },
-                [](Kind &t) { t.generateMipmap(); },
-                [](Kind &t) { t.disown(); },
-                [=](Kind &t) { t.setFilter(nearest, nearest); }};
+    static inline std::function<void(Texture &)> const kUses[] = {
+        [](Texture &t) { t.isBound(); },
+        [](Texture &t) { t.target(); },
+        [](Texture &t) { t.format(); },
+        [](Texture &t) { t.height(0); },
+        [](Texture &t) { t.sizeInBytes(); },
+        [](Texture &t) { t.enableAutoMIPGeneration(true); },
+        [](Texture &t) { t.generateMipmap(); },
+        [](Texture &t) { t.disown(); },
+        [](Texture &t) { t.setFilter(kNearest, kNearest); }};
+};
+
+template<class Object>
+struct Handling : TextureHandling {
+    static Object Make() {
+        auto const format = Texture::INTERNALFORMAT_RGBA16;
+        if constexpr (std::is_same_v<Object, Texture1D>)
+            return Object(format, 8, false);
+        else if constexpr (std::is_same_v<Object, TextureRECT>)
+            return Object(format, 8, 4);
+        else if constexpr (std::is_base_of_v<Texture2, Object>)
+            return Object(format, 8, 4, true);
+        else
+            return Object(format, 8, 4, 2, true);
     }
 };
 
-#define ORU_HANDLED(Kind, ...)                                                                     \
-    inline Kind Make##Kind(Texture::InternalFormat format) {                                       \
-        return Kind(format, __VA_ARGS__);                                                          \
-    }                                                                                              \
-    template<>                                                                                     \
-    struct Handled<Kind> : HandledTexture<Kind, Make##Kind> {};
-ORU_HANDLED(Texture1D, 8, false)
-ORU_HANDLED(Texture2D, 8, 4, true)
-ORU_HANDLED(TextureRECT, 8, 4)
-ORU_HANDLED(Texture1DArray, 8, 3, false)
-ORU_HANDLED(Texture3D, 8, 4, 2, false)
-ORU_HANDLED(Texture2DArray, 8, 4, 3, true)
-#undef ORU_HANDLED
-
 template<>
-struct Handled<Buffer> {
+struct Handling<Buffer> {
     static Buffer Make() {
         return Buffer(40, Buffer::TYPE_PIXEL_UNPACK_BUFFER, Buffer::USAGE_STREAM_READ, nullptr);
     }
     static bool Lives(unsigned int name) { return ORU_GL(IsBuffer, name); }
-    static unsigned int Name(Buffer const &buffer) { return buffer.objectID(); }
     static std::string Tell(Buffer const &b) {
-        std::ostringstream text;
-        text << b.target() << ' ' << b.size() << ' ' << b.usagePolicy() << ' ' << b.isMapped();
-        return text.str();
+        return TextOf(b.target(), b.size(), b.usagePolicy(), b.isMapped());
     }
-    static std::vector<std::function<void(Buffer &)>> Uses() {
-        return {[](Buffer &b) { b.bind(); },
-                [](Buffer &b) { b.size(); },
-                [](Buffer &b) { b.usagePolicy(); },
-                [](Buffer &b) { b.isMapped(); },
-                [](Buffer &b) { b.map(GL_READ_ONLY); },
-                [](Buffer &b) { b.unmap(); },
-                [](Buffer &b) { b.subData(0, 1, &b); },
-                [](Buffer &b) { b.isPackBuffer(); },
-                [](Buffer &b) { b.convertToPackBuffer(); },
-                [](Buffer &b) {
-                    Texture2D texture(kRGBA8, 2, 2, false);
-                    TextureUnit::Unit(0)->bind(&texture);
-                    texture.subImage(0, 0, 0, 2, 2, kBytes.format, kBytes.type, &b, 0, kTight);
-                }};
-    }
+    static inline std::function<void(Buffer &)> const kUses[] = {
+        [](Buffer &b) { b.bind(); },
+        [](Buffer &b) { b.size(); },
+        [](Buffer &b) { b.usagePolicy(); },
+        [](Buffer &b) { b.map(GL_READ_ONLY); },
+        [](Buffer &b) { b.unmap(); },
+        [](Buffer &b) { b.subData(0, 1, &b); },
+        [](Buffer &b) { b.convertToPackBuffer(); },
+        [](Buffer &b) {
+            BoundTexture const texture(std::make_unique<Texture2D>(kRGBA8, 2, 2, false));
+            Upload(*texture, 0, {{}, {2, 2, 1}}, kBytes, kTight, &b, std::size_t(0));
+        }};
 };
 
 template<>
-struct Handled<Framebuffer> {
+struct Handling<Framebuffer> {
     static Framebuffer Make() {
         Framebuffer framebuffer;
         framebuffer.bind(); // until then its name stands for none yet
@@ -106,77 +87,74 @@ struct Handled<Framebuffer> {
         return framebuffer;
     }
     static bool Lives(unsigned int name) { return ORU_GL(IsFramebufferEXT, name); }
-    static unsigned int Name(Framebuffer const &framebuffer) { return framebuffer.objectID(); }
-    static std::string Tell(Framebuffer const &f) { return std::to_string(f.target()); }
-    static std::vector<std::function<void(Framebuffer &)>> Uses() {
-        return {[](Framebuffer &f) { f.bind(); }, [](Framebuffer &f) { f.unbind(); },
-                [](Framebuffer &f) { f.statusOkay(nullptr); }};
-    }
+    static std::string Tell(Framebuffer const &f) { return TextOf(f.target()); }
+    static inline std::function<void(Framebuffer &)> const kUses[] = {
+        [](Framebuffer &f) { f.bind(); }, [](Framebuffer &f) { f.statusOkay(nullptr); }};
 };
 
 template<>
-struct Handled<Renderbuffer> {
+struct Handling<Renderbuffer> {
     static Renderbuffer Make() { return Renderbuffer(GL_DEPTH_COMPONENT24, 8, 4); }
     static bool Lives(unsigned int name) { return ORU_GL(IsRenderbufferEXT, name); }
-    static unsigned int Name(Renderbuffer const &renderbuffer) { return renderbuffer.objectID(); }
     static std::string Tell(Renderbuffer const &r) {
-        std::ostringstream text;
-        text << r.format() << ' ' << r.width() << 'x' << r.height();
-        return text.str();
+        return TextOf(r.format(), r.width(), r.height());
     }
-    static std::vector<std::function<void(Renderbuffer &)>> Uses() {
-        return {[](Renderbuffer &r) { r.bind(); }, [](Renderbuffer &r) { r.width(); },
-                [](Renderbuffer &r) { r.height(); }, [](Renderbuffer &r) { r.format(); },
-                [](Renderbuffer &r) {
-                    Framebuffer framebuffer;
-                    framebuffer.bind();
-                    framebuffer.attach(&r, 0);
-                }};
-    }
+    static inline std::function<void(Renderbuffer &)> const kUses[] = {
+        [](Renderbuffer &r) { r.bind(); }, [](Renderbuffer &r) { r.width(); },
+        [](Renderbuffer &r) {
+            Framebuffer framebuffer;
+            framebuffer.bind();
+            framebuffer.attach(&r, 0);
+        }};
 };
 
+char const *const kSource = "void main() { gl_Position = vec4(0.0); }";
+
 template<>
-struct Handled<Shader> {
+struct Handling<Shader> {
     static Shader Make() {
         Shader shader(Shader::SHADERTYPE_VERTEX);
-        shader.load("void main() { gl_Position = vec4(0.0); }");
+        shader.load(kSource);
         return shader;
     }
     static bool Lives(unsigned int name) { return ORU_GL(IsShader, name); }
-    static unsigned int Name(Shader const &shader) { return shader.shaderID(); }
-    static std::string Tell(Shader const &shader) { return std::to_string(shader.isLoaded()); }
-    static std::vector<std::function<void(Shader &)>> Uses() {
-        return {[](Shader &s) { s.compile(true); }, [](Shader &s) { s.shaderID(); }};
-    }
+    static std::string Tell(Shader const &s) { return TextOf(s.isLoaded()); }
+    static inline std::function<void(Shader &)> const kUses[] = {[](Shader &s) { s.compile(true); },
+                                                                 [](Shader &s) { s.shaderID(); }};
 };
 
 template<>
-struct Handled<Program> {
+struct Handling<Program> {
     static Program Make() {
         Program program;
-        char const *const source = "void main() { gl_Position = vec4(0.0); }";
-        program.loadVertexShader(1, &source, nullptr);
+        program.loadVertexShader(1, &kSource, nullptr);
         program.link(true);
         return program;
     }
     static bool Lives(unsigned int name) { return ORU_GL(IsProgram, name); }
-    static unsigned int Name(Program const &program) { return program.programID(); }
-    static std::string Tell(Program const &program) { return std::to_string(program.isLinked()); }
-    static std::vector<std::function<void(Program &)>> Uses() {
-        return {[](Program &p) { p.enable(); }, [](Program &p) { p.programID(); }};
-    }
+    static std::string Tell(Program const &p) { return TextOf(p.isLinked()); }
+    static inline std::function<void(Program &)> const kUses[] = {
+        [](Program &p) { p.enable(); }, [](Program &p) { p.programID(); }};
 };
+
+unsigned int NameOf(Object const &object) {
+    return object.objectID();
+}
+unsigned int NameOf(Shader const &shader) {
+    return shader.shaderID();
+}
+unsigned int NameOf(Program const &program) {
+    return program.programID();
+}
 
 template<class Object>
 class Handles : public ObjectTest {
 protected:
     static void ExpectEmpty(Object &object) {
-        int number = 0;
-        for (auto const &use : Handled<Object>::Uses()) {
+        for (auto const &use : Handling<Object>::kUses) {
             Failure const failure = FailureOf([&] { use(object); });
             EXPECT_NE(std::string::npos, (failure.text + failure.note).find("empty: it was moved"))
-                << "use " << number << " says \"" << failure.text << '"';
-            ++number;
+                << "use " << &use - Handling<Object>::kUses << " says \"" << failure.text << '"';
         }
     }
 };
@@ -189,19 +167,19 @@ using Kinds = testing::Types<Texture1D, Texture2D, TextureRECT, Texture1DArray, 
 TYPED_TEST_SUITE(Handles, Kinds, ); // with the comma, as clang wants an argument there
 
 TYPED_TEST(Handles, Move) {
-    using It = Handled<TypeParam>;
+    using It = Handling<TypeParam>;
     TypeParam first = It::Make();
-    unsigned int const name = It::Name(first);
+    unsigned int const name = NameOf(first);
     std::string const told = It::Tell(first);
     TypeParam second(std::move(first));
-    EXPECT_EQ(name, It::Name(second));
+    EXPECT_EQ(name, NameOf(second));
     EXPECT_EQ(told, It::Tell(second));
     this->ExpectEmpty(first);
 
     TypeParam third = It::Make();
-    unsigned int const replaced = It::Name(third);
+    unsigned int const replaced = NameOf(third);
     third = std::move(second);
-    EXPECT_EQ(name, It::Name(third));
+    EXPECT_EQ(name, NameOf(third));
     EXPECT_EQ(told, It::Tell(third));
     EXPECT_FALSE(It::Lives(replaced)) << "the old object goes when another is assigned";
     this->ExpectEmpty(second);
@@ -220,9 +198,9 @@ TYPED_TEST(Handles, Move) {
 }
 
 TYPED_TEST(Handles, TakeOverAndGiveUpNames) {
-    using It = Handled<TypeParam>;
+    using It = Handling<TypeParam>;
     TypeParam owner = It::Make();
-    unsigned int const name = It::Name(owner);
+    unsigned int const name = NameOf(owner);
     std::string const told = It::Tell(owner);
     auto const made = [&](ownership_tag ownership) {
         if constexpr (std::is_same_v<TypeParam, Buffer>)
@@ -232,10 +210,10 @@ TYPED_TEST(Handles, TakeOverAndGiveUpNames) {
     };
     {
         TypeParam borrowed = made(borrow_name_tag());
-        EXPECT_EQ(name, It::Name(borrowed));
+        EXPECT_EQ(name, NameOf(borrowed));
         EXPECT_EQ(told, It::Tell(borrowed));
         TypeParam const moved(std::move(borrowed));
-        EXPECT_EQ(name, It::Name(moved));
+        EXPECT_EQ(name, NameOf(moved));
     }
     EXPECT_TRUE(It::Lives(name)) << "a borrowed name stays";
     EXPECT_EQ(name, owner.disown());
@@ -248,26 +226,23 @@ TYPED_TEST(Handles, TakeOverAndGiveUpNames) {
 
 TEST_F(ObjectTest, TakesOverOnlyTexturesThatAFormatStandsFor) {
     std::pair<GLenum, std::string> const formats[] = {
-        {GL_R8, "INTERNALFORMAT_RED"},
-        {GL_RG8, "INTERNALFORMAT_RG"},
-        {GL_RGBA32F, "INTERNALFORMAT_RGBA32F_ARB"},
-        {GL_RGBA8UI, "A texture of the format GL_RGBA8UI cannot be taken over: no InternalFormat "
-                     "stands for it"}};
+        {GL_R8, TextOf(Texture::INTERNALFORMAT_RED)},
+        {GL_RG8, TextOf(Texture::INTERNALFORMAT_RG)},
+        {GL_RGB5_A1, TextOf(Texture::INTERNALFORMAT_RGB5_A1)},
+        {GL_DEPTH_COMPONENT24, "A texture of the format GL_DEPTH_COMPONENT24 cannot be taken over: "
+                               "no InternalFormat stands for it"}};
     for (auto const &[format, expected] : formats) {
         GLuint name = 0;
         ORU_GL(GenTextures, 1, &name);
         ORU_GL(BindTexture, GL_TEXTURE_2D, name);
         EXPECT_FAILURE("The texture " + std::to_string(name) + " has no level 0 yet",
                        Texture2D(name, borrow_name_tag()));
-        bool const isInteger = format == GL_RGBA8UI;
         ORU_GL(TexImage2D, GL_TEXTURE_2D, 0, static_cast<GLint>(format), 4, 4, 0,
-               isInteger ? GL_RGBA_INTEGER : GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
-        std::ostringstream told;
-        std::string const failure =
-            MessageOf([&] { told << Texture2D(name, borrow_name_tag()).format(); });
-        EXPECT_EQ(expected, told.str() + failure);
+               format == GL_DEPTH_COMPONENT24 ? GL_DEPTH_COMPONENT : GL_RGBA, GL_FLOAT, nullptr);
+        std::string told;
+        told += MessageOf([&] { told = TextOf(Texture2D(name, borrow_name_tag()).format()); });
+        EXPECT_EQ(expected, told);
         EXPECT_FAILURE("GL_INVALID_OPERATION", Texture3D(name, borrow_name_tag()));
-        ORU_GL(BindTexture, GL_TEXTURE_2D, 0);
         ORU_GL(DeleteTextures, 1, &name);
     }
 }

@@ -2,20 +2,12 @@
 #pragma once
 
 #include "oru/oru_ocl/openclheaders.h"
+#include "tests/support/textof.h"
 
 #include <map>
-#include <sstream>
 #include <string>
 
 namespace oru_test {
-
-/// Arguments of a call as a text; texts of several make that of all.
-template<class... Arguments>
-std::string TextOf(Arguments... arguments) {
-    std::ostringstream text;
-    ((text << arguments << ' '), ...);
-    return text.str();
-}
 
 /// One for each runtime, which exports it by OruTestCallBook; used while no call is under way. The
 /// runtime itself uses what follows `references`.
