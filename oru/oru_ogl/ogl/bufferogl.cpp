@@ -88,10 +88,10 @@ Buffer &Buffer::operator=(Buffer &&other) noexcept {
     if (this == &other)
         return *this;
     deleteObject();
-    Object::operator=(std::move(other));
     size_ = other.size_;
     usagePolicy_ = other.usagePolicy_;
     mapped_ = other.mapped_;
+    Object::operator=(std::move(other));
     return *this;
 }
 

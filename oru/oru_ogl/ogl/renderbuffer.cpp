@@ -88,11 +88,11 @@ Renderbuffer &Renderbuffer::operator=(Renderbuffer &&other) noexcept {
     if (this == &other)
         return *this;
     deleteObject();
-    Object::operator=(std::move(other));
     format_ = other.format_;
     attachment_ = other.attachment_;
     width_ = other.width_;
     height_ = other.height_;
+    Object::operator=(std::move(other));
     return *this;
 }
 

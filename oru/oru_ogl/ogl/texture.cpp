@@ -82,13 +82,13 @@ Texture &Texture::operator=(Texture &&other) noexcept {
     if (this == &other)
         return *this;
     deleteObject();
-    Object::operator=(std::move(other));
     format_ = other.format_;
     width_ = other.width_;
     height_ = other.height_;
     depth_ = other.depth_;
     sizeInBytes_ = other.sizeInBytes_;
     generatesMipmaps_ = other.generatesMipmaps_;
+    Object::operator=(std::move(other));
     return *this;
 }
 
