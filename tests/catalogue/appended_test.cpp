@@ -21,8 +21,8 @@ bool IsLibraryInitialized() {
     return true;
 }
 DisplayDeviceKey const &DisplayDeviceOf(Context const &) {
-    static DisplayDeviceKey const none;
-    return none;
+    static DisplayDeviceKey const kNone;
+    return kNone;
 }
 HGLRC RenderContextOf(Context const &) {
     return nullptr;

@@ -85,52 +85,52 @@ class ContextCounter : public WGLForwarder {
 public:
     /// @param isDeaf whether contexts with attributes are made of OpenGL 3.0, whatever is asked
     explicit ContextCounter(bool isDeaf = false) {
-        sIsDeaf = isDeaf;
-        sMade = 0;
-        sAlive.clear();
-        sGone.clear();
+        sIsDeaf_ = isDeaf;
+        sMade_ = 0;
+        sAlive_.clear();
+        sGone_.clear();
     }
 
     HGLRC wcgmCreateContext(char const *file, unsigned int line, HDC dc) override {
         return Counted(WGLForwarder::wcgmCreateContext(file, line, dc));
     }
     BOOL wcgmDeleteContext(char const *file, unsigned int line, HGLRC rc) override {
-        sGone.insert(sAlive.extract(rc));
+        sGone_.insert(sAlive_.extract(rc));
         return WGLForwarder::wcgmDeleteContext(file, line, rc);
     }
     PROC wcgmGetProcAddress(char const *file, unsigned int line, char const *name) override {
         PROC const real = WGLForwarder::wcgmGetProcAddress(file, line, name);
         if (!real || std::string(name) != "wglCreateContextAttribsARB")
             return real;
-        sCreate = internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(real);
+        sCreate_ = internal::FunctionCast<PFNWGLCREATECONTEXTATTRIBSARBPROC>(real);
         return reinterpret_cast<PROC>(reinterpret_cast<void *>(&CreateContextAttribs));
     }
 
-    static int Made() { return sMade; }
-    static std::size_t Alive() { return sAlive.size(); }
+    static int Made() { return sMade_; }
+    static std::size_t Alive() { return sAlive_.size(); }
     /// Contexts that are gone and have a record all the same.
     static auto Remembered() {
-        return std::count_if(sGone.begin(), sGone.end(),
+        return std::count_if(sGone_.begin(), sGone_.end(),
                              [](HGLRC rc) { return ExtensionManager::Instance(rc) != nullptr; });
     }
 
 private:
     static HGLRC Counted(HGLRC made) {
-        sMade += made ? 1 : 0;
+        sMade_ += made ? 1 : 0;
         if (made)
-            sAlive.insert(made);
-        sGone.erase(made); // a handle may be used again
+            sAlive_.insert(made);
+        sGone_.erase(made); // a handle may be used again
         return made;
     }
     static HGLRC WINAPI CreateContextAttribs(HDC dc, HGLRC share, int const *attributes) {
         int const old[] = {WGL_CONTEXT_MAJOR_VERSION_ARB, 3, 0};
-        return Counted(sCreate(dc, share, sIsDeaf ? old : attributes));
+        return Counted(sCreate_(dc, share, sIsDeaf_ ? old : attributes));
     }
 
-    static inline bool sIsDeaf = false;
-    static inline int sMade = 0;
-    static inline std::set<HGLRC> sAlive, sGone;
-    static inline PFNWGLCREATECONTEXTATTRIBSARBPROC sCreate = nullptr;
+    static inline bool sIsDeaf_ = false;
+    static inline int sMade_ = 0;
+    static inline std::set<HGLRC> sAlive_, sGone_;
+    static inline PFNWGLCREATECONTEXTATTRIBSARBPROC sCreate_ = nullptr;
 };
 
 } // namespace oru_test

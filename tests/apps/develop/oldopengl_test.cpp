@@ -10,7 +10,9 @@ namespace {
 using DevelopOnOldOpenGL = DevelopFixture;
 
 TEST_F(DevelopOnOldOpenGL, WorksFromVersion3On) {
-    std::string const version = std::string(std::getenv("MESA_GL_VERSION_OVERRIDE")).substr(0, 3);
+    char const *const asked = std::getenv("MESA_GL_VERSION_OVERRIDE");
+    ASSERT_NE(nullptr, asked);
+    std::string const version = std::string(asked).substr(0, 3);
     App::Image const colour = EveryValue(4, 16);
     write("colour.png", colour);
     write("spots.txt", "9 9 5 1");

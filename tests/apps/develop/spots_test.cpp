@@ -17,8 +17,9 @@ using Spots = DevelopFixture;
 auto SpottedLight(Image const &photo, std::vector<Spot> const &spots, double stops) {
     return [&photo, spots, stops](std::size_t i) {
         std::size_t const pixel = i / photo.channels;
+        std::size_t const row = pixel / photo.width;
         double const x = static_cast<double>(pixel % photo.width) + 0.5;
-        double const y = static_cast<double>(pixel / photo.width) + 0.5;
+        double const y = static_cast<double>(row) + 0.5;
         double sum = stops;
         for (Spot const &spot : spots) {
             double const d = std::hypot(x - spot.x, y - spot.y);

@@ -12,8 +12,8 @@ constexpr std::size_t kEntryCount = sizeof(FunctionTable) / sizeof(PROC);
 
 /// An entry point, its group, its prototype.
 std::vector<std::vector<std::string>> const &Rows() {
-    static auto const rows = oru_test::TableRows(ORU_ENTRY_POINTS);
-    return rows;
+    static auto const kRows = oru_test::TableRows(ORU_ENTRY_POINTS);
+    return kRows;
 }
 
 #if defined(__GNUC__)
