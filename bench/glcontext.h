@@ -12,11 +12,11 @@ namespace oru_bench {
 
 /// Opens the library for the rest of the program.
 inline void OpenLibrary() {
-    static bool const opened = [] {
+    static bool const kIsOpen = [] {
         ORU::OGL::Library::Initialize(ORU::OGL::Library::InitOptions());
         return true;
     }();
-    static_cast<void>(opened);
+    static_cast<void>(kIsOpen);
 }
 
 /// A context of the library, current on the calling thread. The library's share groups are not

@@ -123,7 +123,7 @@ TEST_F(DrawingGuide, DrawsASquare) {
     program.loadFragmentShader(1, &kFragmentShader, nullptr);
     program.link(true);
     // [program]
-    VertexBuffer square = this->square(program, 0.5f);
+    VertexBuffer square = DrawingGuide::square(program, 0.5f);
 
     // [draw]
     float const gains[] = {2, 0.25f};
@@ -160,7 +160,7 @@ TEST_F(DrawingGuide, ChangesOneField) {
     ORU_GL(Viewport, 0, 0, 8, 8);
     Program program;
     build(program);
-    VertexBuffer square = this->square(program, 1);
+    VertexBuffer square = DrawingGuide::square(program, 1);
     ProgramEnabledScope const scope(&program);
     program.setUniform("colour", 1.f, 1.f, 1.f, 1.f);
     float const gains[] = {1, 0};

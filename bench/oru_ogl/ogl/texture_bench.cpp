@@ -62,9 +62,9 @@ void PlainUpload(Square const &square, void const *pixels) {
 }
 
 void LibraryUpload(Square &square) {
-    static PixelUnpackParameters const tight;
+    static PixelUnpackParameters const kTight;
     square.texture.subImage(0, 0, 0, square.sizes(), square.sizes(), Texture::FORMAT_RGBA,
-                            Texture::TYPE_UNSIGNED_BYTE, square.pixels.data(), tight);
+                            Texture::TYPE_UNSIGNED_BYTE, square.pixels.data(), kTight);
 }
 
 void Upload(benchmark::State &state) {

@@ -8,17 +8,19 @@ namespace ORU::OGL {
 ///
 ///     Texture2D picture(name, borrow_name_tag());
 struct ownership_tag {
+    constexpr explicit ownership_tag(bool owner) : isOwner(owner) {}
+
     bool isOwner; ///< whether the object deletes the name
 };
 
 /// The object takes the name over, and deletes it as it would one of its own.
 struct take_name_tag : ownership_tag {
-    constexpr take_name_tag() : ownership_tag{true} {}
+    constexpr take_name_tag() : ownership_tag(true) {}
 };
 
 /// The name stays its owner's, who keeps it while the object is used.
 struct borrow_name_tag : ownership_tag {
-    constexpr borrow_name_tag() : ownership_tag{false} {}
+    constexpr borrow_name_tag() : ownership_tag(false) {}
 };
 
 } // namespace ORU::OGL

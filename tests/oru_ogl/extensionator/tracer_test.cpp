@@ -58,15 +58,15 @@ private:
     /// The next argument of a type: different at each place of a call and extreme at times.
     template<class Type>
     Type sample() {
-        static float const floats[] = {0.5f,  -0.0f,  3.14159265f, -1e20f, 999999.5f,
-                                       1e-7f, 1e-45f, 1000000,     NAN,    -INFINITY};
+        static float const kFloats[] = {0.5f,  -0.0f,  3.14159265f, -1e20f, 999999.5f,
+                                        1e-7f, 1e-45f, 1000000,     NAN,    -INFINITY};
         std::size_t const place = place_++;
         if constexpr (std::is_same<Type, char const *>::value)
             return place % 2 ? "" : "b{eta}[1].gamma";
         else if constexpr (std::is_pointer<Type>::value)
             return reinterpret_cast<Type>(place % 7 * 0xABCD00);
         else if constexpr (std::is_floating_point<Type>::value)
-            return static_cast<Type>(floats[place % std::size(floats)]);
+            return static_cast<Type>(kFloats[place % std::size(kFloats)]);
         else // a named value or one with all bits in use
             return static_cast<Type>(place % 2 ? 0x1900 + place : place * 0x9E3779B97F4A7C15u);
     }

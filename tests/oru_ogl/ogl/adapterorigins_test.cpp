@@ -9,7 +9,7 @@ using namespace ORU::OGL;
 
 namespace {
 
-int factories = 0;
+int gFactories = 0;
 
 } // namespace
 
@@ -18,7 +18,7 @@ int factories = 0;
 extern "C" HRESULT WINAPI __real_CreateDXGIFactory1(REFIID id, void **factory);
 
 extern "C" HRESULT WINAPI __wrap_CreateDXGIFactory1(REFIID id, void **factory) {
-    ++factories;
+    ++gFactories;
     return __real_CreateDXGIFactory1(id, factory);
 }
 // NOLINTEND(bugprone-reserved-identifier)
@@ -26,10 +26,10 @@ extern "C" HRESULT WINAPI __wrap_CreateDXGIFactory1(REFIID id, void **factory) {
 TEST(AdapterOrigins, AreAskedForOnce) {
     AutoInitializer library;
     ContextOffscreen const first;
-    EXPECT_EQ(1, factories) << "the look for the primary display serves record and context";
+    EXPECT_EQ(1, gFactories) << "the look for the primary display serves record and context";
     ContextOffscreen const second(&first);
     ContextOffscreen const third;
-    EXPECT_EQ(1, factories) << "the monitors are as they were";
+    EXPECT_EQ(1, gFactories) << "the monitors are as they were";
     Context::NumDisplayDevice();
-    EXPECT_EQ(2, factories) << "the host's own question is asked anew";
+    EXPECT_EQ(2, gFactories) << "the host's own question is asked anew";
 }

@@ -35,6 +35,7 @@ class CapabilitiesTest : public ObjectTest {};
 
 TEST_F(CapabilitiesTest, FollowTheImplementationAndNeedAContext) {
     char const *const version = std::getenv("ORU_TEST_VERSION");
+    ASSERT_NE(nullptr, version);
     EXPECT_TRUE(!*version || std::atoi(version) == Version()) << "the override works";
     bool const programs = Version() >= 20, framebuffers = Has("GL_EXT_framebuffer_object"),
                rectangles = Has("GL_ARB_texture_rectangle"), arrays = Has("GL_EXT_texture_array");

@@ -60,7 +60,7 @@ TEST_F(LostContextTest, EndsThrowNothingAndMakeNoCallWithoutAContext) {
         InterceptorScope<CountingForwarder> calls;
         EXPECT_NO_THROW(everything.reset());
         EXPECT_EQ(inAnother, calls->total() > 0);
-        EXPECT_EQ(inAnother, GetGLString(GL_VENDOR) != "");
+        EXPECT_EQ(inAnother, !GetGLString(GL_VENDOR).empty());
         context().makeCurrent();
         ::glGetError();
     }
