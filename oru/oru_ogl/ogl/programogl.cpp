@@ -29,6 +29,7 @@ bool Program::IsSupported() {
 
 namespace {
 
+/// Out of line, as `body` is inlined into every setter.
 [[noreturn]] ORU_COLD void ThrowWithoutBody() {
     ORU_private::ThrowInternalNoted(__FILE__, __LINE__, "Enforce actualProgram_ != NULL",
                                     "the program is empty: it was moved from, or has given up its "

@@ -20,3 +20,9 @@ TEST(Gallery, DrawsItsPictures) {
         EXPECT_LE(WorstError(wanted, drawn, 0.0), 1) << name;
     }
 }
+
+TEST(Gallery, ReportsFailures) {
+    TemporaryFolder const folder;
+    EXPECT_EQ(2, RunProgram("hello_offscreen.exe", "", folder.path()).exitCode);
+    EXPECT_EQ(1, RunProgram("hello_offscreen.exe", "no/folder.png", folder.path()).exitCode);
+}

@@ -218,6 +218,7 @@ TEST_F(ObjectTest, TakesOverOnlyTexturesThatAFormatStandsFor) {
     std::pair<GLenum, std::string> const formats[] = {
         {GL_R8, TextOf(Texture::INTERNALFORMAT_RED)},
         {GL_RG8, TextOf(Texture::INTERNALFORMAT_RG)},
+        {GL_RGB5_A1, TextOf(Texture::INTERNALFORMAT_RGB5_A1)},
         {GL_DEPTH_COMPONENT24, "A texture of the format GL_DEPTH_COMPONENT24 cannot be taken over: "
                                "no InternalFormat stands for it"}};
     for (auto const &[format, expected] : formats) {
