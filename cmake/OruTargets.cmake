@@ -11,6 +11,27 @@ function(oru_add_subdirectories)
     endforeach()
 endfunction()
 
+# What an installation needs built; tools/package builds it.
+add_custom_target(oru_installed)
+
+# oru_install_program(<target>): installs a program, without symbols.
+function(oru_install_program target)
+    if(MINGW)
+        target_link_options(${target} PRIVATE "$<$<CONFIG:Release>:LINKER:--strip-all>")
+    endif()
+    install(TARGETS ${target})
+    add_dependencies(oru_installed ${target})
+    oru_list_linked_files(${target})
+endfunction()
+
+# oru_list_linked_files(<target>): the linker lists the files it reads in <target>.linked of the build folder, by
+# which tools/package knows whose work the file contains.
+function(oru_list_linked_files target)
+    if(MINGW)
+        target_link_options(${target} PRIVATE "LINKER:--dependency-file=${PROJECT_BINARY_DIR}/${target}.linked")
+    endif()
+endfunction()
+
 # oru_add_test(<name> SOURCES <file>... [LIBRARIES <target>...] [ENVIRONMENT <VAR=value>...]
 #              [TIMEOUT <seconds>] [INTERNAL])
 # A GoogleTest program, each of its cases a test of CTest, run with ENVIRONMENT and ended after TIMEOUT

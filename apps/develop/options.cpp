@@ -2,6 +2,7 @@
 #include "apps/develop/options.h"
 
 #include "apps/common/number.h"
+#include "oru/version.h"
 
 #include <CLI/CLI.hpp>
 
@@ -28,7 +29,8 @@ CLI::Validator Between(double least, double most) {
 
 void Describe(CLI::App &app, Options &options) {
     app.allow_windows_style_options(false); // a slash begins a path
-    app.set_version_flag("--version", "develop " ORU_VERSION);
+    app.set_version_flag("--version",
+                         std::string("develop " ORU_VERSION_STRING ", oru.dll ") + ORU::Version());
     app.add_option("IMAGE", options.inputs, "PNG or JPEG pictures, and folders of them")
         ->type_name("")
         ->option_text("...");

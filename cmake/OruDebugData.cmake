@@ -1,0 +1,23 @@
+# Debug data in a file of its own, beside what it belongs to.
+include_guard(GLOBAL)
+
+set(ORU_SPLIT_DEBUG_DATA OFF)
+if(MINGW AND CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_BUILD_TYPE STREQUAL "Release")
+    find_program(ORU_GNU_OBJCOPY NAMES x86_64-w64-mingw32-objcopy objcopy REQUIRED)
+    set(ORU_SPLIT_DEBUG_DATA ON)
+endif()
+
+# oru_split_debug_data(<target>): a release has the debug data of <target> in FILE.debug, where gdb finds it by the
+# link in FILE. The compiler makes the same code with and without it.
+function(oru_split_debug_data target)
+    if(NOT ORU_SPLIT_DEBUG_DATA)
+        return()
+    endif()
+    target_compile_options(${target} PRIVATE -g)
+    set(file "$<TARGET_FILE:${target}>")
+    add_custom_command(TARGET ${target} POST_BUILD
+        COMMAND "${ORU_GNU_OBJCOPY}" --only-keep-debug "${file}" "${file}.debug"
+        COMMAND "${ORU_GNU_OBJCOPY}" --strip-all "--add-gnu-debuglink=${file}.debug" "${file}"
+        BYPRODUCTS "${CMAKE_RUNTIME_OUTPUT_DIRECTORY}/${target}.dll.debug"
+        VERBATIM)
+endfunction()
