@@ -5,13 +5,24 @@
 // openglextension_undef.inc behind it.
 #pragma once
 
+// A small windows.h without min and max; what a host did not ask for itself is not left behind.
 #ifndef WIN32_LEAN_AND_MEAN
 #define WIN32_LEAN_AND_MEAN
+#define ORU_PLATFORMGL_LEAN
 #endif
 #ifndef NOMINMAX
 #define NOMINMAX
+#define ORU_PLATFORMGL_NOMINMAX
 #endif
 #include <windows.h>
+#ifdef ORU_PLATFORMGL_LEAN
+#undef ORU_PLATFORMGL_LEAN
+#undef WIN32_LEAN_AND_MEAN
+#endif
+#ifdef ORU_PLATFORMGL_NOMINMAX
+#undef ORU_PLATFORMGL_NOMINMAX
+#undef NOMINMAX
+#endif
 
 #include <GL/gl.h>
 

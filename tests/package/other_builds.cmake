@@ -23,9 +23,8 @@ run(${EMULATOR} "${work}/pkgconfig.exe")
 run("${PYTHON}" -B "${CMAKE_CURRENT_LIST_DIR}/macros.py" "${package}/include"
     ${gcc} "-I${package}/include" -isystem "${OPENCL_INCLUDE_DIR}")
 
-run(${configure} -S "${package}/examples" -B "${work}/examples" "-DCMAKE_PREFIX_PATH=${package}"
-    "-DCMAKE_TOOLCHAIN_FILE=${SOURCE_DIR}/cmake/toolchain-mingw64.cmake"
-    "-DCMAKE_FIND_ROOT_PATH=${package};${SOURCE_DIR}/build/deps;/usr/x86_64-w64-mingw32")
+run(${configure} -S "${package}/examples" -B "${work}/examples" "-Doru_DIR=${package}/lib/cmake/oru"
+    "-DCMAKE_TOOLCHAIN_FILE=${TOOLCHAIN_FILE}") # which knows where libpng and libjpeg are
 run("${CMAKE_COMMAND}" --build "${work}/examples")
 run(${EMULATOR} "${work}/examples/bin/hello_offscreen.exe" "${work}/hello.png")
 
