@@ -37,8 +37,12 @@ list(TRANSFORM ORU_RUNTIME_DLLS REPLACE ".*/" "" OUTPUT_VARIABLE runtime_dlls)
 configure_package_config_file("${PROJECT_SOURCE_DIR}/cmake/oruConfig.cmake.in"
     "${PROJECT_BINARY_DIR}/oruConfig.cmake" INSTALL_DESTINATION "${config_dir}"
     PATH_VARS CMAKE_INSTALL_BINDIR CMAKE_INSTALL_INCLUDEDIR)
-write_basic_package_version_file("${PROJECT_BINARY_DIR}/oruConfigVersion.cmake"
-    COMPATIBILITY SameMinorVersion)
+# What CONTRIBUTING.md promises between versions.
+set(compatibility SameMajorVersion)
+if(PROJECT_VERSION_MAJOR EQUAL 0)
+    set(compatibility SameMinorVersion)
+endif()
+write_basic_package_version_file("${PROJECT_BINARY_DIR}/oruConfigVersion.cmake" COMPATIBILITY ${compatibility})
 install(FILES "${PROJECT_BINARY_DIR}/oruConfig.cmake" "${PROJECT_BINARY_DIR}/oruConfigVersion.cmake"
     DESTINATION "${config_dir}")
 

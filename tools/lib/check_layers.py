@@ -15,6 +15,7 @@ ROOT = pathlib.Path(__file__).resolve().parents[2]
 # The first that fits counts; files of one layer may include each other.
 LAYERS = [
     ("oru/core/", "core", 0),
+    ("oru/version.", "core", 0),
     ("oru/oru_ogl/extensionator/", "function layer", 2),
     ("oru/oru_ogl/libraryogl.", "start-up", 3),
     ("oru/oru_ogl/ogl/", "contexts and objects", 3),
