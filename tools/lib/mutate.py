@@ -28,8 +28,10 @@ COLUMNS = ["name", "file", "text", "replacement", "effect", "filter", "survives"
 FEWEST_ROWS = 120
 LOWEST_RATE = 95
 FIRST_PROGRAMS = 4  # built and run before the rest is
-KNOWN_PROPERTIES = {"DISABLED", "ENVIRONMENT", "LABELS", "PASS_REGULAR_EXPRESSION", "RUN_SERIAL",
-                    "SKIP_REGULAR_EXPRESSION", "TIMEOUT", "WORKING_DIRECTORY"}
+FIXTURES = {"FIXTURES_REQUIRED", "FIXTURES_SETUP"}
+KNOWN_PROPERTIES = FIXTURES | {
+    "DISABLED", "ENVIRONMENT", "LABELS", "PASS_REGULAR_EXPRESSION", "RUN_SERIAL", "SKIP_REGULAR_EXPRESSION", "TIMEOUT",
+    "WORKING_DIRECTORY"}
 
 Row = collections.namedtuple("Row", ["area"] + COLUMNS)
 Test = collections.namedtuple("Test", "name command environment folder serial passes")
@@ -191,7 +193,8 @@ class Group:
 
 
 def list_groups():
-    """Every test of the copy, but the test of this table, which each fault would fail."""
+    """Every test of the copy, but the test of this table, which each fault would fail, and those that need what
+    another test made: the package's, which want a repository too."""
     listed = subprocess.run(["ctest", "--test-dir", BUILD, "--show-only=json-v1"], check=True, capture_output=True,
                             stdin=subprocess.DEVNULL)
     groups = collections.defaultdict(list)
@@ -199,7 +202,8 @@ def list_groups():
         properties = {p["name"]: p["value"] for p in entry.get("properties", [])}
         if unknown := properties.keys() - KNOWN_PROPERTIES:
             raise SystemExit(f"{entry['name']} has properties that are not known here: {' '.join(unknown)}")
-        if not properties.get("DISABLED") and str(TREE / "tools/mutate") not in entry["command"]:
+        left_out = properties.get("DISABLED") or properties.keys() & FIXTURES
+        if not left_out and str(TREE / "tools/mutate") not in entry["command"]:
             test = Test(entry["name"], entry["command"], properties.get("ENVIRONMENT", []),
                         properties["WORKING_DIRECTORY"], properties.get("RUN_SERIAL", False),
                         properties.get("PASS_REGULAR_EXPRESSION", []))
