@@ -43,6 +43,7 @@ endif()
 file(RELATIVE_PATH source_from_build "${PROJECT_BINARY_DIR}" "${PROJECT_SOURCE_DIR}")
 add_compile_options(
     "-ffile-prefix-map=${PROJECT_SOURCE_DIR}/="
+    "-ffile-prefix-map=${PROJECT_BINARY_DIR}=." # the folder of the compilation, in debug data
     "-ffile-prefix-map=${PROJECT_BINARY_DIR}/="
     "-ffile-prefix-map=${source_from_build}=")
 
