@@ -38,14 +38,19 @@ if(ORU_WARNINGS_AS_ERRORS)
 endif()
 
 # Source positions in messages, and so the bytes of the library, are relative to the repository and the
-# build folder, whatever their place. ccache turns paths into relative ones, hence the last mapping. The
+# build folder, whatever their place. ccache turns paths into relative ones, hence the last two mappings. The
 # compiler tries the mappings from the last to the first.
 file(RELATIVE_PATH source_from_build "${PROJECT_BINARY_DIR}" "${PROJECT_SOURCE_DIR}")
+file(RELATIVE_PATH deps_from_build "${PROJECT_BINARY_DIR}" "${PROJECT_SOURCE_DIR}/build/deps")
 add_compile_options(
     "-ffile-prefix-map=${PROJECT_SOURCE_DIR}/="
     "-ffile-prefix-map=${PROJECT_BINARY_DIR}=." # the folder of the compilation, in debug data
     "-ffile-prefix-map=${PROJECT_BINARY_DIR}/="
-    "-ffile-prefix-map=${source_from_build}=")
+    "-ffile-prefix-map=${source_from_build}="
+    "-ffile-prefix-map=${deps_from_build}=build/deps")
+if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+    add_compile_options(-fno-canonical-system-headers) # else links are followed to where the mappings do not reach
+endif()
 
 add_link_options(-Wl,--no-insert-timestamp)
 

@@ -15,9 +15,11 @@ function(oru_split_debug_data target)
     endif()
     target_compile_options(${target} PRIVATE -g)
     set(file "$<TARGET_FILE:${target}>")
+    # Without the variable the time of the day gets into the file.
+    set(objcopy "${CMAKE_COMMAND}" -E env SOURCE_DATE_EPOCH=0 "${ORU_GNU_OBJCOPY}")
     add_custom_command(TARGET ${target} POST_BUILD
-        COMMAND "${ORU_GNU_OBJCOPY}" --only-keep-debug "${file}" "${file}.debug"
-        COMMAND "${ORU_GNU_OBJCOPY}" --strip-all "--add-gnu-debuglink=${file}.debug" "${file}"
+        COMMAND ${objcopy} --only-keep-debug "${file}" "${file}.debug"
+        COMMAND ${objcopy} --strip-all "--add-gnu-debuglink=${file}.debug" "${file}"
         BYPRODUCTS "${CMAKE_RUNTIME_OUTPUT_DIRECTORY}/${target}.dll.debug"
         VERBATIM)
 endfunction()

@@ -14,7 +14,7 @@ if(ORU_STATIC_RUNTIME)
     return()
 endif()
 
-# Debian's carry debug data, ten times their size.
+# Debian's carry debug data, ten times their size. Without the variable strip puts the time of the day into them.
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
     set(ORU_GNU_CXX "${CMAKE_CXX_COMPILER}")
 else()
@@ -27,7 +27,8 @@ foreach(dll IN ITEMS libstdc++-6.dll libgcc_s_seh-1.dll libwinpthread-1.dll)
     set(copy "${CMAKE_RUNTIME_OUTPUT_DIRECTORY}/${dll}")
     if(NOT EXISTS "${copy}" OR "${path}" IS_NEWER_THAN "${copy}")
         file(MAKE_DIRECTORY "${CMAKE_RUNTIME_OUTPUT_DIRECTORY}")
-        execute_process(COMMAND "${ORU_GNU_STRIP}" --strip-all -o "${copy}" "${path}" COMMAND_ERROR_IS_FATAL ANY)
+        execute_process(COMMAND "${CMAKE_COMMAND}" -E env SOURCE_DATE_EPOCH=0
+            "${ORU_GNU_STRIP}" --strip-all -o "${copy}" "${path}" COMMAND_ERROR_IS_FATAL ANY)
     endif()
     list(APPEND ORU_RUNTIME_DLLS "${copy}")
 endforeach()
