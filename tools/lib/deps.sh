@@ -4,7 +4,7 @@
 ORU_PACKAGES=(
     ca-certificates git cmake dpkg-dev ninja-build ccache python3 xz-utils
     g++-mingw-w64-x86-64-posix libz-mingw-w64-dev nasm
-    clang clang-format-14 clang-tidy-14 llvm-14 lld-14 pkgconf
+    clang clang-tools-14 clang-format-14 clang-tidy-14 libc++-14-dev llvm-14 lld-14 pkgconf
     libboost-dev libcli11-dev opencl-headers opencl-clhpp-headers googletest
     wine wine64 xvfb libgl1 libgl1-mesa-dri ocl-icd-libopencl1 pocl-opencl-icd
     apitrace)

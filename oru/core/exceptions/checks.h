@@ -8,10 +8,10 @@
 // The macros are variadic only so that an expression may hold commas (template arguments). A
 // passing check costs its comparison: what throws is one function, out of line and marked cold.
 
-#if defined(__GNUC__)
-#define ORU_COLD __attribute__((cold, noinline))
-#else
+#if defined(_MSC_VER)
 #define ORU_COLD __declspec(noinline)
+#else
+#define ORU_COLD __attribute__((cold, noinline))
 #endif
 
 namespace ORU_private {

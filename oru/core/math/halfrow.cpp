@@ -6,6 +6,15 @@
 #include <intrin.h>
 #define ORU_TARGET(features)
 #else
+#ifdef _MSC_VER // clang-cl's immintrin.h leaves out what not every processor of the target has
+#include <smmintrin.h>
+#include <xsaveintrin.h>
+
+#include <avxintrin.h>
+#include <f16cintrin.h>
+
+#include <avx2intrin.h>
+#endif
 #include <cpuid.h>
 #define ORU_TARGET(features) __attribute__((target(features)))
 #endif
