@@ -178,6 +178,101 @@ TEST_F(OpenCLGuide, WaitsForEvents) {
     EXPECT_EQ(std::vector<int>(256, 42), values);
 }
 
+TEST_F(OpenCLGuide, KeepsBuffers) {
+    std::vector<float> values(64, 1.0f);
+    std::size_t const bytes = values.size() * sizeof(float);
+    // [buffers]
+    Buffer const scratch(context, Memory::MEMORY_READ_WRITE, false, bytes); // content undefined
+    Buffer const copied(context, Memory::MEMORY_READ_ONLY, false, bytes, values.data());
+    Buffer staged(context, Memory::MEMORY_READ_WRITE, true, bytes); // quick for the host to reach
+    Buffer const inPlace(context, Memory::MEMORY_READ_WRITE, bytes, values.data()); // no copy
+
+    float const part[] = {7, 8};
+    queue.enqueueBlockingWrite(staged, 4 * sizeof(float), sizeof part, part); // values 4 and 5
+    // [buffers]
+    float read[2] = {};
+    queue.enqueueBlockingRead(staged, 5 * sizeof(float), sizeof(float), read);
+    EXPECT_EQ(8, read[0]);
+    queue.enqueueBlockingRead(copied, 0, sizeof read, read);
+    EXPECT_EQ(1, read[1]);
+}
+
+TEST_F(OpenCLGuide, SumsInGroups) {
+    std::vector<float> const values(1024, 0.5f);
+    Buffer const input(context, Memory::MEMORY_READ_ONLY, false, values.size() * sizeof(float),
+                       const_cast<float *>(values.data()));
+    Buffer const sums(context, Memory::MEMORY_WRITE_ONLY, false, 16 * sizeof(float));
+    // [local]
+    Program program(context, R"(
+        kernel void sum(global float const *input, local float *shared, global float *sums) {
+            size_t const item = get_local_id(0);
+            shared[item] = input[get_global_id(0)];
+            for (size_t width = get_local_size(0) / 2; width > 0; width /= 2) {
+                barrier(CLK_LOCAL_MEM_FENCE);
+                if (item < width)
+                    shared[item] += shared[item + width];
+            }
+            if (item == 0)
+                sums[get_group_id(0)] = shared[0];
+        })");
+    program.build("");
+    Kernel sum = program.kernel("sum");
+    sum.setArg(0, input);
+    sum.setArg(1, nullptr, 64 * sizeof(float)); // local memory: a size, no contents
+    sum.setArg(2, sums);
+    queue.enqueueKernel(sum, Range<1>(1024), 64, 0); // 16 groups of 64
+    // [local]
+    std::vector<float> read(16);
+    queue.enqueueBlockingRead(sums, 0, read.size() * sizeof(float), read.data());
+    EXPECT_EQ(std::vector<float>(16, 32), read);
+}
+
+TEST_F(OpenCLGuide, KeepsBinaries) {
+    Program const program = built("kernel void nothing() {}");
+    // [binaries]
+    std::size_t size = 0; // of the one device that the program was built for
+    ORU_CL(GetProgramInfo, program.id(), CL_PROGRAM_BINARY_SIZES, sizeof size, &size, nullptr);
+    std::vector<unsigned char> binary(size);
+    unsigned char *place = binary.data();
+    ORU_CL(GetProgramInfo, program.id(), CL_PROGRAM_BINARIES, sizeof place, &place, nullptr);
+
+    Program again(context, Program::BinaryArray({device}, {size}, {binary}));
+    again.build("");
+    // [binaries]
+    again.kernel("nothing");
+}
+
+TEST_F(OpenCLGuide, TellsTimes) {
+    Program const program = built("kernel void nothing() {}");
+    Kernel const kernel = program.kernel("nothing");
+    // [times]
+    CommandQueue timed(context, device, false, true);
+    Event const done = timed.enqueueKernel(kernel, Range<1>(64), 0, 0);
+    timed.finish();
+    cl_ulong began = 0, ended = 0; // nanoseconds
+    ORU_CL(GetEventProfilingInfo, done.id(), CL_PROFILING_COMMAND_START, sizeof began, &began,
+           nullptr);
+    ORU_CL(GetEventProfilingInfo, done.id(), CL_PROFILING_COMMAND_END, sizeof ended, &ended,
+           nullptr);
+    // [times]
+    EXPECT_LE(began, ended);
+    EXPECT_NE(0u, began);
+}
+
+TEST_F(OpenCLGuide, NamesTheArgument) {
+    Program const program = built("kernel void brighten(global float *v, float f) { v[0] *= f; }");
+    std::string told;
+    // [argument]
+    Kernel brighten = program.kernel("brighten");
+    try {
+        brighten.setArg(1, 2.0); // a double where the kernel takes a float
+    } catch (ExceptionOCL const &failure) {
+        told = failure.note(); // "in clSetKernelArg, argument 1 of kernel brighten given 8 bytes"
+    }
+    // [argument]
+    EXPECT_EQ("in clSetKernelArg, argument 1 of kernel brighten given 8 bytes", told);
+}
+
 TEST_F(OpenCLGuide, ReachesWhatIsNotWrapped) {
     std::vector<int> values(16, 7);
     Buffer const from(context, Memory::MEMORY_READ_WRITE, false, 64, values.data());

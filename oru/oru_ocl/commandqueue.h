@@ -23,6 +23,14 @@ namespace ORU::OCL {
 /// and, for a write, unchanged until the event is complete. All operations throw
 /// InternalException "table_ != 0" when the layer is not initialised, and ExceptionOCL when the
 /// runtime refuses.
+///
+/// ```cpp
+/// CommandQueue queue(context, device, false, false); // in order, without profiling
+/// kernel.setArg(0, buffer);
+/// kernel.setArg(1, 2.0f);
+/// queue.enqueueKernel(kernel, Range<1>(count), 0, 0);
+/// queue.enqueueBlockingRead(buffer, 0, count * sizeof(float), values.data());
+/// ```
 class ORU_API CommandQueue : public OpenCLObjectWrapper<cl_command_queue> {
 public:
     /// Events to wait for; none by default.
@@ -34,6 +42,7 @@ public:
     CommandQueue(Context const &context, Device const &device, bool outOfOrder, bool profiling);
 
     /// @name Over a handle that was made elsewhere
+    /// The tag tells whose reference the object holds.
     /// @{
     CommandQueue(cl_command_queue handle, take_ref_tag const &tag)
         : OpenCLObjectWrapper(handle, tag) {}

@@ -15,16 +15,19 @@ public:
     /// No sharing.
     explicit ContextProperties(Platform const &platform) : platform_(platform) {}
 
-    Platform const &platform() const { return platform_; }
+    Platform const &platform() const { return platform_; } ///< What the context is made on.
+    /// Takes the context's devices from another platform.
     void setPlatform(Platform const &platform) { platform_ = platform; }
 
     /// The OpenGL rendering context to share objects with, null for none. It must outlive the
     /// OpenCL context and its queues, and is best current on the thread that makes them.
     HGLRC const &sharedRenderContext() const { return sharedRenderContext_; }
+    /// Give its device context too.
     void setSharedRenderContext(HGLRC const &context) { sharedRenderContext_ = context; }
 
     /// The device context of the shared rendering context.
     HDC displayContext() const { return displayContext_; }
+    /// Needed with a rendering context.
     void setDisplayContext(HDC context) { displayContext_ = context; }
 
     /// The properties as clCreateContext takes them: pairs of key and value, then 0. The sharing
@@ -40,6 +43,12 @@ private:
 };
 
 /// A group of devices of one platform with the objects on them, counted by reference.
+///
+/// ```cpp
+/// Platform const platform = platforms().front();
+/// Device const device = platform.devices(Device::TYPE_ALL).front();
+/// Context const context(ContextProperties(platform), device);
+/// ```
 ///
 /// The operations throw InternalException "table_ != 0" when the layer is not initialised, and
 /// ExceptionOCL when the runtime refuses.
@@ -63,6 +72,7 @@ public:
             NotifyCallback const &callback = {});
 
     /// @name Over a handle that was made elsewhere
+    /// The tag tells whose reference the object holds.
     /// @{
     Context(cl_context handle, take_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
     Context(cl_context handle, add_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}

@@ -24,15 +24,20 @@ class ORU_API Device : public OpenCLObjectWrapper<cl_device_id> {
 public:
     /// The CL_DEVICE_TYPE_* bits, combinable.
     enum Type : unsigned int {
-        TYPE_DEFAULT = CL_DEVICE_TYPE_DEFAULT,
-        TYPE_CPU = CL_DEVICE_TYPE_CPU,
-        TYPE_GPU = CL_DEVICE_TYPE_GPU,
-        TYPE_ACCELERATOR = CL_DEVICE_TYPE_ACCELERATOR,
-        TYPE_ALL = CL_DEVICE_TYPE_ALL
+        TYPE_DEFAULT = CL_DEVICE_TYPE_DEFAULT,         ///< the one that the runtime prefers
+        TYPE_CPU = CL_DEVICE_TYPE_CPU,                 ///< the host's processor
+        TYPE_GPU = CL_DEVICE_TYPE_GPU,                 ///< a graphics processor
+        TYPE_ACCELERATOR = CL_DEVICE_TYPE_ACCELERATOR, ///< something else, on a bus
+        TYPE_ALL = CL_DEVICE_TYPE_ALL                  ///< any device
     };
 
+    /// A device of the runtime's, or null for none.
     explicit Device(cl_device_id device) : OpenCLObjectWrapper(device) {}
 
+    /// @name Properties
+    /// clGetDeviceInfo of CL_DEVICE_NAME and so on. `type` has the bits of all types that the
+    /// device is.
+    /// @{
     std::string name() const;
     std::string vendor() const;
 
@@ -43,6 +48,7 @@ public:
     Type type() const;
     bool supportsImages() const;
     Platform platform() const;
+    /// @}
 
     /// Whether the extension's name occurs in `extensions()`, also as a part of another name.
     bool isSupported(Enum::Extension extension) const;

@@ -8,6 +8,7 @@
 #include <string>
 #include <typeinfo>
 
+/// Enumerations of the compute layer: device properties, extensions, profiles.
 namespace ORU::OCL::Enum {
 
 /// A text that stands for the type `T`; equal texts mean equal types.
@@ -17,6 +18,7 @@ std::string const &GetTypeName() {
     return kName;
 }
 
+/// Read as a handle, whatever the headers make of it.
 template<>
 inline std::string const &GetTypeName<cl_platform_id>() {
     static std::string const kName = "cl_platform_id";

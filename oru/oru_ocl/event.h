@@ -17,6 +17,7 @@ class CommandQueue;
 class ORU_API Event : public OpenCLObjectWrapper<cl_event> {
 public:
     /// @name Over a handle that was made elsewhere
+    /// The tag tells whose reference the object holds.
     /// @{
     Event(cl_event handle, take_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
     Event(cl_event handle, add_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}

@@ -57,6 +57,7 @@ public:
 
     /// The extension of exactly this name, `EXTENSION_UNKNOWN` when it is none.
     static Enum::Extension nameToExtensionEnum(char const *name);
+    /// The same.
     static Enum::Extension nameToExtensionEnum(std::string const &name);
 
     /// The extension's name as runtimes list it; empty for a value that is none.

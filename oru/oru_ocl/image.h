@@ -36,9 +36,13 @@ public:
     void getInfo(ImageInfo info, std::size_t size, void *value, std::size_t *sizeReturned) const;
 
 protected:
+    /// @name Over an image's handle
+    /// As the constructors of Memory; whether it is an image the kinds check.
+    /// @{
     explicit Image(cl_mem handle) : Memory(handle) {}
     Image(cl_mem handle, take_ref_tag const &tag) : Memory(handle, tag) {}
     Image(cl_mem handle, add_ref_tag const &tag) : Memory(handle, tag) {}
+    /// @}
 
     /// OpenCL's constant; 0 for a value outside the enumeration.
     static unsigned int ConvertImageInfo(ImageInfo info);
@@ -99,6 +103,10 @@ private:
 /// slice pitch in bytes (clCreateImage3D).
 class ORU_API Image3D : public Image {
 public:
+    /// @name In memory of its own or of the caller's
+    /// Parameters and failures as for the three constructors of Image2D, in the same order: over
+    /// the caller's memory, with a copy of it, and of undefined content.
+    /// @{
     Image3D(Context const &context, MemoryAccessFlags access, cl_image_format format,
             std::size_t width, std::size_t height, std::size_t depth, std::size_t rowPitch,
             std::size_t slicePitch, void *host);
@@ -108,6 +116,7 @@ public:
     Image3D(Context const &context, MemoryAccessFlags access, bool allocHost,
             cl_image_format format, std::size_t width, std::size_t height, std::size_t depth,
             std::size_t rowPitch, std::size_t slicePitch);
+    /// @}
 
     /// Over one level of an OpenGL texture (clCreateFromGLTexture3D).
     Image3D(Context const &context, MemoryAccessFlags access, OGL::Texture3D &texture,

@@ -12,9 +12,17 @@ namespace ORU::OCL {
 
 /// A kernel with its arguments, made by `Program::kernel` and launched by
 /// `CommandQueue::enqueueKernel`. Copies are the same kernel and share the arguments.
+///
+/// ```cpp
+/// Kernel brighten = program.kernel("brighten");
+/// brighten.setArg(0, buffer);
+/// brighten.setArg(1, 2.0f);
+/// brighten.setArg(2, nullptr, 64 * sizeof(float)); // local memory
+/// ```
 class ORU_API Kernel : public OpenCLObjectWrapper<cl_kernel> {
 public:
     /// @name Over a handle that was made elsewhere
+    /// The tag tells whose reference the object holds.
     /// @{
     Kernel(cl_kernel handle, take_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
     Kernel(cl_kernel handle, add_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}

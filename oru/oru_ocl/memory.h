@@ -12,9 +12,9 @@ class ORU_API Memory : public OpenCLObjectWrapper<cl_mem> {
 public:
     /// What kernels may do with it. Any other value leaves it to the runtime (read and write).
     enum MemoryAccessFlags : int {
-        MEMORY_READ_ONLY = 0,
-        MEMORY_WRITE_ONLY = 1,
-        MEMORY_READ_WRITE = 2
+        MEMORY_READ_ONLY = 0,  ///< CL_MEM_READ_ONLY
+        MEMORY_WRITE_ONLY = 1, ///< CL_MEM_WRITE_ONLY
+        MEMORY_READ_WRITE = 2  ///< CL_MEM_READ_WRITE
     };
 
     /// What `getInfo` can ask, with the type of its answer.
@@ -28,17 +28,19 @@ public:
         MEMORYINFO_CONTEXT = 6          ///< cl_context, not retained
     };
 
+    /// What `memType` tells.
     enum MemoryObjectType : int {
-        MEMORYOBJECTTYPE_BUFFER = 0,
-        MEMORYOBJECTTYPE_IMAGE2D = 1,
-        MEMORYOBJECTTYPE_IMAGE3D = 2,
-        MEMORYOBJECTTYPE_OTHER = 3 ///< a type that OpenCL 1.1 does not have
+        MEMORYOBJECTTYPE_BUFFER = 0,  ///< a Buffer
+        MEMORYOBJECTTYPE_IMAGE2D = 1, ///< an Image2D
+        MEMORYOBJECTTYPE_IMAGE3D = 2, ///< an Image3D
+        MEMORYOBJECTTYPE_OTHER = 3    ///< a type that OpenCL 1.1 does not have
     };
 
     /// No memory.
     Memory() = default;
 
     /// @name Over a handle that was made elsewhere
+    /// The tag tells whose reference the object holds.
     /// @{
     Memory(cl_mem handle, take_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
     Memory(cl_mem handle, add_ref_tag const &tag) : OpenCLObjectWrapper(handle, tag) {}
@@ -62,11 +64,14 @@ protected:
     /// @throws InternalException when it is of another type, ExceptionOCL when it is none
     static cl_mem Checked(cl_mem handle, MemoryObjectType type);
 
-    // Translations into OpenCL's constants; 0 for a value outside the enumeration.
+    /// @name Translations into OpenCL's constants
+    /// 0 for a value outside the enumeration.
+    /// @{
     static cl_mem_flags AccessFlags(MemoryAccessFlags access);
     static unsigned int ConvertMemoryInfo(MemoryInfo info);
     /// Called by nobody here; has its place in the binary interface.
     static unsigned int ConvertMemoryObjectType(MemoryObjectType type);
+    /// @}
 
     /// The flags of memory that the runtime allocates, in host memory when `allocHost` is set.
     static cl_mem_flags AllocationFlags(MemoryAccessFlags access, bool allocHost);

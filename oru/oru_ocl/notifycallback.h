@@ -8,11 +8,12 @@ namespace ORU::OCL {
 template<class Function>
 class NotifyCallback {
 public:
+    /// Without a function nothing is called back.
     NotifyCallback(Function notify = nullptr, void *userData = nullptr)
         : pf_notify_(notify), user_data_(userData) {}
 
-    Function pf_notify() const { return pf_notify_; }
-    void *user_data() const { return user_data_; }
+    Function pf_notify() const { return pf_notify_; } ///< The function, or null.
+    void *user_data() const { return user_data_; }    ///< What the function receives last.
 
 private:
     Function pf_notify_;

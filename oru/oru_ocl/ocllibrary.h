@@ -6,6 +6,7 @@
 #include <atomic>
 #include <string>
 
+/// The compute layer: the OpenCL runtime, loaded when it is asked for, and its objects as values.
 namespace ORU::OCL {
 
 /// Loads and unloads the OpenCL runtime.
@@ -50,6 +51,7 @@ private:
 /// Keeps the layer initialised for a scope.
 class ORU_API AutoInitializer {
 public:
+    /// Opens the layer.
     /// @throws what `Library::Initialize` throws
     AutoInitializer();
 

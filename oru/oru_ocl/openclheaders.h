@@ -1,9 +1,9 @@
 // The OpenCL headers: their types and constants, with none of their version notices.
 #pragma once
 
-// The headers print a message when no version is chosen. A host that has chosen one keeps it, since
-// nothing of the layer depends on it.
 #ifndef CL_TARGET_OPENCL_VERSION
+/// The headers print a message when no version is chosen. A host that has chosen one keeps it,
+/// since nothing of the layer depends on it.
 #define CL_TARGET_OPENCL_VERSION 300
 #endif
 

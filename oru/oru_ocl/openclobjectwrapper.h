@@ -12,7 +12,9 @@ namespace ORU::OCL {
 /// @name What becomes of a handle that was made elsewhere
 /// The last argument of the constructors that make an object over such a handle:
 ///
-///     Event written(event, take_ref_tag());
+/// ```cpp
+/// Event written(event, take_ref_tag());
+/// ```
 /// @{
 
 /// The object adds a reference of its own; the caller keeps and releases theirs.
@@ -28,6 +30,7 @@ struct take_ref_tag {};
 /// @throws InternalException "table_ != 0" when the layer is not initialised
 template<class T>
 ORU_API int RetainHandle(T handle);
+/// Counts down; as `RetainHandle`.
 template<class T>
 ORU_API int ReleaseHandle(T handle);
 
@@ -46,7 +49,7 @@ class OpenCLObjectWrapper {
 public:
     /// The handle.
     T const &handle() const { return handle_; }
-    T const &id() const { return handle_; }
+    T const &id() const { return handle_; } ///< The handle.
 
     /// Gives up the handle with its reference, which is the caller's to release now. This object
     /// holds none afterwards: the runtime refuses what it is asked.
@@ -56,6 +59,7 @@ protected:
     /// Takes over the caller's reference.
     explicit OpenCLObjectWrapper(T handle = nullptr) : handle_(handle) {}
 
+    /// Takes over the caller's reference.
     OpenCLObjectWrapper(T handle, take_ref_tag const &) : handle_(handle) {}
 
     /// Adds a reference of its own.
@@ -81,7 +85,9 @@ protected:
     /// Takes over the caller's reference to `handle`, when none is held yet.
     void adopt(T handle) { handle_ = handle; }
 
+    /// Counts the reference up; results and failures as `RetainHandle`.
     int retain() const { return RetainHandle(handle_); }
+    /// Counts the reference down; results and failures as `ReleaseHandle`.
     int release() const { return ReleaseHandle(handle_); }
 
 private:

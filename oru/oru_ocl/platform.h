@@ -14,10 +14,11 @@ namespace ORU::OCL {
 /// null handle. A failing call throws ExceptionOCL.
 class ORU_API Platform : public OpenCLObjectWrapper<cl_platform_id> {
 public:
+    /// A platform of the runtime's, or null for none.
     explicit Platform(cl_platform_id platform) : OpenCLObjectWrapper(platform) {}
 
-    std::string name() const;
-    std::string vendor() const;
+    std::string name() const;   ///< CL_PLATFORM_NAME
+    std::string vendor() const; ///< CL_PLATFORM_VENDOR
 
     /// "OpenCL <major>.<minor> <anything>".
     std::string version() const;
@@ -25,7 +26,7 @@ public:
     /// The extensions' names, separated by blanks.
     std::string extensions() const;
 
-    Enum::Profile profile() const;
+    Enum::Profile profile() const; ///< CL_PLATFORM_PROFILE
 
     /// The devices of a type in the runtime's order (clGetDeviceIDs).
     /// @throws ExceptionOCL CL_DEVICE_NOT_FOUND when there are none

@@ -16,11 +16,12 @@ class ORU_API Program : public OpenCLObjectWrapper<cl_program> {
 public:
     class BinaryArray;
 
+    /// What `buildStatus` tells.
     enum BuildStatus : int {
-        BUILD_STATUS_NONE = 0, ///< never built for the device
-        BUILD_STATUS_ERROR = 1,
-        BUILD_STATUS_SUCCESS = 2,
-        BUILD_STATUS_IN_PROGRESS = 3
+        BUILD_STATUS_NONE = 0,       ///< never built for the device
+        BUILD_STATUS_ERROR = 1,      ///< failed; see `buildLog`
+        BUILD_STATUS_SUCCESS = 2,    ///< kernels can be made
+        BUILD_STATUS_IN_PROGRESS = 3 ///< goes on, see `buildAsync`
     };
 
     /// Called by the runtime when a build has ended; possibly on a thread of the runtime.
@@ -91,6 +92,7 @@ public:
     BinaryArray(std::vector<cl_device_id> const &devices, std::size_t const *sizes,
                 unsigned char const **binaries);
 
+    /// The devices, in the order of the binaries.
     std::vector<cl_device_id> const &devices() const { return devices_; }
 
     /// Number of devices.

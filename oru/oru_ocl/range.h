@@ -41,6 +41,7 @@ public:
         ORU_ASSERT(i < range_.size());
         return range_[i];
     }
+    /// Size `i`, to be written; failures as above.
     std::size_t &operator[](unsigned int i) {
         ORU_ASSERT(i < range_.size());
         return range_[i];
@@ -48,15 +49,19 @@ public:
 
     /// `N`.
     constexpr std::size_t size() const { return N; }
-    constexpr std::size_t dimensions() const { return N; }
+    constexpr std::size_t dimensions() const { return N; } ///< `N`
 
     /// Sets all sizes to `v`.
     void assign(std::size_t const &v) { range_.fill(v); }
 
+    /// @name Iteration
+    /// Over the sizes.
+    /// @{
     std::size_t *begin() { return range_.data(); }
     std::size_t *end() { return range_.data() + N; }
     std::size_t const *begin() const { return range_.data(); }
     std::size_t const *end() const { return range_.data() + N; }
+    /// @}
 
 private:
     template<class... Values>
@@ -75,6 +80,7 @@ bool operator==(Range<N> const &a, Range<N> const &b) {
     return &a == &b || std::equal(a.begin(), a.end(), b.begin());
 }
 
+/// Not `==`.
 template<unsigned int N>
 bool operator!=(Range<N> const &a, Range<N> const &b) {
     return !(a == b);

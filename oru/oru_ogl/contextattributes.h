@@ -7,18 +7,20 @@ namespace ORU::OGL {
 
 /// The profile of a context: with (compatibility) or without (core) what OpenGL 3 deprecated.
 enum OpenGLProfile : unsigned int {
-    OPENGLPROFILE_DEFAULT = 0,
-    OPENGLPROFILE_CORE = 1,
-    OPENGLPROFILE_COMPATIBILITY = 2
+    OPENGLPROFILE_DEFAULT = 0,      ///< the driver chooses
+    OPENGLPROFILE_CORE = 1,         ///< without what OpenGL 3 deprecated
+    OPENGLPROFILE_COMPATIBILITY = 2 ///< with it
 };
 
 /// Version, profile and flags that a host wants of new contexts. What is not set is left to the
 /// driver; with nothing set, contexts are made as if there were no such object.
 ///
-///     ExtensionManager::InitOptions options;
-///     options.setContextAttributes(
-///         ContextAttributes().setVersion(4, 5).setProfile(OPENGLPROFILE_CORE).setDebug());
-///     ExtensionManager::SetInitOptions(options);
+/// ```cpp
+/// ExtensionManager::InitOptions options;
+/// options.setContextAttributes(
+///     ContextAttributes().setVersion(4, 5).setProfile(OPENGLPROFILE_CORE).setDebug());
+/// ExtensionManager::SetInitOptions(options);
+/// ```
 ///
 /// A context that cannot be had so is not made: its constructor throws and says what the driver
 /// refuses. A driver may give a later version than was asked for.
@@ -64,7 +66,9 @@ public:
         return *this;
     }
 
-    /// 0.0 when none is set.
+    /// @name What is set
+    /// The version is 0.0 when none is, the profile OPENGLPROFILE_DEFAULT.
+    /// @{
     unsigned int majorVersion() const { return major_; }
     unsigned int minorVersion() const { return minor_; }
     OpenGLProfile profile() const { return static_cast<OpenGLProfile>(profile_); }
@@ -72,6 +76,7 @@ public:
     bool isRobust() const { return robust_; }
     bool isNoError() const { return noError_; }
     bool isForwardCompatible() const { return forwardCompatible_; }
+    /// @}
 
     /// Whether nothing is set.
     bool isDefault() const {

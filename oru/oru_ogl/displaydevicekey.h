@@ -12,7 +12,8 @@ namespace ORU::OGL {
 /// Contexts carry the key of the device they live on, and contexts of one device share its
 /// capability record. Make keys with `Context::DisplayDevice`.
 struct ORU_API DisplayDeviceKey {
-    DisplayDeviceKey() = default;
+    DisplayDeviceKey() = default; ///< no device
+    /// The members in order.
     DisplayDeviceKey(std::string const &display, std::string const &adapter,
                      std::string const &device)
         : displayName(display), adapterName(adapter), deviceID(device) {}

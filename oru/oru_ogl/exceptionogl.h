@@ -12,6 +12,7 @@ namespace ORU::OGL {
 /// is reported with number 0 and a message that says which.
 class ORU_API ExceptionOGL : public LogicalException {
 public:
+    /// Makes the exception of one call.
     /// @param file, line source position of the failed call
     /// @param message the GL error's name
     /// @param errorNumber the value that `glGetError` gave, 0 when OpenGL was not asked

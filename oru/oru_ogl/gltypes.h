@@ -4,6 +4,9 @@
 // Each type repeats the registry's definition for 64-bit Windows, so that gl.h and glext.h may be
 // included before or after this header, or not at all.
 
+/// @name Types of OpenGL
+/// As the Khronos registry defines them for 64-bit Windows.
+/// @{
 typedef unsigned int GLenum;
 typedef unsigned char GLboolean;
 typedef unsigned int GLbitfield;
@@ -30,6 +33,7 @@ typedef signed long long int GLintptrARB;
 typedef signed long long int GLint64;
 typedef unsigned long long int GLuint64;
 typedef struct __GLsync *GLsync;
+/// @}
 
 /// The calling convention of OpenGL and WGL functions.
 #if defined(_WIN32)

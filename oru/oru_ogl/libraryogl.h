@@ -6,6 +6,7 @@
 
 #include <iosfwd>
 
+/// The OpenGL layer: contexts, the checked calls, and the objects that live in contexts.
 namespace ORU::OGL {
 
 /// Opens and closes a host's use of the OpenGL layer; static members only.
@@ -18,9 +19,12 @@ public:
     /// contexts and records copy are `ExtensionManager::InitOptions`.
     class InitOptions {
     public:
-        bool throwOnNullContext() const { return throwOnNullContext_; }
+        bool throwOnNullContext() const { return throwOnNullContext_; } ///< true unless set
+        /// Nothing acts on it.
         void setThrowOnNullContext(bool value) { throwOnNullContext_ = value; }
+        /// True unless set.
         bool flushOnMakeCurrentMacOnly() const { return flushOnMakeCurrentMacOnly_; }
+        /// Nothing acts on it.
         void setFlushOnMakeCurrentMacOnly(bool value) { flushOnMakeCurrentMacOnly_ = value; }
 
     private:

@@ -28,6 +28,7 @@ FILES = [
     ("CHANGELOG.md", "CHANGELOG.md"),
     ("LICENSE", "LICENSE"),
     ("SECURITY.md", "SECURITY.md"),
+    ("docs/start.md", "docs/start.md"),
     ("docs/guide", "docs/guide"),
     ("docs/images", "docs/images"),
     ("examples", "examples"),

@@ -5,7 +5,9 @@
 
 /// Evaluates an expression; a failure of the library in it gets a note of this place of the source:
 ///
-///     ORU_FROM_HERE(program.link(true));
+/// ```cpp
+/// ORU_FROM_HERE(program.link(true));
+/// ```
 ///
 /// `file()` and `line()` of a failing class operation name the library's own call of OpenGL or
 /// OpenCL; the note, which streaming the exception shows too, names the host's. Nested ones add a

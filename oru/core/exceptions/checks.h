@@ -8,6 +8,7 @@
 // The macros are variadic only so that an expression may hold commas (template arguments). A
 // passing check costs its comparison: what throws is one function, out of line and marked cold.
 
+/// A function that is called on failures only: never inline, and out of the way of the rest.
 #if defined(_MSC_VER)
 #define ORU_COLD __declspec(noinline)
 #else

@@ -7,6 +7,7 @@
 #include <iosfwd>
 #include <string>
 
+/// The library: exceptions, memory, values, regions; OpenGL in `ORU::OGL`, OpenCL in `ORU::OCL`.
 namespace ORU {
 
 /// Root of everything the library throws by itself.

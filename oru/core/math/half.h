@@ -17,7 +17,8 @@ namespace ORU {
 /// `oru/core/math/halfrow.h`.
 class ORU_API half {
 public:
-    half() = default;
+    half() = default; ///< 0
+    /// Rounds as said above; implicit, as from float to double.
     half(float f) : bits_(Convert(f)) {}
 
     half &operator=(float f) {
@@ -36,7 +37,9 @@ public:
     /// The sign bit flipped, also of a zero or a NaN.
     half operator-() const { return FromBits(static_cast<std::uint16_t>(bits_ ^ 0x8000)); }
 
-    // Computed in single precision, then converted.
+    /// @name Arithmetic
+    /// Computed in single precision, then converted.
+    /// @{
     half &operator+=(half other) { return *this = float(*this) + float(other); }
     half &operator-=(half other) { return *this = float(*this) - float(other); }
     half &operator*=(half other) { return *this = float(*this) * float(other); }
@@ -45,27 +48,39 @@ public:
     half &operator-=(float other) { return *this = float(*this) - other; }
     half &operator*=(float other) { return *this = float(*this) * other; }
     half &operator/=(float other) { return *this = float(*this) / other; }
+    /// @}
 
     /// Keeps `n` fraction bits, rounded to nearest with ties away from zero; truncates instead
     /// where rounding would reach infinity.
     half round(unsigned n) const;
 
+    /// @name Classes of IEEE 754
+    /// Finite: neither infinity nor NaN. Normalized: a full fraction, so neither zero nor
+    /// denormalized. Denormalized: below 2^-14 in size and not zero.
+    /// @{
     bool isFinite() const { return exponent() != 31; }
     bool isNormalized() const { return exponent() != 0 && exponent() != 31; }
     bool isDenormalized() const { return exponent() == 0 && fraction() != 0; }
     bool isZero() const { return (bits_ & 0x7FFF) == 0; }
     bool isNan() const { return exponent() == 31 && fraction() != 0; }
     bool isInfinity() const { return (bits_ & 0x7FFF) == 0x7C00; }
+    /// @}
     /// The sign bit; true also for -0 and negative NaNs.
     bool isNegative() const { return (bits_ & 0x8000) != 0; }
 
+    /// @name Special values
+    /// Plus and minus infinity, and a quiet and a signalling NaN (bits 0x7C00, 0xFC00, 0x7FFF and
+    /// 0x7DFF).
+    /// @{
     static half posInf() { return FromBits(0x7C00); }
     static half negInf() { return FromBits(0xFC00); }
     static half qNan() { return FromBits(0x7FFF); }
     static half sNan() { return FromBits(0x7DFF); }
+    /// @}
 
+    /// The 16 bits: sign, 5 of the exponent, 10 of the fraction.
     unsigned short bits() const { return bits_; }
-    void setBits(unsigned short bits) { bits_ = bits; }
+    void setBits(unsigned short bits) { bits_ = bits; } ///< Any bits are a value.
 
 private:
     /// Both tables follow a rule, so they are filled when the library is loaded: that takes a

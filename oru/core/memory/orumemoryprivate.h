@@ -33,6 +33,7 @@ inline bool IsAligned(void const *p, int alignment) {
 
 /// Deleter of smart pointers to aligned image buffers.
 struct ORUImageAlignedDeleter {
+    /// Frees what `NewAlignedMemory` returned for `MEMORYTYPE_IMAGE`; null is ignored.
     void operator()(void *p) const noexcept {
         ORU_private::DeleteAlignedMemory(MEMORYTYPE_IMAGE, p);
     }

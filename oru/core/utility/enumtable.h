@@ -7,23 +7,24 @@
 
 namespace ORU {
 
+/// An enumerator and the constant of the API that it stands for.
 template<class Enumeration, class Constant>
 struct EnumRow {
-    Enumeration value;
-    Constant constant;
+    Enumeration value; ///< of the library
+    Constant constant; ///< of the API
 };
 
 /// Where and with what text a translation fails; `ORU_ENUM_FAILURE` makes one.
 struct EnumFailure {
-    char const *file;
-    int line;
-    char const *text;
+    char const *file; ///< source file that the exception names
+    int line;         ///< source line
+    char const *text; ///< the message
 };
 
 /// One row per enumerator, in the enumeration's order, which starts at 0 and has no gaps.
 template<class Enumeration, class Constant, std::size_t Count>
 struct EnumTable {
-    EnumRow<Enumeration, Constant> rows[Count];
+    EnumRow<Enumeration, Constant> rows[Count]; ///< in order
 
     /// For a static_assert beside the table: each row is where the look-up by value expects it.
     constexpr bool isInOrder() const {

@@ -16,16 +16,19 @@ class ORU_API IntegerRect {
 public:
     /// The empty rectangle at (0, 0).
     IntegerRect() = default;
+    /// At `offset`, which may be negative, `size` pixels large.
     IntegerRect(ambra::lumo::TVec2<int> const &offset, size2 const &size)
         : offset_(offset), size_(size) {}
 
-    ambra::lumo::TVec2<int> offset() const { return offset_; }
-    size2 size() const { return size_; }
-    std::size_t width() const { return size_[0]; }
-    std::size_t height() const { return size_[1]; }
-    bool isEmpty() const { return width() == 0 || height() == 0; }
+    ambra::lumo::TVec2<int> offset() const { return offset_; }     ///< of the top-left corner
+    size2 size() const { return size_; }                           ///< (width, height)
+    std::size_t width() const { return size_[0]; }                 ///< pixels
+    std::size_t height() const { return size_[1]; }                ///< pixels
+    bool isEmpty() const { return width() == 0 || height() == 0; } ///< whether a side is 0
 
+    /// Moves the rectangle; its size stays.
     void setOffset(ambra::lumo::TVec2<int> const &offset) { offset_ = offset; }
+    /// Changes the size; the top-left corner stays.
     void setSize(size2 const &size) { size_ = size; }
 
     /// Moves the rectangle by `d` pixels.
@@ -39,7 +42,9 @@ private:
     size2 size_;
 };
 
+/// Whether offset and size are equal.
 ORU_API bool operator==(IntegerRect const &a, IntegerRect const &b);
+/// Not `==`.
 ORU_API bool operator!=(IntegerRect const &a, IntegerRect const &b);
 
 /// Writes `toString()`.

@@ -10,14 +10,14 @@ namespace ORU {
 
 /// Deleter for smart pointers to objects that something else owns.
 struct NullDeleter {
-    void operator()(void const *) const noexcept {}
+    void operator()(void const *) const noexcept {} ///< does nothing
 };
 
 /// Deleter of objects made with `ORU_NEW`: destroys the object, then frees it through the hooks.
 /// A `T` that is a base class needs a virtual destructor.
 template<class T>
 struct ORUDeleter {
-    constexpr ORUDeleter() noexcept = default;
+    constexpr ORUDeleter() noexcept = default; ///< without state
 
     /// So that an owner of a derived object can become an owner of its base.
     template<class U, class = std::enable_if_t<std::is_convertible_v<U *, T *>>>
@@ -27,6 +27,8 @@ struct ORUDeleter {
                       "deleting through a base needs its virtual destructor");
     }
 
+    /// Destroys and frees the object; null is ignored. In a destructor that throws the process
+    /// ends.
     void operator()(T *p) const noexcept {
         static_assert(sizeof(T) > 0, "the type must be complete where it is deleted");
         static_assert(alignof(T) <= __STDCPP_DEFAULT_NEW_ALIGNMENT__,

@@ -4,6 +4,9 @@
 // Each name repeats the platform's own declaration (with STRICT handles, its default), so that
 // windows.h may be included before or after this header, or not at all.
 
+/// @name Types of Windows
+/// As windows.h declares them.
+/// @{
 typedef int BOOL;
 typedef int INT;
 typedef unsigned int UINT;
@@ -39,3 +42,4 @@ typedef _WGLSWAP WGLSWAP;
 typedef tagLAYERPLANEDESCRIPTOR *LPLAYERPLANEDESCRIPTOR;
 typedef tagPIXELFORMATDESCRIPTOR PIXELFORMATDESCRIPTOR;
 typedef tagPIXELFORMATDESCRIPTOR *LPPIXELFORMATDESCRIPTOR;
+/// @}

@@ -28,28 +28,41 @@ class WGLInterceptorDecorator;
 /// one per rendering context that the host made itself, read at its first call through the
 /// interceptor chain. Ask the current context's record before using a feature:
 ///
-///     if (ExtensionManager::Instance()->isSupported(GL_ARB_PIXEL_BUFFER_OBJECT)) …
+/// ```cpp
+/// if (ExtensionManager::Instance()->isSupported(GL_ARB_PIXEL_BUFFER_OBJECT)) …
+/// ```
 ///
 /// A record does not change once built (but for the two float-filtering answers, which are found
 /// out when first asked), so any thread may read it.
 class ORU_API ExtensionManager {
 public:
     /// Who made the implementation.
-    enum Vendor : unsigned int { VENDOR_OTHER = 0, VENDOR_AMD, VENDOR_NVIDIA, VENDOR_INTEL };
+    enum Vendor : unsigned int {
+        VENDOR_OTHER = 0, ///< none of those below
+        VENDOR_AMD,       ///< GL_VENDOR has "AMD" or "ATI" in it, in letters of either case
+        VENDOR_NVIDIA,    ///< "NVIDIA"
+        VENDOR_INTEL      ///< "INTEL"
+    };
 
     /// The options that each new context and record copies; kept for the host, the layer acts on
     /// none of them. `Library::InitOptions` has the first two for the library as a whole.
     class InitOptions {
     public:
-        bool throwOnNullContext() const { return throwOnNullContext_; }
+        bool throwOnNullContext() const { return throwOnNullContext_; } ///< true unless set
+        /// Kept for the host.
         void setThrowOnNullContext(bool value) { throwOnNullContext_ = value; }
+        /// True unless set.
         bool flushOnMakeCurrentMacOnly() const { return flushOnMakeCurrentMacOnly_; }
+        /// Kept for the host.
         void setFlushOnMakeCurrentMacOnly(bool value) { flushOnMakeCurrentMacOnly_ = value; }
+        /// What Context::openGLProfile tells.
         OpenGLProfile openGLProfile() const { return profile_; }
+        /// Kept for the host; contexts go by their attributes.
         void setOpenGLProfile(OpenGLProfile profile) { profile_ = profile; }
 
         /// What new contexts are asked for, unless their BufferFormat says so.
         ContextAttributes contextAttributes() const { return contextAttributes_; }
+        /// See ContextAttributes.
         void setContextAttributes(ContextAttributes attributes) { contextAttributes_ = attributes; }
 
     private:
@@ -63,6 +76,7 @@ public:
     /// Replaces the default options for a scope.
     class ORU_API ScopedInitOptions {
     public:
+        /// Sets the options until the scope ends.
         explicit ScopedInitOptions(InitOptions const &options);
         ScopedInitOptions(ScopedInitOptions const &) = default;
         ScopedInitOptions &operator=(ScopedInitOptions const &) = default;
@@ -136,6 +150,7 @@ public:
 
     /// The options that new contexts and records copy.
     static InitOptions const &CurrentInitOptions();
+    /// Contexts and records that exist keep theirs.
     static void SetInitOptions(InitOptions const &options);
 
     /// The options this record copied when it was made.
@@ -156,11 +171,12 @@ public:
 
     /// The OpenGL version. Every 4.x above 4.1 is recorded as 4.1, the highest wrapped here.
     unsigned int majorVersion() const { return majorVersion_; }
-    unsigned int minorVersion() const { return minorVersion_; }
+    unsigned int minorVersion() const { return minorVersion_; } ///< of the OpenGL version
 
     /// The version text's third number.
     /// @throws InternalException when it has none
     unsigned int releaseVersion() const;
+    /// Whether the version text has a third number.
     bool hasReleaseVersion() const { return releaseVersion_ != -1; }
 
     /// What follows the numbers in the version text.
@@ -168,9 +184,9 @@ public:
 
     /// The shading-language version, 0.0 when the implementation has none.
     unsigned int glslMajorVersion() const { return glslMajorVersion_; }
-    unsigned int glslMinorVersion() const { return glslMinorVersion_; }
+    unsigned int glslMinorVersion() const { return glslMinorVersion_; } ///< of the shading language
 
-    Vendor vendor() const { return vendor_; }
+    Vendor vendor() const { return vendor_; } ///< Who made it, by GL_VENDOR.
     /// "AMD", "NVIDIA", "INTEL" or "OTHER".
     std::string vendorString() const;
     /// @}
@@ -183,6 +199,7 @@ public:
 
     /// Whether a capability is there with all its entry points.
     bool isSupported(OpenGLExtension e) const { return supported_.count(e) != 0; }
+    /// All capabilities that `isSupported` affirms.
     std::set<OpenGLExtension> const &supportedExtensions() const { return supported_; }
 
     /// Every GL extension that the implementation names, known here or not, then the WGL extensions
@@ -212,14 +229,19 @@ public:
 
     /// @name Capability shortcuts
     /// @{
-    bool supportsClampToEdge() const;
-    bool supportsTexture3D() const;
-    bool supportsMultiTexture() const;
+    bool supportsClampToEdge() const;  ///< WRAPMODE_CLAMP_TO_EDGE: OpenGL 1.2
+    bool supportsTexture3D() const;    ///< OpenGL 1.2 or GL_EXT_texture3D
+    bool supportsMultiTexture() const; ///< OpenGL 1.3 or GL_ARB_multitexture
+    /// Several colours drawn at once: OpenGL 2.0 or GL_ARB_draw_buffers.
     bool supportsDrawBuffers() const;
+    /// GL_ARB_texture_float, GL_ATI_texture_float or GL_APPLE_float_pixels
     bool supportsFloatingPointTextures() const;
+    /// TYPE_HALF_FLOAT in transfers: GL_ARB_half_float_pixel or GL_APPLE_float_pixels
     bool supports16BitFloat() const;
+    /// Pbuffers, not pixel buffer objects: WGL_ARB_pixel_format and WGL_ARB_pbuffer
     bool supportsPixelBuffers() const;
-    bool supportsRenderToTexture() const;
+    bool supportsRenderToTexture() const; ///< Pbuffers as textures: WGL_ARB_render_texture
+    /// The same for rectangles: WGL_NV_render_texture_rectangle
     bool supportsRenderToTextureRectangle() const;
 
     /// Whether textures of any size work. On one vendor's implementations the version does not

@@ -15,6 +15,7 @@ namespace ORU::OGL {
 /// a time.
 class ORU_API OpenGLErrorChecker : public OpenGLInterceptor {
 public:
+    /// The chain makes its own.
     OpenGLErrorChecker() = default;
     ~OpenGLErrorChecker() override;
 

@@ -15,7 +15,9 @@ class OpenGLInterceptorDecorator;
 /// before it. Each operation takes the caller's file and line in front of the GL arguments and
 /// returns what the GL function returns:
 ///
-///     OpenGLInterceptor::Instance()->cgmBindTexture(__FILE__, __LINE__, GL_TEXTURE_2D, name);
+/// ```cpp
+/// OpenGLInterceptor::Instance()->cgmBindTexture(__FILE__, __LINE__, GL_TEXTURE_2D, name);
+/// ```
 ///
 /// The chain is process-wide and not locked: change it while no thread makes GL calls.
 class ORU_API OpenGLInterceptor {
@@ -44,6 +46,7 @@ public:
     OpenGLInterceptorDecorator *popInterceptor();
 
 protected:
+    /// In no chain yet.
     OpenGLInterceptor() = default;
     OpenGLInterceptor(OpenGLInterceptor const &) = default;
     OpenGLInterceptor &operator=(OpenGLInterceptor const &) = default;

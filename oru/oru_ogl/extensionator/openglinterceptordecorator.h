@@ -9,13 +9,15 @@ namespace ORU::OGL {
 /// forwards it to `interceptor()`; derive from OpenGLForwarder to write only those of interest.
 class ORU_API OpenGLInterceptorDecorator : public OpenGLInterceptor {
 public:
+    /// Makes a link that is in no chain yet.
     /// @param next the next link, not owned; pushing the decorator sets it anew
     explicit OpenGLInterceptorDecorator(OpenGLInterceptor *next = nullptr) : next_(next) {}
     ~OpenGLInterceptorDecorator() override;
 
     /// The next link, null while the decorator is in no chain.
     OpenGLInterceptor *interceptor() { return next_; }
-    OpenGLInterceptor const *interceptor() const { return next_; }
+    OpenGLInterceptor const *interceptor() const { return next_; } ///< The next link.
+    /// Called as the decorator is pushed.
     void setInterceptor(OpenGLInterceptor *next) { next_ = next; }
 
 private:

@@ -10,8 +10,10 @@ namespace ORU::OGL {
 /// Writes each OpenGL call with its arguments and the source position of the caller, then forwards
 /// it.
 ///
-///     std::ofstream file("gl.txt");
-///     InterceptorScope<OpenGLTracer> const tracer(file);
+/// ```cpp
+/// std::ofstream file("gl.txt");
+/// InterceptorScope<OpenGLTracer> const tracer(file);
+/// ```
 ///
 /// writes, until the scope ends, lines such as `app.cpp:86: glTexParameteri(GL_TEXTURE_2D,
 /// GL_TEXTURE_MIN_FILTER, 9729)`. The form of an argument follows its type in the OpenGL prototype:
@@ -26,13 +28,18 @@ namespace ORU::OGL {
 /// There is no lock: lines of several threads may mix. A call that throws has been written before.
 class ORU_API OpenGLTracer : public OpenGLInterceptorDecorator {
 public:
+    /// Makes a tracer that is in no chain yet.
     /// @param os   must live as long as the tracer is in the chain
     /// @param next the next link; pushing the tracer sets it anew
     explicit OpenGLTracer(std::ostream &os = std::cout, OpenGLInterceptor *next = nullptr);
     ~OpenGLTracer() override;
 
+    /// @name The stream
+    /// Where lines go; never null, not owned.
+    /// @{
     std::ostream *outputStream() { return stream_; }
     std::ostream const *outputStream() const { return stream_; }
+    /// @}
     /// Replaces the stream from the next call on.
     void setOutputStream(std::ostream &os) { stream_ = &os; }
 

@@ -7,13 +7,13 @@ namespace ORU::OGL {
 
 /// The blending of the current context: switch, factors and equations.
 struct ORU_API BlendState {
-    bool enabled = false;
-    int dstAlpha = 1; ///< blend factors, GL_ONE unless captured
-    int dstRGB = 1;
-    int srcAlpha = 1;
-    int srcRGB = 1;
+    bool enabled = false;       ///< GL_BLEND
+    int dstAlpha = 1;           ///< blend factors, GL_ONE unless captured
+    int dstRGB = 1;             ///< of the destination's colours
+    int srcAlpha = 1;           ///< of the source's alpha
+    int srcRGB = 1;             ///< of the source's colours
     int equationAlpha = 0x8006; ///< blend equations, GL_FUNC_ADD unless captured
-    int equationRGB = 0x8006;
+    int equationRGB = 0x8006;   ///< of the colours
 
     /// Reads all of it from the current context.
     /// @throws InternalException when an OpenGL error is pending afterwards, whatever caused it
@@ -44,6 +44,7 @@ protected:
 /// Blends by the source's alpha for a scope: alpha × source + (1 − alpha) × destination.
 class ORU_API TemporaryAlphaBlendScope : public TemporaryBlendScope {
 public:
+    /// Captures the blending and sets its own.
     /// @throws as BlendState::setToCurrentGLValues
     /// @note glEnable, glBlendFunc, glBlendEquation
     TemporaryAlphaBlendScope();

@@ -12,16 +12,19 @@ namespace ORU::OGL {
 /// `map`, `unmap`, `subData` and `getSubData` act on what is bound to the buffer's target and do
 /// not bind: call `bind()` first.
 ///
-///     Buffer pixels(width * height * 4, Buffer::TYPE_PIXEL_UNPACK_BUFFER,
-///                   Buffer::USAGE_STREAM_DRAW, nullptr);
-///     pixels.bind();
-///     std::memcpy(pixels.map(GL_WRITE_ONLY), source, pixels.size());
-///     pixels.unmap();
-///     Buffer::BindDefaultUnpackBuffer();
+/// ```cpp
+/// Buffer pixels(width * height * 4, Buffer::TYPE_PIXEL_UNPACK_BUFFER,
+///               Buffer::USAGE_STREAM_DRAW, nullptr);
+/// pixels.bind();
+/// std::memcpy(pixels.map(GL_WRITE_ONLY), source, pixels.size());
+/// pixels.unmap();
+/// Buffer::BindDefaultUnpackBuffer();
+/// ```
 ///
 /// OpenGL 2.1, or 1.5 with GL_ARB_vertex_buffer_object and GL_ARB_pixel_buffer_object.
 class ORU_API Buffer : public Object {
 public:
+    /// What the buffer is bound to.
     enum Type : unsigned int {
         TYPE_PIXEL_UNPACK_BUFFER = 0, ///< pixels on their way into a texture
         TYPE_PIXEL_PACK_BUFFER,       ///< pixels on their way out of a texture or framebuffer
@@ -31,15 +34,15 @@ public:
 
     /// How often the store changes, and who reads it.
     enum Usage : unsigned int {
-        USAGE_STREAM_DRAW = 0,
-        USAGE_STREAM_READ,
-        USAGE_STREAM_COPY,
-        USAGE_STATIC_DRAW,
-        USAGE_STATIC_READ,
-        USAGE_STATIC_COPY,
-        USAGE_DYNAMIC_DRAW,
-        USAGE_DYNAMIC_READ,
-        USAGE_DYNAMIC_COPY
+        USAGE_STREAM_DRAW = 0, ///< GL_STREAM_DRAW: filled for each use, read by OpenGL
+        USAGE_STREAM_READ,     ///< GL_STREAM_READ: filled by OpenGL, read by the host once
+        USAGE_STREAM_COPY,     ///< GL_STREAM_COPY
+        USAGE_STATIC_DRAW,     ///< GL_STATIC_DRAW: filled once, used often
+        USAGE_STATIC_READ,     ///< GL_STATIC_READ
+        USAGE_STATIC_COPY,     ///< GL_STATIC_COPY
+        USAGE_DYNAMIC_DRAW,    ///< GL_DYNAMIC_DRAW: changed and used often
+        USAGE_DYNAMIC_READ,    ///< GL_DYNAMIC_READ
+        USAGE_DYNAMIC_COPY     ///< GL_DYNAMIC_COPY
     };
 
     /// Makes a buffer and its store. What was bound to the target stays bound.
@@ -65,6 +68,7 @@ public:
     /// Deletes the buffer that the object owns, which need not be unmapped. @note glDeleteBuffers
     ~Buffer() override;
 
+    /// Binds the buffer to its target.
     /// @note glBindBuffer
     void bind();
 
@@ -96,11 +100,13 @@ public:
     /// @note glMapBuffer
     void *map(unsigned int access);
 
+    /// Ends the mapping; what was written is the store's now.
     /// @throws InternalException when not mapped, or when the system has lost the contents, after
     ///         which the buffer still counts as mapped; ExceptionOGL when OpenGL refuses
     /// @note glUnmapBuffer
     void unmap();
 
+    /// Whether `map()` was called and `unmap()` not yet.
     bool isMapped() const {
         requireObject();
         return mapped_;
@@ -117,16 +123,21 @@ public:
     /// @note glGetBufferSubData
     void getSubData(std::int64_t offset, std::int64_t size, void *data);
 
+    /// @name What the buffer is bound to
+    /// One of them is true.
+    /// @{
     bool isArrayBuffer() const;
     bool isElementArrayBuffer() const;
     bool isPackBuffer() const;
     bool isUnpackBuffer() const;
+    /// @}
 
     /// Size of the store in bytes.
     std::uint64_t size() const {
         requireObject();
         return static_cast<std::uint64_t>(size_);
     }
+    /// As given to the constructor.
     Usage usagePolicy() const {
         requireObject();
         return usagePolicy_;

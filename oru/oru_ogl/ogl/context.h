@@ -19,19 +19,32 @@ namespace ORU::OGL {
 /// one leaves the thread's current context as it was; call `makeCurrent()` to use it. A context is
 /// used on one thread at a time.
 ///
+/// ```cpp
+/// AutoInitializer library;
+/// ContextOffscreen context;        // on the primary display's adapter
+/// context.makeCurrent();
+/// ContextOffscreen second(&context); // shares its objects, for another thread
+/// ```
+///
 /// A context stays where it is, neither copied nor moved: share groups and the registry of contexts
 /// know it by its address. Keep one that is handed on by std::unique_ptr.
 class ORU_API Context {
 public:
-    enum Buffering { BUFFERING_SINGLE = 0, BUFFERING_DOUBLE = 1 };
+    /// Where drawing goes in a window.
+    enum Buffering {
+        BUFFERING_SINGLE = 0, ///< to what is seen, at once
+        BUFFERING_DOUBLE = 1  ///< to a back buffer, which `swapBuffers()` shows
+    };
 
     /// Samples per pixel; any value above 1 asks for a multisampled pixel format.
-    enum Multisampling : int { MULTISAMPLING_NONE = 1 };
+    enum Multisampling : int {
+        MULTISAMPLING_NONE = 1 ///< one sample; `Multisampling(4)` asks for four
+    };
 
     /// What a pixel format must be able to draw to.
     enum Windowing {
         WINDOWING_PBUFFER = 0, ///< a pbuffer and not a window
-        WINDOWING_WINDOW = 1
+        WINDOWING_WINDOW = 1   ///< a window
     };
 
     /// Releases nothing: the derived kinds release what they made.
@@ -48,8 +61,8 @@ public:
     /// The calling thread's current rendering context, or null. @note wglGetCurrentContext
     static HGLRC CurrentContext();
 
-    HGLRC renderContext() const { return renderContext_; }
-    HDC deviceContext() const { return deviceContext_; }
+    HGLRC renderContext() const { return renderContext_; } ///< The context's WGL handle.
+    HDC deviceContext() const { return deviceContext_; }   ///< What it draws to.
 
     /// The display device the context lives on; empty for one made from a bare handle.
     DisplayDeviceKey const &displayDeviceKey() const { return displayDeviceKey_; }
@@ -126,12 +139,13 @@ protected:
 
     /// A rendering context that shares with `share`; where nothing is asked for, of version 3.0 or
     /// later where attributes can be given, else any.
-    /// @param attributes what is asked for; the init options' in the first form
     /// @throws InternalException for a null device context, or when the context cannot be made as
     ///         asked for or cannot share
     /// @note wglCreateContextAttribsARB (WGL_ARB_create_context) or wglCreateContext, wglShareLists
     /// @{
-    HGLRC createRenderingContext(HDC dc, Context const *share);
+    HGLRC createRenderingContext(HDC dc, Context const *share); ///< as the init options ask
+    /// As asked for here.
+    /// @param attributes what is asked for
     HGLRC createRenderingContext(HDC dc, Context const *share, ContextAttributes const &attributes);
     /// @}
 
@@ -155,7 +169,8 @@ protected:
     /// interface.
     /// @throws InternalException when the record cannot be built, or when there is nothing to end
     void registerWithExtensionMgr();
-    void unregisterWithExtensionMgr();
+    void unregisterWithExtensionMgr(); ///< Ends that.
+    /// The options that were in force when the context was made.
     ExtensionManager::InitOptions const &initOptions() const { return initOptions_; }
 
     /// @name Share groups
@@ -210,10 +225,11 @@ private:
     ExtensionManager::InitOptions initOptions_;
 
 protected:
-    HDC deviceContext_ = nullptr;
+    HDC deviceContext_ = nullptr;   ///< what the context draws to
     HGLRC renderContext_ = nullptr; ///< the context is live while this is not null
     int pixelFormat_ = 0;           ///< index set on the device context, 0 until then
 
+    /// For a kind that learns its device late.
     void setDisplayDeviceKey(DisplayDeviceKey const &key) { displayDeviceKey_ = key; }
 };
 

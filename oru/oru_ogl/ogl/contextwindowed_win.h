@@ -10,6 +10,14 @@ namespace ORU::OGL {
 /// It takes a device context of the window and, leaving the window alone from then on, never gives
 /// it back. Give the window's class the style CS_OWNDC: its device contexts are then all the same,
 /// while without it each rendering context made on the window costs one more.
+///
+/// ```cpp
+/// ContextWindowed context(window, BufferFormat::FORMAT_RGBA8, Context::BUFFERING_DOUBLE,
+///                         Context::MULTISAMPLING_NONE, nullptr);
+/// context.makeCurrent();
+/// ORU_GL(Clear, GL_COLOR_BUFFER_BIT);
+/// context.swapBuffers();
+/// ```
 class ORU_API ContextWindowed : public Context {
 public:
     /// Makes a context on the display device that shows the window. A window takes one pixel format
@@ -24,7 +32,7 @@ public:
     /// Deletes the rendering context.
     ~ContextWindowed() override;
 
-    HWND hWnd() const { return window_; }
+    HWND hWnd() const { return window_; } ///< The host's window.
 
     /// Makes swapBuffers of the current context wait for the vertical retrace, or not.
     /// @throws InternalException without WGL_EXT_swap_control

@@ -8,10 +8,16 @@ namespace ORU::OGL {
 /// Adopts a rendering context so that contexts of the library can share with it. Its owner keeps
 /// it, and should destroy this object first.
 ///
+/// ```cpp
+/// ContextWrapped const adopted; // the toolkit's context, which is current
+/// ContextOffscreen worker(&adopted);
+/// ```
+///
 /// Finding the share group makes contexts of the library current for a moment, so they must not be
 /// current on other threads then.
 class ORU_API ContextWrapped : public Context {
 public:
+    /// Adopts a context by its handles.
     /// @param window the window the context draws to, which tells its display device; null to take
     ///        the device of the calling thread's current context
     /// @throws InternalException for a null handle, or when the device cannot be determined
@@ -24,6 +30,7 @@ public:
     /// Leaves the adopted context as it is.
     ~ContextWrapped() override;
 
+    /// Makes the adopted context current on the calling thread.
     /// @throws InternalException "ContextWrapped Object leaked" when the system refuses, as it does
     ///         when the adopted context was destroyed by its owner
     void makeCurrent() const override;

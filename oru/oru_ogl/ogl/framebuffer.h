@@ -11,12 +11,14 @@ class Texture2DArray;
 
 /// One framebuffer object of GL_EXT_framebuffer_object, and what is attached to it.
 ///
-///     Framebuffer framebuffer;
-///     framebuffer.bind();
-///     framebuffer.attach(&texture, 0, 0);
-///     if (framebuffer.statusOkay(nullptr))
-///         … draw …
-///     framebuffer.unbind();
+/// ```cpp
+/// Framebuffer framebuffer;
+/// framebuffer.bind();
+/// framebuffer.attach(&texture, 0, 0);
+/// if (framebuffer.statusOkay(nullptr))
+///     … draw …
+/// framebuffer.unbind();
+/// ```
 ///
 /// Bind the framebuffer before anything is attached, detached or asked, except by the overloads
 /// that take bare GL values. It does not remember what is attached: keep the images alive.
@@ -38,6 +40,7 @@ public:
     /// Deletes the framebuffer that the object owns. @note glDeleteFramebuffersEXT
     ~Framebuffer() override;
 
+    /// Makes this what is drawn into and read from.
     /// @note glBindFramebufferEXT
     void bind();
 
@@ -98,6 +101,7 @@ public:
     /// @note glCheckFramebufferStatusEXT
     bool statusOkay(unsigned int *status) const;
 
+    /// How many colour attachments a framebuffer can have.
     /// @note glGetIntegerv
     static unsigned int MaxColorAttachments();
 

@@ -11,7 +11,7 @@ namespace ORU::OGL {
 
 /// Whether lines are smoothed.
 struct ORU_API LineSmoothState {
-    bool enabled = false;
+    bool enabled = false; ///< GL_LINE_SMOOTH
 
     /// Reads it from the current context. @note glGetBooleanv
     void getLineSmoothState();
@@ -20,10 +20,12 @@ struct ORU_API LineSmoothState {
 /// Smooths lines for a scope.
 class ORU_API TemporaryLineSmoothScope {
 public:
+    /// Captures whether lines are smoothed, and smooths them.
     /// @note glEnable when lines are not smoothed yet
     TemporaryLineSmoothScope();
     TemporaryLineSmoothScope(TemporaryLineSmoothScope const &) = default;
     TemporaryLineSmoothScope &operator=(TemporaryLineSmoothScope const &) = default;
+    /// Smooths lines, or not, as before.
     /// @note glEnable or glDisable
     ~TemporaryLineSmoothScope();
 
@@ -34,7 +36,7 @@ private:
 
 /// How lines are stippled.
 struct ORU_API LineStippleState {
-    bool enabled = false;
+    bool enabled = false;       ///< GL_LINE_STIPPLE
     int factor = 0;             ///< pixels per bit of the pattern
     unsigned short pattern = 0; ///< drawn from the lowest bit on
 
@@ -51,6 +53,7 @@ struct ORU_API LineStippleState {
 /// Stipples lines, or not, for a scope.
 class ORU_API TemporaryLineStippleScope {
 public:
+    /// Captures the stippling and sets another.
     /// @param enable 0 for solid lines; factor and pattern then do not matter
     /// @param factor pixels per bit of the pattern, 1 to 256
     /// @throws InternalException in a core context, which has no stippling
@@ -58,6 +61,7 @@ public:
     TemporaryLineStippleScope(unsigned char enable, int factor, unsigned short pattern);
     TemporaryLineStippleScope(TemporaryLineStippleScope const &) = default;
     TemporaryLineStippleScope &operator=(TemporaryLineStippleScope const &) = default;
+    /// Stipples lines, or not, as before.
     /// @note glEnable and glLineStipple, or glDisable
     ~TemporaryLineStippleScope();
 
@@ -79,11 +83,13 @@ struct ORU_API LineWidthState {
 /// Draws lines of one width for a scope.
 class ORU_API TemporaryLineWidthScope {
 public:
+    /// Captures the width and sets another.
     /// @param width pixels
     /// @note glLineWidth
     explicit TemporaryLineWidthScope(float width);
     TemporaryLineWidthScope(TemporaryLineWidthScope const &) = default;
     TemporaryLineWidthScope &operator=(TemporaryLineWidthScope const &) = default;
+    /// Sets the width as before.
     /// @note glLineWidth
     ~TemporaryLineWidthScope();
 

@@ -36,7 +36,7 @@ public:
         return target_;
     }
 
-    bool isInitialized() const { return objectID_ != 0; }
+    bool isInitialized() const { return objectID_ != 0; } ///< whether there is a name
 
     /// The name of whatever is bound to this object's target.
     /// @throws ExceptionOGL when the context does not know the target
@@ -54,6 +54,7 @@ public:
     unsigned int disown();
 
 protected:
+    /// An object without a name yet.
     /// @param target, targetBinding GL enumeration values of the target and of its binding's query
     Object(unsigned int target, unsigned int targetBinding);
 
@@ -76,7 +77,7 @@ protected:
     /// The object will be bound to another target; no GL call is made.
     void changeTarget(unsigned int target, unsigned int targetBinding);
 
-    unsigned int objectID_ = 0;
+    unsigned int objectID_ = 0; ///< the GL name, which the derived class makes
 
 private:
     [[noreturn]] ORU_COLD static void ThrowEmpty();

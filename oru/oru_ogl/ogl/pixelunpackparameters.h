@@ -12,25 +12,30 @@ namespace ORU::OGL {
 class ORU_API PixelUnpackParameters {
 public:
     /// Rows begin at multiples of 1, 2, 4 or 8 bytes.
-    enum Alignment : unsigned int { ALIGNMENT_1 = 0, ALIGNMENT_2, ALIGNMENT_4, ALIGNMENT_8 };
+    enum Alignment : unsigned int {
+        ALIGNMENT_1 = 0, ///< anywhere
+        ALIGNMENT_2,     ///< every 2 bytes
+        ALIGNMENT_4,     ///< every 4 bytes
+        ALIGNMENT_8      ///< every 8 bytes
+    };
 
     /// Whether the bytes of each component are in the other byte order than the machine's.
     bool swapBytes() const { return swapBytes_; }
-    void enableSwapBytes() { swapBytes_ = true; }
-    void disableSwapBytes() { swapBytes_ = false; }
+    void enableSwapBytes() { swapBytes_ = true; }   ///< GL_UNPACK_SWAP_BYTES
+    void disableSwapBytes() { swapBytes_ = false; } ///< the default
 
     /// Whether the bits of bitmaps begin with each byte's lowest one.
     bool isFirstLSB() const { return firstLSB_; }
-    void makeFirstLSB() { firstLSB_ = true; }
-    void makeFirstMSB() { firstLSB_ = false; }
+    void makeFirstLSB() { firstLSB_ = true; }  ///< GL_UNPACK_LSB_FIRST
+    void makeFirstMSB() { firstLSB_ = false; } ///< the default
 
     /// Pixels in a row of memory; 0 means the width of the upload.
     std::size_t rowLength() const { return rowLength_; }
-    void setRowLength(std::size_t pixels) { rowLength_ = pixels; }
+    void setRowLength(std::size_t pixels) { rowLength_ = pixels; } ///< GL_UNPACK_ROW_LENGTH
 
     /// Rows in an image of memory, for 3-D uploads; 0 means the height of the upload.
     std::size_t imageHeight() const { return imageHeight_; }
-    void setImageHeight(std::size_t rows) { imageHeight_ = rows; }
+    void setImageHeight(std::size_t rows) { imageHeight_ = rows; } ///< GL_UNPACK_IMAGE_HEIGHT
 
     /// @name What lies in memory before the first pixel to upload
     /// In pixels, rows and (for 3-D uploads) images.
@@ -43,9 +48,10 @@ public:
     void setSkipImages(std::size_t images) { skipImages_ = images; }
     /// @}
 
-    Alignment alignment() const { return alignment_; }
-    void setAlignment(Alignment alignment) { alignment_ = alignment; }
+    Alignment alignment() const { return alignment_; }                 ///< ALIGNMENT_1 unless set
+    void setAlignment(Alignment alignment) { alignment_ = alignment; } ///< GL_UNPACK_ALIGNMENT
 
+    /// Sets the alignment by its bytes.
     /// @param bytes 1, 2, 4 or 8
     /// @throws InternalException for any other number
     void setAlignment(unsigned int bytes);

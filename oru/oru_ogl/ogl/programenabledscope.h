@@ -13,6 +13,7 @@ public:
     /// Holds no program until `enable`.
     ProgramEnabledScope() = default;
 
+    /// Makes a program current.
     /// @param program a linked program that outlives the scope
     /// @throws InternalException for null or a program that is not linked
     /// @note glUseProgram
@@ -20,9 +21,11 @@ public:
     ProgramEnabledScope(ProgramEnabledScope const &) = default;
     ProgramEnabledScope &operator=(ProgramEnabledScope const &) = default;
 
+    /// Makes no program current.
     /// @note glUseProgram
     ~ProgramEnabledScope();
 
+    /// Makes a program current, in a scope that has none.
     /// @param program as the constructor's
     /// @throws InternalException also when the scope holds a program already
     void enable(Program *program);

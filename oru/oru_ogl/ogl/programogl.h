@@ -14,18 +14,21 @@ class Shader;
 
 /// A program object: attach shaders, link, enable, set uniforms, draw.
 ///
-///     Program program;
-///     program.loadVertexShader(1, &vertexSource, nullptr);
-///     program.loadFragmentShader(1, &fragmentSource, nullptr);
-///     program.link(true);
-///     program.enable();
-///     program.setUniform("gain", 0.5f);
+/// ```cpp
+/// Program program;
+/// program.loadVertexShader(1, &vertexSource, nullptr);
+/// program.loadFragmentShader(1, &fragmentSource, nullptr);
+/// program.link(true);
+/// program.enable();
+/// program.setUniform("gain", 0.5f);
+/// ```
 ///
 /// Made, used and destroyed while its context, or one that shares with it, is current. It owns its
 /// OpenGL program and moves; every member of a moved-from program throws InternalException. OpenGL
 /// 2.0.
 class ORU_API Program {
 public:
+    /// Makes a program without shaders.
     /// @throws InternalException when the current context has no programs
     /// @note glCreateProgram
     Program();
@@ -60,26 +63,30 @@ public:
     /// @note glAttachShader
     void attach(Shader *shader);
 
+    /// Detaches a shader; what is linked stays.
     /// @note glDetachShader
     void detach(Shader const *shader);
 
+    /// Detaches every shader of whatever type.
     /// @note glGetAttachedShaders, glDetachShader
     void detachAllShaders();
 
     /// Detaches up to 256 shaders of the type. @note glGetAttachedShaders, glDetachShader
     void detachAllVertexShaders();
-    void detachAllFragmentShaders();
+    void detachAllFragmentShaders(); ///< As for vertex shaders.
 
     /// Makes a shader from a source, compiles and attaches it. A failed compilation shows when the
     /// program is linked, and in `compileLogs`.
     /// @param count, strings, lengths as Shader::load
     void loadVertexShader(unsigned int count, char const *const *strings, int const *lengths);
+    /// As `loadVertexShader`.
     void loadFragmentShader(unsigned int count, char const *const *strings, int const *lengths);
     /// @}
 
     /// @name Linking and use
     /// @{
 
+    /// Links the attached shaders.
     /// @param throwOnFailure whether a failed link throws rather than waits to be asked for; then a
     ///        driver's note that the program will "run in software" throws too
     /// @throws InternalException whose message holds the linker's log, and whose note what
@@ -111,6 +118,7 @@ public:
     /// @note glGetProgramiv
     int getInfoLogLength() const;
 
+    /// What the linker said.
     /// @param maxLength bytes of the buffer
     /// @param buffer receives the log, cut to fit, and a final zero
     /// @note glGetProgramInfoLog
@@ -127,6 +135,7 @@ public:
     /// Takes effect when the program is linked next. @note glBindAttribLocation
     void setAttributeLocation(unsigned int index, char const *name);
 
+    /// Where the linked program takes an attribute.
     /// @return -1 when the linked program does not use the attribute
     /// @note glGetAttribLocation
     int getAttributeLocation(char const *name);
@@ -135,6 +144,7 @@ public:
     /// @name Uniform queries
     /// @{
 
+    /// How many uniforms the linked program uses.
     /// @throws InternalException when not linked
     /// @note glGetProgramiv
     unsigned int getActiveUniformCount() const;
@@ -144,6 +154,7 @@ public:
     /// @note glGetProgramiv
     int getMaxUniformStringLength() const;
 
+    /// What is known of a uniform.
     /// @param bufSize bytes of `name`
     /// @param size receives the number of array elements, 1 for others
     /// @param type receives the GL type

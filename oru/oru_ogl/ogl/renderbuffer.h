@@ -30,19 +30,23 @@ public:
     /// Deletes the renderbuffer that the object owns. @note glDeleteRenderbuffersEXT
     ~Renderbuffer() override;
 
+    /// The GL internal format.
     unsigned int format() const {
         requireObject();
         return format_;
     }
+    /// Pixels in a row.
     int width() const {
         requireObject();
         return width_;
     }
+    /// Rows.
     int height() const {
         requireObject();
         return height_;
     }
 
+    /// Makes this the bound renderbuffer.
     /// @note glBindRenderbufferEXT
     void bind();
 

@@ -10,6 +10,7 @@ namespace ORU::OGL {
 /// While both are still current then, it makes no WGL call.
 class ORU_API ScopedContextWrapper {
 public:
+    /// Remembers what is current.
     /// @param restore kept for the host; the destructor restores in any case
     explicit ScopedContextWrapper(bool restore = true);
 

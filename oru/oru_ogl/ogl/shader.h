@@ -17,15 +17,17 @@ class ShaderImpl;
 /// OpenGL shader and moves; every member of a moved-from shader throws InternalException.
 class ORU_API Shader {
 public:
+    /// The stage that the shader is for.
     enum ShaderType {
-        SHADERTYPE_FRAGMENT = 0,
-        SHADERTYPE_VERTEX = 1,
-        SHADERTYPE_TESSELLATION_CONTROL = 2,
-        SHADERTYPE_TESSELLATION_EVALUATION = 3,
-        SHADERTYPE_GEOMETRY = 4,
-        SHADERTYPE_COMPUTE = 5 ///< known by name, supported nowhere
+        SHADERTYPE_FRAGMENT = 0,                ///< GL_FRAGMENT_SHADER
+        SHADERTYPE_VERTEX = 1,                  ///< GL_VERTEX_SHADER
+        SHADERTYPE_TESSELLATION_CONTROL = 2,    ///< GL_TESS_CONTROL_SHADER
+        SHADERTYPE_TESSELLATION_EVALUATION = 3, ///< GL_TESS_EVALUATION_SHADER
+        SHADERTYPE_GEOMETRY = 4,                ///< GL_GEOMETRY_SHADER
+        SHADERTYPE_COMPUTE = 5                  ///< known by name, supported nowhere
     };
 
+    /// Makes a shader without a source.
     /// @throws InternalException when the current context does not support the type
     /// @note glCreateShader
     explicit Shader(ShaderType type);
@@ -58,11 +60,14 @@ public:
     ///        when all of them do
     /// @note glShaderSource
     void load(unsigned int count, char const *const *strings, int const *lengths);
+    /// Replaces the source.
+    /// @note glShaderSource
     void load(std::string const &source);
 
     /// Whether there is a source that is not empty. @note glGetShaderiv
     bool isLoaded() const;
 
+    /// Compiles the source.
     /// @param throwOnFailure whether a failed compilation throws rather than waits to be asked for
     /// @throws InternalException whose message holds the compiler's log
     /// @note glCompileShader
@@ -75,6 +80,7 @@ public:
     /// @note glGetShaderiv
     int getInfoLogLength() const;
 
+    /// What the compiler said.
     /// @param maxLength bytes of the buffer
     /// @param buffer receives the log, cut to fit, and a final zero
     /// @note glGetShaderInfoLog
@@ -88,36 +94,51 @@ private:
     ScopedPtr<ShaderImpl> actualShader_;
 };
 
-// A class per type; their constructors throw as Shader's does.
-
+/// Computes the colour of each fragment. OpenGL 2.0.
 class ORU_API FragmentShader : public Shader {
 public:
+    /// Makes a shader without a source.
+    /// @throws InternalException as Shader's constructor
     FragmentShader() : Shader(SHADERTYPE_FRAGMENT) {}
 };
 
+/// Computes the place of each vertex. OpenGL 2.0.
 class ORU_API VertexShader : public Shader {
 public:
+    /// Makes a shader without a source.
+    /// @throws InternalException as Shader's constructor
     VertexShader() : Shader(SHADERTYPE_VERTEX) {}
 };
 
+/// Says how finely a patch is divided. GL_ARB_tessellation_shader.
 class ORU_API TessellationControlShader : public Shader {
 public:
+    /// Makes a shader without a source.
+    /// @throws InternalException as Shader's constructor
     TessellationControlShader() : Shader(SHADERTYPE_TESSELLATION_CONTROL) {}
 };
 
+/// Computes the vertices of a divided patch. GL_ARB_tessellation_shader.
 class ORU_API TessellationEvaluationShader : public Shader {
 public:
+    /// Makes a shader without a source.
+    /// @throws InternalException as Shader's constructor
     TessellationEvaluationShader() : Shader(SHADERTYPE_TESSELLATION_EVALUATION) {}
 };
 
+/// Makes primitives of a primitive. OpenGL 3.2.
 class ORU_API GeometryShader : public Shader {
 public:
+    /// Makes a shader without a source.
+    /// @throws InternalException as Shader's constructor
     GeometryShader() : Shader(SHADERTYPE_GEOMETRY) {}
 };
 
 /// Always throws: no context supports compute shaders here.
 class ORU_API ComputeShader : public Shader {
 public:
+    /// There is none to be made.
+    /// @throws InternalException always
     ComputeShader() : Shader(SHADERTYPE_COMPUTE) {}
 };
 

@@ -25,165 +25,165 @@ class ORU_API Texture : public Object {
 public:
     /// What a texture is bound to.
     enum Target : unsigned int {
-        TARGET_TEXTURE_1D = 0,
-        TARGET_TEXTURE_2D,
-        TARGET_TEXTURE_3D,
-        TARGET_TEXTURE_1D_ARRAY,
-        TARGET_TEXTURE_2D_ARRAY,
-        TARGET_TEXTURE_RECTANGLE
+        TARGET_TEXTURE_1D = 0,   ///< GL_TEXTURE_1D
+        TARGET_TEXTURE_2D,       ///< GL_TEXTURE_2D
+        TARGET_TEXTURE_3D,       ///< GL_TEXTURE_3D
+        TARGET_TEXTURE_1D_ARRAY, ///< GL_TEXTURE_1D_ARRAY
+        TARGET_TEXTURE_2D_ARRAY, ///< GL_TEXTURE_2D_ARRAY
+        TARGET_TEXTURE_RECTANGLE ///< GL_TEXTURE_RECTANGLE
     };
 
     /// The query for what is bound to the target of the same value.
     enum TargetBinding : unsigned int {
-        TARGETBINDING_TEXTURE_BINDING_1D = 0,
-        TARGETBINDING_TEXTURE_BINDING_2D,
-        TARGETBINDING_TEXTURE_BINDING_3D,
-        TARGETBINDING_TEXTURE_BINDING_1D_ARRAY,
-        TARGETBINDING_TEXTURE_BINDING_2D_ARRAY,
-        TARGETBINDING_TEXTURE_BINDING_RECTANGLE
+        TARGETBINDING_TEXTURE_BINDING_1D = 0,   ///< GL_TEXTURE_BINDING_1D
+        TARGETBINDING_TEXTURE_BINDING_2D,       ///< GL_TEXTURE_BINDING_2D
+        TARGETBINDING_TEXTURE_BINDING_3D,       ///< GL_TEXTURE_BINDING_3D
+        TARGETBINDING_TEXTURE_BINDING_1D_ARRAY, ///< GL_TEXTURE_BINDING_1D_ARRAY
+        TARGETBINDING_TEXTURE_BINDING_2D_ARRAY, ///< GL_TEXTURE_BINDING_2D_ARRAY
+        TARGETBINDING_TEXTURE_BINDING_RECTANGLE ///< GL_TEXTURE_BINDING_RECTANGLE
     };
 
     /// How the implementation keeps the texels.
     enum InternalFormat : unsigned int {
-        INTERNALFORMAT_ALPHA = 0,
-        INTERNALFORMAT_ALPHA4,
-        INTERNALFORMAT_ALPHA8,
-        INTERNALFORMAT_ALPHA12,
-        INTERNALFORMAT_ALPHA16,
-        INTERNALFORMAT_LUMINANCE,
-        INTERNALFORMAT_LUMINANCE4,
-        INTERNALFORMAT_LUMINANCE8,
-        INTERNALFORMAT_LUMINANCE12,
-        INTERNALFORMAT_LUMINANCE16,
-        INTERNALFORMAT_LUMINANCE_ALPHA,
-        INTERNALFORMAT_LUMINANCE4_ALPHA4,
-        INTERNALFORMAT_LUMINANCE6_ALPHA2,
-        INTERNALFORMAT_LUMINANCE8_ALPHA8,
-        INTERNALFORMAT_LUMINANCE12_ALPHA4,
-        INTERNALFORMAT_LUMINANCE12_ALPHA12,
-        INTERNALFORMAT_LUMINANCE16_ALPHA16,
-        INTERNALFORMAT_INTENSITY,
-        INTERNALFORMAT_INTENSITY4,
-        INTERNALFORMAT_INTENSITY8,
-        INTERNALFORMAT_INTENSITY12,
-        INTERNALFORMAT_INTENSITY16,
-        INTERNALFORMAT_R3_G3_B2,
-        INTERNALFORMAT_RED,
-        INTERNALFORMAT_R16,
-        INTERNALFORMAT_R16F,
-        INTERNALFORMAT_R32F,
-        INTERNALFORMAT_RG,
-        INTERNALFORMAT_RG16,
-        INTERNALFORMAT_RG16F,
-        INTERNALFORMAT_RG32F,
-        INTERNALFORMAT_RGB,
-        INTERNALFORMAT_RGB4,
-        INTERNALFORMAT_RGB5,
-        INTERNALFORMAT_RGB8,
-        INTERNALFORMAT_RGB10,
-        INTERNALFORMAT_RGB12,
-        INTERNALFORMAT_RGB16,
-        INTERNALFORMAT_RGBA,
-        INTERNALFORMAT_RGBA2,
-        INTERNALFORMAT_RGBA4,
-        INTERNALFORMAT_RGB5_A1,
-        INTERNALFORMAT_RGBA8,
-        INTERNALFORMAT_RGB10_A2,
-        INTERNALFORMAT_RGBA12,
-        INTERNALFORMAT_RGBA16,
-        INTERNALFORMAT_RGBA32F_ARB,
-        INTERNALFORMAT_RGB32F_ARB,
-        INTERNALFORMAT_ALPHA32F_ARB,
-        INTERNALFORMAT_INTENSITY32F_ARB,
-        INTERNALFORMAT_LUMINANCE32F_ARB,
-        INTERNALFORMAT_LUMINANCE_ALPHA32F_ARB,
-        INTERNALFORMAT_RGBA16F_ARB,
-        INTERNALFORMAT_RGB16F_ARB,
-        INTERNALFORMAT_ALPHA16F_ARB,
-        INTERNALFORMAT_INTENSITY16F_ARB,
-        INTERNALFORMAT_LUMINANCE16F_ARB,
-        INTERNALFORMAT_LUMINANCE_ALPHA16F_ARB
+        INTERNALFORMAT_ALPHA = 0,              ///< GL_ALPHA
+        INTERNALFORMAT_ALPHA4,                 ///< GL_ALPHA4
+        INTERNALFORMAT_ALPHA8,                 ///< GL_ALPHA8
+        INTERNALFORMAT_ALPHA12,                ///< GL_ALPHA12
+        INTERNALFORMAT_ALPHA16,                ///< GL_ALPHA16
+        INTERNALFORMAT_LUMINANCE,              ///< GL_LUMINANCE
+        INTERNALFORMAT_LUMINANCE4,             ///< GL_LUMINANCE4
+        INTERNALFORMAT_LUMINANCE8,             ///< GL_LUMINANCE8
+        INTERNALFORMAT_LUMINANCE12,            ///< GL_LUMINANCE12
+        INTERNALFORMAT_LUMINANCE16,            ///< GL_LUMINANCE16
+        INTERNALFORMAT_LUMINANCE_ALPHA,        ///< GL_LUMINANCE_ALPHA
+        INTERNALFORMAT_LUMINANCE4_ALPHA4,      ///< GL_LUMINANCE4_ALPHA4
+        INTERNALFORMAT_LUMINANCE6_ALPHA2,      ///< GL_LUMINANCE6_ALPHA2
+        INTERNALFORMAT_LUMINANCE8_ALPHA8,      ///< GL_LUMINANCE8_ALPHA8
+        INTERNALFORMAT_LUMINANCE12_ALPHA4,     ///< GL_LUMINANCE12_ALPHA4
+        INTERNALFORMAT_LUMINANCE12_ALPHA12,    ///< GL_LUMINANCE12_ALPHA12
+        INTERNALFORMAT_LUMINANCE16_ALPHA16,    ///< GL_LUMINANCE16_ALPHA16
+        INTERNALFORMAT_INTENSITY,              ///< GL_INTENSITY
+        INTERNALFORMAT_INTENSITY4,             ///< GL_INTENSITY4
+        INTERNALFORMAT_INTENSITY8,             ///< GL_INTENSITY8
+        INTERNALFORMAT_INTENSITY12,            ///< GL_INTENSITY12
+        INTERNALFORMAT_INTENSITY16,            ///< GL_INTENSITY16
+        INTERNALFORMAT_R3_G3_B2,               ///< GL_R3_G3_B2
+        INTERNALFORMAT_RED,                    ///< GL_RED
+        INTERNALFORMAT_R16,                    ///< GL_R16
+        INTERNALFORMAT_R16F,                   ///< GL_R16F
+        INTERNALFORMAT_R32F,                   ///< GL_R32F
+        INTERNALFORMAT_RG,                     ///< GL_RG
+        INTERNALFORMAT_RG16,                   ///< GL_RG16
+        INTERNALFORMAT_RG16F,                  ///< GL_RG16F
+        INTERNALFORMAT_RG32F,                  ///< GL_RG32F
+        INTERNALFORMAT_RGB,                    ///< GL_RGB
+        INTERNALFORMAT_RGB4,                   ///< GL_RGB4
+        INTERNALFORMAT_RGB5,                   ///< GL_RGB5
+        INTERNALFORMAT_RGB8,                   ///< GL_RGB8
+        INTERNALFORMAT_RGB10,                  ///< GL_RGB10
+        INTERNALFORMAT_RGB12,                  ///< GL_RGB12
+        INTERNALFORMAT_RGB16,                  ///< GL_RGB16
+        INTERNALFORMAT_RGBA,                   ///< GL_RGBA
+        INTERNALFORMAT_RGBA2,                  ///< GL_RGBA2
+        INTERNALFORMAT_RGBA4,                  ///< GL_RGBA4
+        INTERNALFORMAT_RGB5_A1,                ///< GL_RGB5_A1
+        INTERNALFORMAT_RGBA8,                  ///< GL_RGBA8
+        INTERNALFORMAT_RGB10_A2,               ///< GL_RGB10_A2
+        INTERNALFORMAT_RGBA12,                 ///< GL_RGBA12
+        INTERNALFORMAT_RGBA16,                 ///< GL_RGBA16
+        INTERNALFORMAT_RGBA32F_ARB,            ///< GL_RGBA32F_ARB
+        INTERNALFORMAT_RGB32F_ARB,             ///< GL_RGB32F_ARB
+        INTERNALFORMAT_ALPHA32F_ARB,           ///< GL_ALPHA32F_ARB
+        INTERNALFORMAT_INTENSITY32F_ARB,       ///< GL_INTENSITY32F_ARB
+        INTERNALFORMAT_LUMINANCE32F_ARB,       ///< GL_LUMINANCE32F_ARB
+        INTERNALFORMAT_LUMINANCE_ALPHA32F_ARB, ///< GL_LUMINANCE_ALPHA32F_ARB
+        INTERNALFORMAT_RGBA16F_ARB,            ///< GL_RGBA16F_ARB
+        INTERNALFORMAT_RGB16F_ARB,             ///< GL_RGB16F_ARB
+        INTERNALFORMAT_ALPHA16F_ARB,           ///< GL_ALPHA16F_ARB
+        INTERNALFORMAT_INTENSITY16F_ARB,       ///< GL_INTENSITY16F_ARB
+        INTERNALFORMAT_LUMINANCE16F_ARB,       ///< GL_LUMINANCE16F_ARB
+        INTERNALFORMAT_LUMINANCE_ALPHA16F_ARB  ///< GL_LUMINANCE_ALPHA16F_ARB
     };
 
     /// The components of a pixel in the caller's memory.
     enum Format : unsigned int {
-        FORMAT_COLOR_INDEX = 0,
-        FORMAT_RED,
-        FORMAT_GREEN,
-        FORMAT_BLUE,
-        FORMAT_ALPHA,
-        FORMAT_RG,
-        FORMAT_RGB,
-        FORMAT_BGR,
-        FORMAT_RGBA,
-        FORMAT_BGRA,
-        FORMAT_LUMINANCE,
-        FORMAT_LUMINANCE_ALPHA
+        FORMAT_COLOR_INDEX = 0, ///< GL_COLOR_INDEX
+        FORMAT_RED,             ///< GL_RED
+        FORMAT_GREEN,           ///< GL_GREEN
+        FORMAT_BLUE,            ///< GL_BLUE
+        FORMAT_ALPHA,           ///< GL_ALPHA
+        FORMAT_RG,              ///< GL_RG
+        FORMAT_RGB,             ///< GL_RGB
+        FORMAT_BGR,             ///< GL_BGR
+        FORMAT_RGBA,            ///< GL_RGBA
+        FORMAT_BGRA,            ///< GL_BGRA
+        FORMAT_LUMINANCE,       ///< GL_LUMINANCE
+        FORMAT_LUMINANCE_ALPHA  ///< GL_LUMINANCE_ALPHA
     };
 
     /// The component type of a pixel in the caller's memory.
     enum Type : unsigned int {
-        TYPE_UNSIGNED_BYTE = 0,
-        TYPE_BYTE,
-        TYPE_BITMAP,
-        TYPE_UNSIGNED_SHORT,
-        TYPE_SHORT,
-        TYPE_UNSIGNED_INT,
-        TYPE_INT,
-        TYPE_FLOAT,
-        TYPE_UNSIGNED_BYTE_3_3_2,
-        TYPE_UNSIGNED_BYTE_2_3_3_REV,
-        TYPE_UNSIGNED_SHORT_5_6_5,
-        TYPE_UNSIGNED_SHORT_5_6_5_REV,
-        TYPE_UNSIGNED_SHORT_4_4_4_4,
-        TYPE_UNSIGNED_SHORT_4_4_4_4_REV,
-        TYPE_UNSIGNED_SHORT_5_5_5_1,
-        TYPE_UNSIGNED_SHORT_1_5_5_5_REV,
-        TYPE_UNSIGNED_INT_8_8_8_8,
-        TYPE_UNSIGNED_INT_8_8_8_8_REV,
-        TYPE_UNSIGNED_INT_10_10_10_2,
-        TYPE_UNSIGNED_INT_2_10_10_10_REV,
-        TYPE_HALF_FLOAT,
-        TYPE_NONE = 0xFFFFFFFFu ///< where a constructor accepts it: no type is given
+        TYPE_UNSIGNED_BYTE = 0,           ///< GL_UNSIGNED_BYTE
+        TYPE_BYTE,                        ///< GL_BYTE
+        TYPE_BITMAP,                      ///< GL_BITMAP
+        TYPE_UNSIGNED_SHORT,              ///< GL_UNSIGNED_SHORT
+        TYPE_SHORT,                       ///< GL_SHORT
+        TYPE_UNSIGNED_INT,                ///< GL_UNSIGNED_INT
+        TYPE_INT,                         ///< GL_INT
+        TYPE_FLOAT,                       ///< GL_FLOAT
+        TYPE_UNSIGNED_BYTE_3_3_2,         ///< GL_UNSIGNED_BYTE_3_3_2
+        TYPE_UNSIGNED_BYTE_2_3_3_REV,     ///< GL_UNSIGNED_BYTE_2_3_3_REV
+        TYPE_UNSIGNED_SHORT_5_6_5,        ///< GL_UNSIGNED_SHORT_5_6_5
+        TYPE_UNSIGNED_SHORT_5_6_5_REV,    ///< GL_UNSIGNED_SHORT_5_6_5_REV
+        TYPE_UNSIGNED_SHORT_4_4_4_4,      ///< GL_UNSIGNED_SHORT_4_4_4_4
+        TYPE_UNSIGNED_SHORT_4_4_4_4_REV,  ///< GL_UNSIGNED_SHORT_4_4_4_4_REV
+        TYPE_UNSIGNED_SHORT_5_5_5_1,      ///< GL_UNSIGNED_SHORT_5_5_5_1
+        TYPE_UNSIGNED_SHORT_1_5_5_5_REV,  ///< GL_UNSIGNED_SHORT_1_5_5_5_REV
+        TYPE_UNSIGNED_INT_8_8_8_8,        ///< GL_UNSIGNED_INT_8_8_8_8
+        TYPE_UNSIGNED_INT_8_8_8_8_REV,    ///< GL_UNSIGNED_INT_8_8_8_8_REV
+        TYPE_UNSIGNED_INT_10_10_10_2,     ///< GL_UNSIGNED_INT_10_10_10_2
+        TYPE_UNSIGNED_INT_2_10_10_10_REV, ///< GL_UNSIGNED_INT_2_10_10_10_REV
+        TYPE_HALF_FLOAT,                  ///< GL_HALF_FLOAT
+        TYPE_NONE = 0xFFFFFFFFu           ///< where a constructor accepts it: no type is given
     };
 
     /// How texels are combined for a fragment.
     enum Filter : unsigned int {
-        FILTER_NEAREST = 0,
-        FILTER_LINEAR,
-        FILTER_NEAREST_MIPMAP_NEAREST,
-        FILTER_LINEAR_MIPMAP_NEAREST,
-        FILTER_NEAREST_MIPMAP_LINEAR,
-        FILTER_LINEAR_MIPMAP_LINEAR
+        FILTER_NEAREST = 0,            ///< GL_NEAREST
+        FILTER_LINEAR,                 ///< GL_LINEAR
+        FILTER_NEAREST_MIPMAP_NEAREST, ///< GL_NEAREST_MIPMAP_NEAREST
+        FILTER_LINEAR_MIPMAP_NEAREST,  ///< GL_LINEAR_MIPMAP_NEAREST
+        FILTER_NEAREST_MIPMAP_LINEAR,  ///< GL_NEAREST_MIPMAP_LINEAR
+        FILTER_LINEAR_MIPMAP_LINEAR    ///< GL_LINEAR_MIPMAP_LINEAR
     };
 
     /// What lies outside the texture.
     enum WrapMode : unsigned int {
-        WRAPMODE_CLAMP = 0,
-        WRAPMODE_CLAMP_TO_BORDER,
-        WRAPMODE_CLAMP_TO_EDGE,
-        WRAPMODE_MIRRORED_REPEAT,
-        WRAPMODE_REPEAT
+        WRAPMODE_CLAMP = 0,       ///< GL_CLAMP
+        WRAPMODE_CLAMP_TO_BORDER, ///< GL_CLAMP_TO_BORDER
+        WRAPMODE_CLAMP_TO_EDGE,   ///< GL_CLAMP_TO_EDGE
+        WRAPMODE_MIRRORED_REPEAT, ///< GL_MIRRORED_REPEAT
+        WRAPMODE_REPEAT           ///< GL_REPEAT
     };
 
     /// The parameters of glPixelStore.
     enum PixelStoreMode : unsigned int {
-        PIXELSTOREMODE_PACK_SWAP_BYTES = 0,
-        PIXELSTOREMODE_PACK_LSB_FIRST,
-        PIXELSTOREMODE_PACK_ROW_LENGTH,
-        PIXELSTOREMODE_PACK_IMAGE_HEIGHT,
-        PIXELSTOREMODE_PACK_SKIP_PIXELS,
-        PIXELSTOREMODE_PACK_SKIP_ROWS,
-        PIXELSTOREMODE_PACK_SKIP_IMAGES,
-        PIXELSTOREMODE_PACK_ALIGNMENT,
-        PIXELSTOREMODE_UNPACK_SWAP_BYTES,
-        PIXELSTOREMODE_UNPACK_LSB_FIRST,
-        PIXELSTOREMODE_UNPACK_ROW_LENGTH,
-        PIXELSTOREMODE_UNPACK_IMAGE_HEIGHT,
-        PIXELSTOREMODE_UNPACK_SKIP_PIXELS,
-        PIXELSTOREMODE_UNPACK_SKIP_ROWS,
-        PIXELSTOREMODE_UNPACK_SKIP_IMAGES,
-        PIXELSTOREMODE_UNPACK_ALIGNMENT
+        PIXELSTOREMODE_PACK_SWAP_BYTES = 0, ///< GL_PACK_SWAP_BYTES
+        PIXELSTOREMODE_PACK_LSB_FIRST,      ///< GL_PACK_LSB_FIRST
+        PIXELSTOREMODE_PACK_ROW_LENGTH,     ///< GL_PACK_ROW_LENGTH
+        PIXELSTOREMODE_PACK_IMAGE_HEIGHT,   ///< GL_PACK_IMAGE_HEIGHT
+        PIXELSTOREMODE_PACK_SKIP_PIXELS,    ///< GL_PACK_SKIP_PIXELS
+        PIXELSTOREMODE_PACK_SKIP_ROWS,      ///< GL_PACK_SKIP_ROWS
+        PIXELSTOREMODE_PACK_SKIP_IMAGES,    ///< GL_PACK_SKIP_IMAGES
+        PIXELSTOREMODE_PACK_ALIGNMENT,      ///< GL_PACK_ALIGNMENT
+        PIXELSTOREMODE_UNPACK_SWAP_BYTES,   ///< GL_UNPACK_SWAP_BYTES
+        PIXELSTOREMODE_UNPACK_LSB_FIRST,    ///< GL_UNPACK_LSB_FIRST
+        PIXELSTOREMODE_UNPACK_ROW_LENGTH,   ///< GL_UNPACK_ROW_LENGTH
+        PIXELSTOREMODE_UNPACK_IMAGE_HEIGHT, ///< GL_UNPACK_IMAGE_HEIGHT
+        PIXELSTOREMODE_UNPACK_SKIP_PIXELS,  ///< GL_UNPACK_SKIP_PIXELS
+        PIXELSTOREMODE_UNPACK_SKIP_ROWS,    ///< GL_UNPACK_SKIP_ROWS
+        PIXELSTOREMODE_UNPACK_SKIP_IMAGES,  ///< GL_UNPACK_SKIP_IMAGES
+        PIXELSTOREMODE_UNPACK_ALIGNMENT     ///< GL_UNPACK_ALIGNMENT
     };
 
     Texture(Texture &&other) noexcept = default;
@@ -192,6 +192,7 @@ public:
     /// Deletes the texture that the object owns. @note glDeleteTextures
     ~Texture() override;
 
+    /// How the implementation keeps the texels.
     InternalFormat format() const {
         requireObject();
         return format_;
@@ -218,9 +219,11 @@ public:
     /// @name Parameters of the texture bound to the target
     /// @{
 
+    /// How texels are combined where the texture is drawn smaller and larger.
     /// @note glTexParameteri
     void setFilter(Filter minification, Filter magnification);
 
+    /// The colour beyond the edges with WRAPMODE_CLAMP_TO_BORDER.
     /// @param rgba four components
     /// @note glTexParameterfv
     void setBorderColor(float const *rgba);
@@ -240,6 +243,7 @@ public:
     /// Channels of a format. @throws InternalException for INTERNALFORMAT_RGB4, and for a number
     /// that is no format
     static std::size_t Channels(InternalFormat format);
+    /// Channels of a pixel in memory. @throws InternalException for a number that is no format
     static std::size_t Channels(Format format);
 
     /// Bytes of an image without gaps: channels x bytes of a channel x width x height x depth.

@@ -14,6 +14,7 @@ public:
     Texture1 &operator=(Texture1 &&other) noexcept = default;
     ~Texture1() override;
 
+    /// What lies beyond the edges.
     /// @note glTexParameteri
     void setWrap(WrapMode s);
 
@@ -59,6 +60,7 @@ public:
     std::size_t pixelDataSize(int level, Format format, Type type) const;
 
 protected:
+    /// Makes the texture and its storage.
     /// @throws InternalException for a size that is no power of two where that is needed,
     ///         ExceptionOGL when OpenGL refuses size or format
     /// @note glTexImage1D
@@ -75,6 +77,7 @@ private:
 /// GL_TEXTURE_1D.
 class ORU_API Texture1D : public Texture1 {
 public:
+    /// Makes the texture and its storage.
     /// @param width texels of level 0
     /// @param mipmapped whether the levels down to one texel are allocated too
     Texture1D(InternalFormat format, std::uint64_t width, bool mipmapped);

@@ -21,15 +21,12 @@ public:
         return clientStorage_;
     }
 
+    /// What lies beyond the edges: across by `s`, down by `t`.
     /// @throws InternalException when the texture is not bound
     /// @note glGetIntegerv, glTexParameteri
     void setWrap(WrapMode s, WrapMode t);
 
     /// Uploads a rectangle of texels from memory.
-    ///
-    ///     texture.subImage(0, 0, 0, width, height, Texture::FORMAT_RGBA,
-    ///                      Texture::TYPE_UNSIGNED_BYTE, pixels, PixelUnpackParameters());
-    ///
     /// @param level mip level, at least 0; the size is compared with level 0 whatever it is
     /// @param x, y first texel to write
     /// @param width, height texels, at least 1
@@ -75,6 +72,7 @@ public:
     std::size_t pixelDataSize(int level, Format format, Type type) const;
 
 protected:
+    /// Makes the texture and its storage.
     /// @param clientStorage pixels that the texture is made over and that outlive it, or null
     /// @param type of the components at `clientStorage`; TYPE_NONE means unsigned bytes
     /// @throws InternalException for a size that is no power of two where that is needed, and for
@@ -96,8 +94,17 @@ private:
 };
 
 /// GL_TEXTURE_2D.
+///
+/// ```cpp
+/// Texture2D texture(Texture::INTERNALFORMAT_RGBA8, width, height, false);
+/// TextureUnit::Unit(0)->bind(&texture); // on the active unit
+/// texture.setFilter(Texture::FILTER_LINEAR, Texture::FILTER_LINEAR);
+/// texture.subImage(0, 0, 0, width, height, Texture::FORMAT_RGBA,
+///                  Texture::TYPE_UNSIGNED_BYTE, pixels, PixelUnpackParameters());
+/// ```
 class ORU_API Texture2D : public Texture2 {
 public:
+    /// Makes the texture and its storage.
     /// @param width, height texels of level 0
     /// @param mipmapped whether the levels down to one texel are allocated too
     /// @param clientStorage, type see Texture2
@@ -111,12 +118,14 @@ public:
     /// @note glIsTexture, glBindTexture, glGetTexLevelParameteriv
     Texture2D(unsigned int name, ownership_tag ownership);
 
+    /// Always true.
     static bool IsSupported() { return true; }
 };
 
 /// GL_TEXTURE_RECTANGLE: sampled by texel coordinates, without mipmaps.
 class ORU_API TextureRECT : public Texture2 {
 public:
+    /// Makes the texture and its storage.
     /// @param clientStorage, type see Texture2
     TextureRECT(InternalFormat format, std::uint64_t width, std::uint64_t height,
                 void *clientStorage = nullptr, Type type = TYPE_NONE);
@@ -131,6 +140,10 @@ public:
 /// GL_TEXTURE_1D_ARRAY: `height(0)` layers of one row each, as many on every mip level.
 class ORU_API Texture1DArray : public Texture2 {
 public:
+    /// Makes the texture and its storage.
+    /// @param width, layers texels of level 0, and how many rows
+    /// @param mipmapped whether the levels down to one texel are allocated too
+    /// @throws as Texture2, and ExceptionOGL where the context has no array textures
     Texture1DArray(InternalFormat format, std::uint64_t width, std::uint64_t layers,
                    bool mipmapped);
 

@@ -15,6 +15,7 @@ public:
     Texture3 &operator=(Texture3 &&other) noexcept = default;
     ~Texture3() override;
 
+    /// What lies beyond the edges: across by `s`, down by `t`, deep by `r`.
     /// @note glTexParameteri
     void setWrap(WrapMode s, WrapMode t, WrapMode r);
 
@@ -65,6 +66,7 @@ public:
     std::size_t pixelDataSize(int level, Format format, Type type) const;
 
 protected:
+    /// Makes the texture and its storage.
     /// @throws InternalException for a size that is no power of two where that is needed, and
     ///         before OpenGL 1.2; ExceptionOGL when OpenGL refuses size or format
     /// @note glTexImage3D
@@ -89,6 +91,7 @@ private:
 /// GL_TEXTURE_3D.
 class ORU_API Texture3D : public Texture3 {
 public:
+    /// Makes the texture and its storage.
     /// @param width, height, depth texels of level 0
     /// @param mipmapped whether the levels down to one texel are allocated too
     Texture3D(InternalFormat format, std::uint64_t width, std::uint64_t height, std::uint64_t depth,
@@ -102,12 +105,17 @@ public:
     /// As Texture2D's.
     Texture3D(unsigned int name, ownership_tag ownership);
 
+    /// Always true.
     static bool IsSupported() { return true; }
 };
 
 /// GL_TEXTURE_2D_ARRAY: `depth(level)` layers on every mip level.
 class ORU_API Texture2DArray : public Texture3 {
 public:
+    /// Makes the texture and its storage.
+    /// @param width, height, layers texels of level 0, and how many images
+    /// @param mipmapped whether the levels down to one texel are allocated too
+    /// @throws as Texture3, and ExceptionOGL where the context has no array textures
     Texture2DArray(InternalFormat format, std::uint64_t width, std::uint64_t height,
                    std::uint64_t layers, bool mipmapped);
 

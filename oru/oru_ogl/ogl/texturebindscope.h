@@ -13,6 +13,7 @@ class Texture2D;
 /// no fixed-function drawing: there the scope binds the texture for a shader.
 class ORU_API Texture2DBindScope {
 public:
+    /// Binds the texture, if active.
     /// @param texture may be null in a scope that is not active
     /// @param unit index of a texture unit
     /// @param active whether the scope does anything

@@ -4,11 +4,13 @@
 #include "oru/core/utility/export.h"
 
 namespace ORU::OGL {
+/// The active texture unit, and what textures of the current context can be.
 namespace TextureState {
 
 /// Index of the active unit, counted from 0. @note glGetIntegerv; needs OpenGL 1.3
 ORU_API unsigned int ActiveTextureUnit();
 
+/// Makes a unit the active one.
 /// @throws ExceptionOGL for an index beyond the context's units
 /// @note glActiveTexture; needs OpenGL 1.3
 ORU_API void SetActiveTextureUnit(unsigned int index);

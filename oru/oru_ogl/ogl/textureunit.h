@@ -13,18 +13,20 @@ class TextureRECT;
 
 /// One texture unit. Its members act on whichever unit is active; make this one active first:
 ///
-///     TextureState::SetActiveTextureUnit(1);
-///     TextureUnit::Unit(1)->bind(&texture);
+/// ```cpp
+/// TextureState::SetActiveTextureUnit(1);
+/// TextureUnit::Unit(1)->bind(&texture);
+/// ```
 class ORU_API TextureUnit {
 public:
     /// How a fragment's colour and its texel are combined.
     enum Environment : unsigned int {
-        ENVIRONMENT_ADD = 0,
-        ENVIRONMENT_BLEND,
-        ENVIRONMENT_COMBINE,
-        ENVIRONMENT_DECAL,
-        ENVIRONMENT_MODULATE,
-        ENVIRONMENT_REPLACE
+        ENVIRONMENT_ADD = 0,  ///< GL_ADD
+        ENVIRONMENT_BLEND,    ///< GL_BLEND
+        ENVIRONMENT_COMBINE,  ///< GL_COMBINE
+        ENVIRONMENT_DECAL,    ///< GL_DECAL
+        ENVIRONMENT_MODULATE, ///< GL_MODULATE
+        ENVIRONMENT_REPLACE   ///< GL_REPLACE
     };
 
     /// The handle of a unit, which lives as long as the process.
@@ -72,6 +74,7 @@ public:
     bool isEnabledRECT() const;
     /// @}
 
+    /// How fragments and texels are combined in fixed-function drawing.
     /// @throws InternalException in a core context, which has no fixed-function texturing
     /// @note glTexEnvi
     void setEnv(Environment environment) const;

@@ -14,13 +14,15 @@ class Program;
 /// Vertices as named float attributes: a copy in memory, and once prepared the OpenGL objects that
 /// feed a program from it.
 ///
-///     VertexBuffer triangle({{"position", VertexBuffer::ATTRIBUTETYPE_FLOAT2,
-///                             VertexBuffer::EXPECTEDUSAGE_STATIC_DRAW}},
-///                           3, VertexBuffer::PRIMITIVETYPE_TRIANGLES);
-///     triangle.setField("position", bytes, false, 0, 0);
-///     triangle.setupWithProgram(&program);
-///     triangle.marshallData();
-///     triangle.drawPrimitives();
+/// ```cpp
+/// VertexBuffer triangle({{"position", VertexBuffer::ATTRIBUTETYPE_FLOAT2,
+///                         VertexBuffer::EXPECTEDUSAGE_STATIC_DRAW}},
+///                       3, VertexBuffer::PRIMITIVETYPE_TRIANGLES);
+/// triangle.setField("position", bytes, false, 0, 0);
+/// triangle.setupWithProgram(&program);
+/// triangle.marshallData();
+/// triangle.drawPrimitives();
+/// ```
 ///
 /// A copy has the vertices and no OpenGL objects: set it up with a program before drawing. Moving
 /// takes the objects along. Quadrilaterals and polygons need a compatibility context. OpenGL 3.0,
@@ -29,54 +31,55 @@ class ORU_API VertexBuffer {
 public:
     /// Components of an attribute.
     enum AttributeType : unsigned int {
-        ATTRIBUTETYPE_FLOAT = 1,
-        ATTRIBUTETYPE_FLOAT2 = 2,
-        ATTRIBUTETYPE_FLOAT3 = 3,
-        ATTRIBUTETYPE_FLOAT4 = 4
+        ATTRIBUTETYPE_FLOAT = 1,  ///< one component
+        ATTRIBUTETYPE_FLOAT2 = 2, ///< two, vec2 in the shader
+        ATTRIBUTETYPE_FLOAT3 = 3, ///< three, vec3
+        ATTRIBUTETYPE_FLOAT4 = 4  ///< four, vec4
     };
 
     /// How often an attribute changes, and who reads it; the values are OpenGL's.
     enum ExpectedUsage : unsigned int {
-        EXPECTEDUSAGE_STREAM_DRAW = 0x88E0,
-        EXPECTEDUSAGE_STREAM_READ = 0x88E1,
-        EXPECTEDUSAGE_STREAM_COPY = 0x88E2,
-        EXPECTEDUSAGE_STATIC_DRAW = 0x88E4,
-        EXPECTEDUSAGE_STATIC_READ = 0x88E5,
-        EXPECTEDUSAGE_STATIC_COPY = 0x88E6,
-        EXPECTEDUSAGE_DYNAMIC_DRAW = 0x88E8,
-        EXPECTEDUSAGE_DYNAMIC_READ = 0x88E9,
-        EXPECTEDUSAGE_DYNAMIC_COPY = 0x88EA
+        EXPECTEDUSAGE_STREAM_DRAW = 0x88E0,  ///< GL_STREAM_DRAW
+        EXPECTEDUSAGE_STREAM_READ = 0x88E1,  ///< GL_STREAM_READ
+        EXPECTEDUSAGE_STREAM_COPY = 0x88E2,  ///< GL_STREAM_COPY
+        EXPECTEDUSAGE_STATIC_DRAW = 0x88E4,  ///< GL_STATIC_DRAW
+        EXPECTEDUSAGE_STATIC_READ = 0x88E5,  ///< GL_STATIC_READ
+        EXPECTEDUSAGE_STATIC_COPY = 0x88E6,  ///< GL_STATIC_COPY
+        EXPECTEDUSAGE_DYNAMIC_DRAW = 0x88E8, ///< GL_DYNAMIC_DRAW
+        EXPECTEDUSAGE_DYNAMIC_READ = 0x88E9, ///< GL_DYNAMIC_READ
+        EXPECTEDUSAGE_DYNAMIC_COPY = 0x88EA  ///< GL_DYNAMIC_COPY
     };
 
     /// What the vertices make up; the values are OpenGL's.
     enum PrimitiveType : unsigned int {
-        PRIMITIVETYPE_POINTS = 0,
-        PRIMITIVETYPE_LINES = 1,
-        PRIMITIVETYPE_LINE_LOOP = 2,
-        PRIMITIVETYPE_LINE_STRIP = 3,
-        PRIMITIVETYPE_TRIANGLES = 4,
-        PRIMITIVETYPE_TRIANGLE_STRIP = 5,
-        PRIMITIVETYPE_TRIANGLE_FAN = 6,
-        PRIMITIVETYPE_QUADS = 7,
-        PRIMITIVETYPE_QUAD_STRIP = 8,
-        PRIMITIVETYPE_POLYGON = 9,
-        PRIMITIVETYPE_LINES_ADJACENCY = 10,
-        PRIMITIVETYPE_LINE_STRIP_ADJACENCY = 11,
-        PRIMITIVETYPE_TRIANGLES_ADJACENCY = 12,
-        PRIMITIVETYPE_TRIANGLE_STRIP_ADJACENCY = 13,
-        PRIMITIVETYPE_PATCHES = 14
+        PRIMITIVETYPE_POINTS = 0,                    ///< GL_POINTS
+        PRIMITIVETYPE_LINES = 1,                     ///< GL_LINES
+        PRIMITIVETYPE_LINE_LOOP = 2,                 ///< GL_LINE_LOOP
+        PRIMITIVETYPE_LINE_STRIP = 3,                ///< GL_LINE_STRIP
+        PRIMITIVETYPE_TRIANGLES = 4,                 ///< GL_TRIANGLES
+        PRIMITIVETYPE_TRIANGLE_STRIP = 5,            ///< GL_TRIANGLE_STRIP
+        PRIMITIVETYPE_TRIANGLE_FAN = 6,              ///< GL_TRIANGLE_FAN
+        PRIMITIVETYPE_QUADS = 7,                     ///< GL_QUADS
+        PRIMITIVETYPE_QUAD_STRIP = 8,                ///< GL_QUAD_STRIP
+        PRIMITIVETYPE_POLYGON = 9,                   ///< GL_POLYGON
+        PRIMITIVETYPE_LINES_ADJACENCY = 10,          ///< GL_LINES_ADJACENCY
+        PRIMITIVETYPE_LINE_STRIP_ADJACENCY = 11,     ///< GL_LINE_STRIP_ADJACENCY
+        PRIMITIVETYPE_TRIANGLES_ADJACENCY = 12,      ///< GL_TRIANGLES_ADJACENCY
+        PRIMITIVETYPE_TRIANGLE_STRIP_ADJACENCY = 13, ///< GL_TRIANGLE_STRIP_ADJACENCY
+        PRIMITIVETYPE_PATCHES = 14                   ///< GL_PATCHES
     };
 
     /// One attribute of the layout.
     class ORU_API Field {
     public:
+        /// Names an attribute.
         /// @param name the attribute's name in the shader
         /// @throws InternalException for a type that is none of the four
         Field(std::string const &name, AttributeType type, ExpectedUsage usage);
 
-        AttributeType type() const { return type_; }
-        std::string const &name() const { return name_; }
-        ExpectedUsage usage() const { return usage_; }
+        AttributeType type() const { return type_; }      ///< Components.
+        std::string const &name() const { return name_; } ///< As in the shader.
+        ExpectedUsage usage() const { return usage_; }    ///< A hint for OpenGL.
 
         /// Bytes of the attribute in one vertex.
         unsigned int byteSize() const { return byteSize_; }
@@ -96,6 +99,7 @@ public:
     /// No vertices.
     VertexBuffer() = default;
 
+    /// Makes room for the vertices in memory; no OpenGL call is made.
     /// @param vertexCount number of vertices, which are zeros until `setField`
     VertexBuffer(std::vector<Field> const &fields, unsigned int vertexCount,
                  PrimitiveType primitiveType);
@@ -103,12 +107,13 @@ public:
     VertexBuffer(VertexBuffer &&other) noexcept;
     VertexBuffer &operator=(VertexBuffer other) noexcept;
 
+    /// Deletes the OpenGL objects.
     /// @note glDeleteBuffers, glDeleteVertexArrays
     ~VertexBuffer();
 
     /// Number of vertices.
     unsigned int vertexCount() const { return vertexCount_; }
-    PrimitiveType primitiveType() const { return primitiveType_; }
+    PrimitiveType primitiveType() const { return primitiveType_; } ///< What `drawPrimitives` draws.
 
     /// Copies one attribute's values into the buffer's memory; `marshallData` sends them on.
     /// @param data floats of the field's type, as bytes
@@ -119,6 +124,7 @@ public:
     void setField(std::string const &name, unsigned char const *data, bool ignoreMissingFields,
                   unsigned int stride, std::size_t count);
 
+    /// As above, by the field's place.
     /// @param index position of the field in the layout, which must exist
     void setField(unsigned int index, unsigned char const *data, unsigned int stride,
                   std::size_t count);
@@ -130,6 +136,7 @@ public:
     /// @note glGenVertexArrays, glGenBuffers, glGetAttribLocation
     void setupWithProgram(unsigned int programID);
 
+    /// The same for a program of the library's.
     /// @throws InternalException also for null
     void setupWithProgram(Program *program);
 
@@ -139,12 +146,12 @@ public:
     /// @note glBindVertexArray, glBindBuffer, glBufferData, glVertexAttribPointer,
     ///       glEnableVertexAttribArray
     void marshallData() { marshallData(vertexCount_); }
-    void marshallData(std::size_t count);
+    void marshallData(std::size_t count); ///< as `marshallData()`
 
     /// Draws the first `count` vertices with the current program, and leaves no vertex array bound.
     /// @note glBindVertexArray, glDrawArrays
     void drawPrimitives() { drawPrimitives(vertexCount_); }
-    void drawPrimitives(std::size_t count);
+    void drawPrimitives(std::size_t count); ///< as `drawPrimitives()`
 
 private:
     void setup() { prepareDeviceSideResources(); }

@@ -28,12 +28,14 @@ public:
     /// Everywhere.
     static BoundingRect InfinitePlane();
 
+    /// The lower bounds; above `maximum()` when the rectangle is empty.
     ambra::lumo::TVec2<float> const &minimum() const { return minimum_; }
+    /// The upper bounds, which belong to the rectangle.
     ambra::lumo::TVec2<float> const &maximum() const { return maximum_; }
 
     /// Negative for some empty rectangles, as is `height()`.
     float width() const { return maximum_.x - minimum_.x; }
-    float height() const { return maximum_.y - minimum_.y; }
+    float height() const { return maximum_.y - minimum_.y; } ///< as `width()`
 
     /// Width times height; 0 for an empty rectangle, a line or a point.
     float area() const;
@@ -88,6 +90,7 @@ private:
 
 /// Whether all four bounds are equal; a rectangle that holds a NaN is unequal to itself.
 ORU_API bool operator==(BoundingRect const &a, BoundingRect const &b);
+/// Not `==`.
 ORU_API bool operator!=(BoundingRect const &a, BoundingRect const &b);
 
 } // namespace ORU

@@ -11,6 +11,14 @@ namespace ORU {
 /// A handle that is nowhere owns nothing: it allocates, through the memory hooks, when it first
 /// becomes more than that, and frees when it becomes nowhere or dies. An operation of a handle
 /// throws `std::bad_alloc` when memory for its region is exhausted.
+///
+/// ```cpp
+/// BoundingRegion changed({10, 10}, {20, 15}); // a stroke of the brush
+/// changed.include(BoundingRegion({40, 10}, {42, 12}));
+/// changed.dilate(BoundingRect({-3, -3}, {3, 3})); // a blur of radius 3 spreads it
+/// changed.intersect(BoundingRect({0, 0}, {width, height}));
+/// BoundingRect const dirty = changed.boundingRect(); // has to be computed anew
+/// ```
 class ORU_API BoundingRegion : public BoundingRegionBase {
 public:
     /// Nowhere.
@@ -60,6 +68,7 @@ private:
 
 /// Whether both are empty, or each contains the other.
 ORU_API bool operator==(BoundingRegion const &a, BoundingRegion const &b);
+/// Not `==`.
 ORU_API bool operator!=(BoundingRegion const &a, BoundingRegion const &b);
 
 } // namespace ORU

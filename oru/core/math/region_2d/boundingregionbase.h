@@ -33,10 +33,10 @@ public:
     /// @throws std::bad_alloc when memory is exhausted
     virtual BoundingRegionBase *clone() const = 0;
 
-    virtual bool isEmpty() const = 0;
+    virtual bool isEmpty() const = 0; ///< Whether the region has no point, as nowhere has none.
 
-    virtual void makeNowhere() = 0;
-    virtual void makeEverywhere() = 0;
+    virtual void makeNowhere() = 0;    ///< Becomes empty.
+    virtual void makeEverywhere() = 0; ///< Becomes the whole plane.
 
     /// Grows to contain `region` as well (union).
     virtual void include(BoundingRegionBase const &region) = 0;
@@ -89,7 +89,7 @@ public:
     virtual std::string toString() const = 0;
 
 protected:
-    // Copied only as part of a whole region, never by its base alone.
+    /// Copied only as part of a whole region, never by its base alone.
     BoundingRegionBase() = default;
     BoundingRegionBase(BoundingRegionBase const &) = default;
     BoundingRegionBase &operator=(BoundingRegionBase const &) = default;

@@ -37,6 +37,7 @@ public:
     WGLInterceptorDecorator *popInterceptor();
 
 protected:
+    /// In no chain yet.
     WGLInterceptor() = default;
     WGLInterceptor(WGLInterceptor const &) = default;
     WGLInterceptor &operator=(WGLInterceptor const &) = default;
@@ -52,13 +53,15 @@ private:
 /// forwards it to `interceptor()`; derive from WGLForwarder to write only those of interest.
 class ORU_API WGLInterceptorDecorator : public WGLInterceptor {
 public:
+    /// Makes a link that is in no chain yet.
     /// @param next the next link, not owned; pushing the decorator sets it anew
     explicit WGLInterceptorDecorator(WGLInterceptor *next = nullptr) : next_(next) {}
     virtual ~WGLInterceptorDecorator();
 
     /// The next link, null while the decorator is in no chain.
     WGLInterceptor *interceptor() { return next_; }
-    WGLInterceptor const *interceptor() const { return next_; }
+    WGLInterceptor const *interceptor() const { return next_; } ///< The next link.
+    /// Called as the decorator is pushed.
     void setInterceptor(WGLInterceptor *next) { next_ = next; }
 
 private:
@@ -69,6 +72,7 @@ private:
 /// nothing, whatever the name says, which hosts know: WGL reports failures by its results.
 class ORU_API WGLErrorChecker : public WGLInterceptor {
 public:
+    /// The chain makes its own.
     WGLErrorChecker() = default;
 
 #define ORU_WGL_OPERATION(Result, Name, Parameters, Arguments)                                     \
