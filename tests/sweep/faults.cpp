@@ -1,4 +1,5 @@
-// The hooks: oru.dll's imports and what it asks for by name lead to stubs, which know their entry point.
+// The hooks: oru.dll's imports and what it asks for by name lead to stubs, which know their entry
+// point.
 #include "tests/sweep/faults.h"
 
 #include "oru/oru_ogl/platformgl.h"
@@ -28,6 +29,8 @@ Kind gKind = Kind::Call;
 unsigned gFailing = 0;
 unsigned gCount = 0;
 char gFailedName[64] = "";
+bool gIsEnding = false;
+bool gFailedAtEnd = false;
 GLenum gPendingError = GL_NO_ERROR;
 Holdings gHoldings;
 
@@ -36,6 +39,7 @@ bool IsTheOne(Kind kind, char const *name) {
     if (!gIsArmed || gKind != kind || ::GetCurrentThreadId() != gThread || ++gCount != gFailing)
         return false;
     std::strncpy(gFailedName, name, sizeof gFailedName - 1);
+    gFailedAtEnd = gIsEnding;
     return true;
 }
 
@@ -43,31 +47,51 @@ bool Begins(std::string const &name, char const *prefix) {
     return name.rfind(prefix, 0) == 0;
 }
 
-/// Which argument of an OpenCL entry point that returns an object takes the error code; 0 for others.
+/// Which argument of an OpenCL entry point that returns an object takes the error code; 0 for
+/// others.
 unsigned ErrorArgument(std::string const &name) {
     static std::unordered_map<std::string, unsigned> const kArguments = {
-        {"clCreateContext", 6}, {"clCreateContextFromType", 5}, {"clCreateCommandQueue", 4},
-        {"clCreateBuffer", 5}, {"clCreateSubBuffer", 5}, {"clCreateImage2D", 8},
-        {"clCreateImage3D", 10}, {"clCreateSampler", 5}, {"clCreateProgramWithSource", 5},
-        {"clCreateProgramWithBinary", 7}, {"clCreateKernel", 3}, {"clCreateUserEvent", 2},
-        {"clCreateFromGLBuffer", 4}, {"clCreateFromGLTexture2D", 6}, {"clCreateFromGLTexture3D", 6},
-        {"clCreateFromGLRenderbuffer", 4}, {"clEnqueueMapBuffer", 10}, {"clEnqueueMapImage", 12}};
+        {"clCreateContext", 6},
+        {"clCreateContextFromType", 5},
+        {"clCreateCommandQueue", 4},
+        {"clCreateBuffer", 5},
+        {"clCreateSubBuffer", 5},
+        {"clCreateImage2D", 8},
+        {"clCreateImage3D", 10},
+        {"clCreateSampler", 5},
+        {"clCreateProgramWithSource", 5},
+        {"clCreateProgramWithBinary", 7},
+        {"clCreateKernel", 3},
+        {"clCreateUserEvent", 2},
+        {"clCreateFromGLBuffer", 4},
+        {"clCreateFromGLTexture2D", 6},
+        {"clCreateFromGLTexture3D", 6},
+        {"clCreateFromGLRenderbuffer", 4},
+        {"clEnqueueMapBuffer", 10},
+        {"clEnqueueMapImage", 12}};
     auto const found = kArguments.find(name);
     return found == kArguments.end() ? 0 : found->second;
 }
 
 /// Names that a call makes or gives up. A deletion that fails counts: its caller can do no more.
-void CountNames(std::string const &name, std::uintptr_t first) {
+void CountNames(std::string const &name, std::uintptr_t const *arguments) {
     static std::unordered_map<std::string, int> const kSingle = {
-        {"glCreateShader", 1}, {"glCreateProgram", 1}, {"wglCreateContext", 1},
-        {"wglCreateContextAttribsARB", 1}, {"glDeleteShader", -1}, {"glDeleteProgram", -1},
+        {"glCreateShader", 1},   {"glCreateProgram", 1},
+        {"wglCreateContext", 1}, {"wglCreateContextAttribsARB", 1},
+        {"glDeleteShader", -1},  {"glDeleteProgram", -1},
         {"wglDeleteContext", -1}};
-    if (auto const found = kSingle.find(name); found != kSingle.end())
-        gHoldings.names += found->second;
-    else if (Begins(name, "glGen") && !Begins(name, "glGenerate") && !Begins(name, "glGenLists"))
-        gHoldings.names += static_cast<long>(first);
-    else if (Begins(name, "glDelete") && !Begins(name, "glDeleteLists"))
-        gHoldings.names -= static_cast<long>(first);
+    auto const single = kSingle.find(name);
+    if (single != kSingle.end()) {
+        gHoldings.names += single->second > 0 || arguments[0] != 0 ? single->second : 0;
+    } else if (name.find("Lists") != std::string::npos || Begins(name, "glGenerate")) {
+        return;
+    } else if (Begins(name, "glGen")) {
+        gHoldings.names += static_cast<long>(arguments[0]);
+    } else if (Begins(name, "glDelete")) {
+        auto const *const names = reinterpret_cast<GLuint const *>(arguments[1]);
+        gHoldings.names -= static_cast<long>(
+            std::count_if(names, names + arguments[0], [](GLuint n) { return n != 0; }));
+    }
 }
 
 struct Verdict {
@@ -86,14 +110,15 @@ Verdict Decide(EntryPoint const &entry, std::uintptr_t const *arguments) {
     bool const fails = canFail && IsTheOne(Kind::Call, entry.name.c_str());
     bool const givesUp = entry.name.find("Delete") < 4;
     if (!isOpenCL && (!fails || givesUp))
-        CountNames(entry.name, arguments[0]);
+        CountNames(entry.name, arguments);
     if (!fails)
         return {entry.address, 0};
     if (Begins(entry.name, "gl"))
         gPendingError = GL_OUT_OF_MEMORY;
     if (!isOpenCL)
         return {0, 0};
-    if (Begins(entry.name, "clRelease"))
+    if (Begins(entry.name, "clRelease") ||
+        Begins(entry.name, "clRetain")) // wrappers do not look: keep the count right
         reinterpret_cast<int (*)(std::uintptr_t)>(entry.address)(arguments[0]);
     constexpr int kOutOfHostMemory = -6;
     unsigned const argument = ErrorArgument(entry.name);
@@ -109,12 +134,11 @@ Verdict Decide(EntryPoint const &entry, std::uintptr_t const *arguments) {
 
 } // namespace sweep
 
-// What every stub jumps to, its entry point in r10: asks Decide with the arguments saved, then goes on to
-// the real function as if nothing had happened, or returns.
+// What every stub jumps to, its entry point in r10: asks Decide with the arguments saved, then goes
+// on to the real function as if nothing had happened, or returns.
 extern "C" {
 std::uintptr_t OruSweepResult = 0;
-std::uintptr_t OruSweepDecide(sweep::EntryPoint const *entry,
-                                         std::uintptr_t const *arguments) {
+std::uintptr_t OruSweepDecide(sweep::EntryPoint const *entry, std::uintptr_t const *arguments) {
     auto const [address, result] = sweep::Decide(*entry, arguments);
     OruSweepResult = result;
     return address;
@@ -162,12 +186,13 @@ std::uintptr_t StubOf(std::string const &name, std::uintptr_t address) {
     static std::mutex mutex;
     static std::unordered_map<std::string, EntryPoint> entryPoints;
     std::lock_guard<std::mutex> const lock(mutex);
-    bool const wasArmed = std::exchange(gIsArmed, false); // what is allocated here is not the library's
+    bool const wasArmed =
+        std::exchange(gIsArmed, false); // what is allocated here is not the library's
     EntryPoint &entry = entryPoints.try_emplace(name, EntryPoint{name, address}).first->second;
     if (entry.stub == 0) {
-        unsigned char code[] = {0x49, 0xba, 0, 0, 0, 0, 0, 0, 0, 0,  // mov r10, entry
-                                0x49, 0xbb, 0, 0, 0, 0, 0, 0, 0, 0,  // mov r11, common
-                                0x41, 0xff, 0xe3};                   // jmp r11
+        unsigned char code[] = {0x49, 0xba, 0,   0, 0, 0, 0, 0, 0, 0, // mov r10, entry
+                                0x49, 0xbb, 0,   0, 0, 0, 0, 0, 0, 0, // mov r11, common
+                                0x41, 0xff, 0xe3};                    // jmp r11
         EntryPoint const *const place = &entry;
         void (*const common)() = OruSweepCommon;
         std::memcpy(code + 2, &place, sizeof place);
@@ -186,14 +211,13 @@ decltype(&::GetProcAddress) gGetAddress = nullptr;
 
 template<class Address>
 Address Hooked(char const *name, Address address) {
-    return address ? reinterpret_cast<Address>(
-                         StubOf(name, reinterpret_cast<std::uintptr_t>(address)))
-                   : nullptr;
+    return address
+               ? reinterpret_cast<Address>(StubOf(name, reinterpret_cast<std::uintptr_t>(address)))
+               : nullptr;
 }
 
 PROC WINAPI GetWglAddress(char const *name) {
-    return IsTheOne(Kind::Call, "wglGetProcAddress") ? nullptr
-                                                     : Hooked(name, gGetWglAddress(name));
+    return IsTheOne(Kind::Call, "wglGetProcAddress") ? nullptr : Hooked(name, gGetWglAddress(name));
 }
 
 FARPROC WINAPI GetAddress(HMODULE module, char const *name) {
@@ -201,8 +225,8 @@ FARPROC WINAPI GetAddress(HMODULE module, char const *name) {
     return std::strncmp(name, "cl", 2) == 0 ? Hooked(name, address) : address;
 }
 
-/// The blocks that this thread allocated through the C++ run-time library and nobody has freed: a hash table
-/// that allocates nothing itself.
+/// The blocks that this thread allocated through the C++ run-time library and nobody has freed: a
+/// hash table that allocates nothing itself.
 class Blocks {
 public:
     void add(void *block) {
@@ -317,8 +341,17 @@ void Arm(Kind kind, unsigned failing) {
     gFailing = failing;
     gCount = 0;
     gFailedName[0] = '\0';
+    gIsEnding = gFailedAtEnd = false;
     gPendingError = GL_NO_ERROR;
     gIsArmed = true;
+}
+
+void BeginEnd() {
+    gIsEnding = true;
+}
+
+bool FailedAtEnd() {
+    return gFailedAtEnd;
 }
 
 void Disarm() {

@@ -1,20 +1,19 @@
-// Runs one scenario again and again, each time with another call or allocation failing, and tells what came of it.
+// Runs one scenario again and again, each time with another call or allocation failing, and tells
+// what came of it.
 //
 // Usage: sweep SCENARIO calls|allocations
 //
-// A line for each failure that nobody noticed, that is reported by the wrong exception, that leaks, or after which
-// the scenario does not run any more; a line of figures at the end. Ends with 1 when there was one. Without arguments
-// it prints the names of the scenarios.
+// A line for each failure that nobody noticed, that is reported by the wrong exception, that leaks,
+// or after which the scenario does not run any more; a line of figures at the end. Ends with 1 when
+// there was one. Without arguments it prints the names of the scenarios.
 #include "tests/sweep/faults.h"
 #include "tests/sweep/scenarios.h"
 
-#include "apps/common/image.h"
-#include "apps/common/pngcodec.h"
-#include "apps/common/unicode.h"
 #include "oru/core/exceptions/logicalexception.h"
 #include "oru/oru_ocl/ocllibrary.h"
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+#include "oru/oru_ogl/platformgl.h"
 #include "tests/support/testruntime.h"
 
 #include <algorithm>
@@ -23,11 +22,9 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
-#include <memory>
 #include <new>
 #include <optional>
-
-#include <io.h>
+#include <sstream>
 
 namespace {
 
@@ -53,13 +50,15 @@ public:
         std::freopen(kErrors, "w", stderr);
         if (kind == Kind::Call)
             runtime_.emplace("ocl_runtime");
-        if (scenario.needsOpenCL && !ORU::OCL::Library::IsOpenCLAvailable(runtime_ ? runtime_->folder() : ""))
+        if (scenario.needs == Needs::OpenCL &&
+            !ORU::OCL::Library::IsOpenCLAvailable(runtime_ ? runtime_->folder() : ""))
             throw std::runtime_error("no OpenCL runtime");
         InstallHooks();
-        openGL_.emplace();
-        if (scenario.needsOpenCL)
+        if (scenario.needs == Needs::OpenGL || scenario.needs == Needs::Context)
+            openGL_.emplace();
+        if (scenario.needs == Needs::OpenCL)
             openCL_.emplace();
-        if (scenario.needsContext)
+        if (scenario.needs == Needs::Context)
             context_.emplace().makeCurrent();
         for (int warmUp = 0; warmUp < 3; ++warmUp)
             if (Outcome const outcome = run(0); outcome.how != Outcome::Nothing)
@@ -96,14 +95,33 @@ private:
                         outcome.text);
         };
         judge(outcome, name, finding);
-        if (after.names != before.names)
+        // What the system does not let go of cannot be deleted.
+        bool const isKept = name == "wglMakeCurrent" && FailedAtEnd();
+        if (after.names != before.names && !isKept)
             finding(std::to_string(after.names - before.names) + " names are left");
-        if (after.memory > before.memory)
+        if (after.memory > before.memory && grows(failing))
             finding(std::to_string(after.memory - before.memory) + " blocks of memory are left");
         if (this->handles() != handles)
             finding(std::to_string(this->handles() - handles) + " OpenCL handles are left");
         if (Outcome const again = run(0); again.how != Outcome::Nothing)
             finding(std::string("it does not run afterwards: ") + again.text);
+    }
+
+    /// Whether a failure takes memory each time, and not only the first one of its kind.
+    bool grows(unsigned failing) {
+        long const before = CurrentHoldings().memory;
+        run(failing);
+        run(failing);
+        return CurrentHoldings().memory > before + 1;
+    }
+
+    bool mayGoUnnoticed(std::string const &name) const {
+        // What destructors call is in every list.
+        std::istringstream beginnings(std::string("glDelete wglDelete ") + scenario_.unnoticed);
+        for (std::string beginning; beginnings >> beginning;)
+            if (name.rfind(beginning, 0) == 0)
+                return true;
+        return FailedAtEnd() || kind_ == Kind::Allocation;
     }
 
     template<class Finding>
@@ -112,7 +130,7 @@ private:
         bool const isProgram = !picture_.empty();
         std::string const made = isProgram ? Contents(fs::path(kOutput) / kPhoto) : "";
         if (outcome.how == Outcome::Nothing) {
-            if (isProgram ? made == picture_ : kind_ == Kind::Allocation || MayGoUnnoticed(name))
+            if (isProgram ? made == picture_ : mayGoUnnoticed(name))
                 ++unnoticed_;
             else
                 finding("nobody notices");
@@ -155,6 +173,10 @@ private:
         }
         Disarm();
         std::fflush(stderr);
+        if (outcome.how != Outcome::Nothing && context_) {
+            ::glPopClientAttrib(); // where an upload that failed leaves pixel storage
+            static_cast<void>(::glGetError());
+        }
         return outcome;
     }
 
@@ -194,7 +216,8 @@ int main(int count, char **arguments) {
     for (Scenario const &scenario : Scenarios())
         if (scenario.name == std::string(arguments[1]))
             try {
-                return Sweep(scenario, kind == "calls" ? Kind::Call : Kind::Allocation).all() ? 1 : 0;
+                return Sweep(scenario, kind == "calls" ? Kind::Call : Kind::Allocation).all() ? 1
+                                                                                              : 0;
             } catch (std::exception const &failure) {
                 std::printf("%s: %s\n", scenario.name, failure.what());
                 return 1;
