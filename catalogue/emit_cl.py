@@ -58,10 +58,11 @@ def function_table(entries):
     group = None
     for name, entry_group, result, parameters in entries:
         if entry_group != group:
+            lines += ["    /// @}", ""] if group else []
             group = entry_group
-            lines += ["", f"    // {group}"]
+            lines += [f"    /// @name {group}", f"    /// Null where the runtime has no {group}.", "    /// @{"]
         lines.append(declaration(name, result, parameters))
-    body = "\n".join(lines).lstrip("\n")
+    body = "\n".join([*lines, "    /// @}"])
     return """// The OpenCL entry points, one pointer each.
 #pragma once
 
@@ -105,7 +106,7 @@ def entry_points(entries):
 
 
 def extension_enum(extensions):
-    lines = "\n".join(f"    {extension_enumerator(name)} = {value},"
+    lines = "\n".join(f"    {extension_enumerator(name)} = {value}, ///< {name}"
                       for value, name in extensions)
     return """// The OpenCL versions and extensions that the layer knows.
 #pragma once
@@ -133,8 +134,8 @@ def extension_rows(extensions):
 
 
 def property_enum(properties):
-    lines = ",\n".join(f"    {property_enumerator(constant)} = {value}"
-                       for value, constant, _ in properties)
+    lines = "\n".join(f"    {property_enumerator(constant)} = {value}, ///< {constant}{read_as(kind)}"
+                      for value, constant, kind in properties)
     return """// The device properties of OpenCL 1.1.
 #pragma once
 
@@ -142,6 +143,12 @@ def property_enum(properties):
 enum DeviceProperty : unsigned int {{
 {lines}
 }};""")
+
+
+def read_as(kind):
+    """The type of a property's value, which `-` leaves to the caller."""
+    types = {"-": "for the runtime's own query alone", "char *": "`std::string`"}
+    return f": {types.get(kind, f'`{kind}`')}"
 
 
 def property_rows(properties):

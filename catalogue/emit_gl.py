@@ -50,7 +50,7 @@ def undefinitions(catalogue):
 
 
 def enumeration(catalogue):
-    rows = "\n".join(f"    {x.enumerator} = {x.value}," for x in catalogue.extensions)
+    rows = "\n".join(f"    {x.enumerator} = {x.value}, ///< {meaning(catalogue, x)}" for x in catalogue.extensions)
     unknown = len(catalogue.extensions)
     return f"""#pragma once
 
@@ -68,12 +68,23 @@ enum OpenGLExtension : unsigned int {{
 """
 
 
+def meaning(catalogue, extension):
+    """What stands beside a capability's enumerator."""
+    if extension.is_version:
+        name = "OpenGL " + extension.string.removeprefix("GL_VERSION_").replace("_", ".")
+    else:
+        name = f"the extension {extension.string}"
+    count = sum(e.group == extension.string for e in catalogue.entry_points)
+    return f"{name}; {count} entry point{'' if count == 1 else 's'}" if count else name
+
+
 def function_table(catalogue):
     blocks = []
     for group, _, entries in catalogue.runs():
         rows = "\n".join(f"    {e.result} (ORU_APIENTRY *{e.name})({e.declarations}) = nullptr;"
                          for e in entries)
-        blocks.append(f"    // {group}\n{rows}")
+        blocks.append(f"    /// @name {group}\n    /// Null unless the context has {group} and the driver the function.\n"
+                      f"    /// @{{\n{rows}\n    /// @}}\n")
     return f"""#pragma once
 
 #include "oru/oru_ogl/gltypes.h"

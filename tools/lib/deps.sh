@@ -7,7 +7,10 @@ ORU_PACKAGES=(
     clang clang-tools-14 clang-format-14 clang-tidy-14 libc++-14-dev llvm-14 lld-14 pkgconf
     libboost-dev libcli11-dev opencl-headers opencl-clhpp-headers googletest
     wine wine64 xvfb libgl1 libgl1-mesa-dri ocl-icd-libopencl1 pocl-opencl-icd
-    apitrace)
+    apitrace doxygen)
+# What tools/docs needs where nothing is built, and for its look at the site.
+ORU_SITE_PACKAGES=(git python3 doxygen)
+ORU_BROWSER_PACKAGES=(chromium chromium-driver python3-selenium)
 
 as_root() {
     if [ "$(id -u)" -eq 0 ]; then
@@ -20,11 +23,11 @@ as_root() {
     fi
 }
 
-install_packages() {
+install_packages() { # PACKAGE...
     local package missing=()
     local installed
-    installed=$(dpkg-query -W -f '${db:Status-Abbrev} ${Package}\n' "${ORU_PACKAGES[@]}" 2>/dev/null || true)
-    for package in "${ORU_PACKAGES[@]}"; do
+    installed=$(dpkg-query -W -f '${db:Status-Abbrev} ${Package}\n' "$@" 2>/dev/null || true)
+    for package in "$@"; do
         grep -q "^ii  *$package\$" <<<"$installed" || missing+=("$package")
     done
     [ ${#missing[@]} -gt 0 ] || return 0

@@ -21,8 +21,7 @@ import licences
 
 ROOT = pathlib.Path(__file__).resolve().parents[2]
 
-# What the package takes from the repository, and where it lies there. A site built from the guide would be one more
-# folder here, "docs/site".
+# What the package takes from the repository, and where it lies there.
 FILES = [
     ("packaging/README.md", "README.md"),
     ("CHANGELOG.md", "CHANGELOG.md"),
@@ -70,6 +69,7 @@ def contents(build, prefix):
             sys.exit(f"package: the repository has no {source}")
         for name in names:
             files[target + name.removeprefix(source)] = (ROOT / name).read_bytes()
+    files.update(site(prefix.parent))
     for name, text in licences.texts(build).items():
         files[f"licences/{name}"] = text
     for library in [name for name in files if name.endswith(".dll")]:
@@ -77,6 +77,15 @@ def contents(build, prefix):
         if data.is_file():
             files[library + DEBUG_DATA] = data.read_bytes()
     return files
+
+
+def site(scratch):
+    """The documentation as tools/docs builds it, without its look in a browser."""
+    folder = scratch / "site"
+    subprocess.run([sys.executable, "-B", ROOT / "docs/site/build.py", scratch / "site-work", folder], check=True,
+                   stdout=subprocess.DEVNULL)
+    return {f"docs/site/{path.relative_to(folder).as_posix()}": path.read_bytes()
+            for path in folder.rglob("*") if path.is_file()}
 
 
 def write_zip(path, files, folder, seconds):

@@ -35,6 +35,7 @@ private:
     std::size_t values_[dimension];
 };
 
+/// Equal in both components.
 constexpr bool operator==(size2 const &a, size2 const &b) {
     return a[0] == b[0] && a[1] == b[1];
 }

@@ -45,6 +45,7 @@ struct ORU_API LineStippleState {
     /// @note glGetBooleanv, glGetIntegerv
     void setToCurrentGLValues();
 
+    /// Equal in everything, the pattern of disabled stippling too.
     bool operator==(LineStippleState const &other) const {
         return enabled == other.enabled && factor == other.factor && pattern == other.pattern;
     }
