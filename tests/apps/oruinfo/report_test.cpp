@@ -71,6 +71,32 @@ TEST(ReportTest, SurvivesEveryFailureOfADriver) {
                                                       "/$defs/library/properties/failure"));
 }
 
+// Flags and enumerations by their names, numbers whole, what is younger than the names as a number.
+TEST(ReportTest, ReadsEachKindOfProperty) {
+    oru_test::TestRuntime const runtime("ocl_runtime");
+    Drivers drivers(runtime.folder());
+    drivers.openOpenCL();
+    runtime->answerNumber<cl_ulong>(CL_DEVICE_QUEUE_PROPERTIES, 3 | cl_ulong{1} << 40);
+    runtime->answerNumber<cl_ulong>(CL_DEVICE_HALF_FP_CONFIG, CL_FP_FMA);
+    runtime->answerNumber<cl_ulong>(CL_DEVICE_GLOBAL_MEM_SIZE, (cl_ulong{1} << 63) + 1);
+    runtime->answerNumber<cl_uint>(CL_DEVICE_GLOBAL_MEM_CACHE_TYPE, CL_READ_ONLY_CACHE);
+    runtime->answerNumber<cl_uint>(CL_DEVICE_LOCAL_MEM_TYPE, 77);
+    runtime->answerNumber<cl_uint>(CL_DEVICE_IMAGE_SUPPORT, 0);
+    runtime->answerText(CL_DEVICE_EXTENSIONS, std::string("cl_one  cl_two\0 cl_gone", 23));
+    Json const report = Json::parse(JsonOf(Gather({"opencl"}, drivers)));
+    runtime->reset();
+    Json const &device = report["opencl"]["platforms"][0]["devices"][0];
+    EXPECT_EQ((Json{"CL_QUEUE_OUT_OF_ORDER_EXEC_MODE_ENABLE", "CL_QUEUE_PROFILING_ENABLE",
+                    "1099511627776"}),
+              device["queue_properties"]);
+    EXPECT_EQ(Json::array({"CL_FP_FMA"}), device["half_fp_config"]);
+    EXPECT_EQ((cl_ulong{1} << 63) + 1, device["global_mem_size"]["value"].get<cl_ulong>());
+    EXPECT_EQ("CL_READ_ONLY_CACHE", device["global_mem_cache_type"]);
+    EXPECT_EQ("77", device["local_mem_type"]);
+    EXPECT_EQ(false, device["image_support"]);
+    EXPECT_EQ((Json{"cl_one", "cl_two"}), device["extensions"]);
+}
+
 // Whatever a driver calls itself, its name stays a text.
 TEST(ReportTest, EscapesEveryText) {
     std::string const nasty = "</td>\"<b>&amp;' \xC3\xA4 \x80";
