@@ -130,6 +130,9 @@ namespace ORU::OGL {{
 /// The names of the FunctionTable's entry points, in its order.
 extern char const *const kEntryPointNames[{len(catalogue.extended)}];
 
+/// The capability that each of them belongs to.
+extern OpenGLExtension const kEntryPointGroups[{len(catalogue.extended)}];
+
 /// A capability and its exact extension string.
 struct NamedExtension {{
     char const *name;
@@ -165,6 +168,7 @@ def loaders(catalogue):
         bodies.append(f"bool ExtensionManager::init_{extension.string}() {loader(runs.get(extension.string, []))}")
         dispatch.append(f"    &ExtensionManager::init_{extension.string},")
     entry_points = "\n".join(f'    "{e.name}",' for e in catalogue.extended)
+    groups = "\n".join(f"    {e.group.upper()}," for e in catalogue.extended)
 
     def named(is_wgl):
         chosen = sorted((x.string, x.enumerator) for x in catalogue.extensions if x.is_wgl == is_wgl)
@@ -178,6 +182,10 @@ namespace ORU::OGL {{
 
 char const *const kEntryPointNames[] = {{
 {entry_points}
+}};
+
+OpenGLExtension const kEntryPointGroups[] = {{
+{groups}
 }};
 
 NamedExtension const kGLExtensions[] = {{

@@ -11,15 +11,6 @@ namespace App {
 
 namespace {
 
-std::string ToUtf8(std::wstring const &wide) {
-    auto const size = static_cast<int>(wide.size());
-    int const bytes =
-        ::WideCharToMultiByte(CP_UTF8, 0, wide.data(), size, nullptr, 0, nullptr, nullptr);
-    std::string text(static_cast<std::size_t>(bytes), '\0');
-    ::WideCharToMultiByte(CP_UTF8, 0, wide.data(), size, text.data(), bytes, nullptr, nullptr);
-    return text;
-}
-
 std::wstring ToWide(std::string const &text) {
     auto const bytes = static_cast<int>(text.size());
     int const size = ::MultiByteToWideChar(CP_UTF8, 0, text.data(), bytes, nullptr, 0);
@@ -29,6 +20,15 @@ std::wstring ToWide(std::string const &text) {
 }
 
 } // namespace
+
+std::string ToUtf8(std::wstring const &wide) {
+    auto const size = static_cast<int>(wide.size());
+    int const bytes =
+        ::WideCharToMultiByte(CP_UTF8, 0, wide.data(), size, nullptr, 0, nullptr, nullptr);
+    std::string text(static_cast<std::size_t>(bytes), '\0');
+    ::WideCharToMultiByte(CP_UTF8, 0, wide.data(), size, text.data(), bytes, nullptr, nullptr);
+    return text;
+}
 
 std::vector<std::string> CommandLineArguments() {
     int count = 0;

@@ -10,6 +10,9 @@ namespace App {
 /// The arguments of the running program as UTF-8, without the program's name.
 std::vector<std::string> CommandLineArguments();
 
+/// The UTF-8 of a text of Windows. What is no valid UTF-16 becomes U+FFFD.
+std::string ToUtf8(std::wstring const &wide);
+
 /// The path with slashes, as UTF-8. What is no valid UTF-16 becomes U+FFFD.
 std::string ToText(std::filesystem::path const &path);
 

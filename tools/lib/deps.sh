@@ -5,7 +5,7 @@ ORU_PACKAGES=(
     ca-certificates git cmake dpkg-dev ninja-build ccache python3 xz-utils
     g++-mingw-w64-x86-64-posix libz-mingw-w64-dev nasm
     clang clang-tools-14 clang-format-14 clang-tidy-14 libc++-14-dev llvm-14 lld-14 pkgconf
-    libboost-dev libcli11-dev opencl-headers opencl-clhpp-headers googletest
+    libboost-dev libcli11-dev nlohmann-json3-dev opencl-headers opencl-clhpp-headers googletest
     wine wine64 xvfb libgl1 libgl1-mesa-dri ocl-icd-libopencl1 pocl-opencl-icd
     apitrace doxygen)
 # What tools/docs needs where nothing is built, and for its look at the site.
@@ -46,7 +46,7 @@ deps_lock() {
 link_headers() {
     local name
     mkdir -p "$ORU_DEPS_DIR/include"
-    for name in boost CL CLI; do
+    for name in boost CL CLI nlohmann; do
         [ -e "/usr/include/$name/." ] || die "/usr/include/$name is missing though its package is installed"
         [ -e "$ORU_DEPS_DIR/include/$name/." ] || ln -sfn "/usr/include/$name" "$ORU_DEPS_DIR/include/$name"
     done

@@ -30,6 +30,7 @@ FILES = [
     ("docs/start.md", "docs/start.md"),
     ("docs/guide", "docs/guide"),
     ("docs/images", "docs/images"),
+    ("docs/oruinfo.schema.json", "docs/oruinfo.schema.json"),
     ("examples", "examples"),
     ("apps/common", "apps/common"),  # what the examples share
 ]

@@ -86,6 +86,20 @@ std::string GLString(GLenum name) {
     return text ? text : "";
 }
 
+/// What the current context names of WGL.
+std::vector<std::string> WGLExtensionNames() {
+    std::vector<std::string> names;
+    if (auto const stored = _wcgmGetExtensionsStringARB) {
+        char const *const text = stored(ORU_WGL0(GetCurrentDC));
+        Tokenize(text ? text : "", " ", names);
+    }
+    return names;
+}
+
+bool Contains(std::vector<std::string> const &names, std::string const &name) {
+    return std::find(names.begin(), names.end(), name) != names.end();
+}
+
 /// What a test answers; no when it fails with whatever exception.
 template<class Test>
 bool Passes(Test test) {
@@ -175,17 +189,12 @@ void ExtensionManager::readExtensions() {
 
 void ExtensionManager::readWGLExtensions() {
     InitializeWGLExtension(WGL_ARB_EXTENSIONS_STRING);
-    if (auto const stored = _wcgmGetExtensionsStringARB) {
-        char const *const text = stored(ORU_WGL0(GetCurrentDC));
-        std::vector<std::string> tokens;
-        TokenizeExtensionString(text ? text : "", tokens);
-        for (std::string const &token : tokens) {
-            OpenGLExtension const e = FindExtension(kWGLExtensions, token.c_str());
-            if (!InitializeWGLExtension(e))
-                continue;
-            supported_.insert(e);
-            supportedNames_.push_back(token);
-        }
+    for (std::string const &name : WGLExtensionNames()) {
+        OpenGLExtension const e = FindExtension(kWGLExtensions, name.c_str());
+        if (!InitializeWGLExtension(e))
+            continue;
+        supported_.insert(e);
+        supportedNames_.push_back(name);
     }
 
     // Looked up again, not taken from the process-wide pointer, which another thread may rewrite.
@@ -237,6 +246,49 @@ bool ExtensionManager::loadGroup(std::size_t first, std::size_t count) {
 
 OpenGLExtension ExtensionManager::nameToEnumGL(char const *name) {
     return FindExtension(kGLExtensions, name);
+}
+
+std::string ExtensionManager::ExtensionEnumToString(OpenGLExtension e) {
+    for (NamedExtension const &extension : kGLExtensions)
+        if (extension.value == e)
+            return extension.name;
+    for (NamedExtension const &extension : kWGLExtensions)
+        if (extension.value == e)
+            return extension.name;
+    return std::string();
+}
+
+bool ExtensionManager::isReported(OpenGLExtension e) const {
+    std::string const name = ExtensionEnumToString(e);
+    if (FindExtension(kWGLExtensions, name.c_str()) == e)
+        return Contains(WGLExtensionNames(), name);
+    bool reached = false;
+    for (Rung const &rung : kLadder) {
+        reached = reached || (majorVersion_ == rung.major && minorVersion_ == rung.minor);
+        if (!reached)
+            continue;
+        // The climb passes over what a version brings that is not there itself.
+        bool const brings = std::count(rung.extensions.begin(), rung.extensions.end(), e) > 0;
+        if (rung.version == e || (brings && isSupported(rung.version)))
+            return true;
+    }
+    return Contains(supportedNames_, name);
+}
+
+std::vector<std::string> ExtensionManager::missingEntryPoints(OpenGLExtension e) const {
+    std::vector<std::string> missing;
+    auto const *const entries = reinterpret_cast<char const *>(&table());
+    for (std::size_t i = 0; i < std::size(kEntryPointGroups); ++i) {
+        PROC address = nullptr;
+        std::memcpy(&address, entries + i * sizeof address, sizeof address);
+        if (kEntryPointGroups[i] == e && !address)
+            missing.emplace_back(kEntryPointNames[i]);
+    }
+#define ORU_WGL_ROW(Extension, Name, Pointer, Line)                                                \
+    if (e == Extension && !Pointer)                                                                \
+        missing.emplace_back(#Name);
+#include "oru/oru_ogl/extensionator/wgl/internal/extensionswgl_rows.inc"
+    return missing;
 }
 
 bool ExtensionManager::initializeGL(OpenGLExtension e) {

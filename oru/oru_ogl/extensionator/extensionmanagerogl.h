@@ -210,6 +210,21 @@ public:
     /// UNKNOWN_OPENGL_EXTENSION.
     OpenGLExtension nameToEnumGL(char const *name);
 
+    /// The exact string of a capability, of OpenGL or of WGL; empty for a value that is none.
+    static std::string ExtensionEnumToString(OpenGLExtension e);
+
+    /// Whether the implementation claims a capability: names it, or supports an OpenGL version that
+    /// includes it. What is claimed and not supported lacks entry points; see
+    /// `missingEntryPoints`.
+    /// @param e a WGL capability is looked for in what the current context names, which must be one
+    ///     of the record's device; without a context it is not reported
+    /// @note wglGetExtensionsStringARB for a WGL capability
+    bool isReported(OpenGLExtension e) const;
+
+    /// The entry points of a capability that were asked for and not found; of one that is not
+    /// reported all, as nobody asked.
+    std::vector<std::string> missingEntryPoints(OpenGLExtension e) const;
+
     /// Loads a GL capability's entry points from the current context.
     /// @return whether all were found; true for a GL capability without any, false for a WGL one
     bool initializeGL(OpenGLExtension e);

@@ -1,6 +1,7 @@
 // What tests of the program develop share.
 #pragma once
 
+#include "apps/common/file.h"
 #include "apps/common/imagefile.h"
 #include "apps/common/pngcodec.h"
 #include "apps/common/unicode.h"

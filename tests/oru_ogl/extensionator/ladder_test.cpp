@@ -63,6 +63,23 @@ TEST_F(LadderTest, KeepsEveryNameOfTheImplementation) {
     }
 }
 
+// What is missing is not reported, or reported without an entry point.
+TEST_F(LadderTest, KnowsWhatIsReportedAndWhatItLacks) {
+    for (unsigned int value = 0; value < UNKNOWN_OPENGL_EXTENSION; ++value) {
+        auto const e = static_cast<OpenGLExtension>(value);
+        std::string const name = ExtensionManager::ExtensionEnumToString(e);
+        EXPECT_EQ(value < WGL_ARB_CREATE_CONTEXT ? e : UNKNOWN_OPENGL_EXTENSION,
+                  record().nameToEnumGL(name.c_str()));
+        bool const isThere = record().isReported(e) && record().missingEntryPoints(e).empty();
+        EXPECT_EQ(record().isSupported(e), isThere) << name;
+    }
+    EXPECT_TRUE(record().isReported(GL_APPLE_FLUSH_RENDER));
+    EXPECT_EQ((std::vector<std::string>{"glFlushRenderAPPLE", "glFinishRenderAPPLE",
+                                        "glSwapAPPLE"}),
+              record().missingEntryPoints(GL_APPLE_FLUSH_RENDER));
+    EXPECT_EQ("", ExtensionManager::ExtensionEnumToString(UNKNOWN_OPENGL_EXTENSION));
+}
+
 TEST_F(LadderTest, KnowsItsMaker) {
     EXPECT_EQ(Environment("ORU_TEST_VENDOR"), record().vendorString());
     ASSERT_FALSE(Has("GL_ARB_texture_non_power_of_two"));
