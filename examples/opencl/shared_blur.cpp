@@ -26,12 +26,12 @@ char const *const kSource = R"(
         CLK_NORMALIZED_COORDS_FALSE | CLK_ADDRESS_CLAMP_TO_EDGE | CLK_FILTER_NEAREST;
     kernel void blur(read_only image2d_t from, write_only image2d_t to) {
         int2 at = (int2)(get_global_id(0), get_global_id(1));
-        int4 sum = 0;
+        int count = (2 * REACH + 1) * (2 * REACH + 1);
+        int4 sum = count / 2; // which rounds
         for (int y = -REACH; y <= REACH; ++y)
             for (int x = -REACH; x <= REACH; ++x)
                 sum += convert_int4_rte(255 * read_imagef(from, pixels, at + (int2)(x, y)));
-        int count = (2 * REACH + 1) * (2 * REACH + 1);
-        write_imagef(to, at, convert_float4((sum + count / 2) / count) / 255);
+        write_imagef(to, at, convert_float4(sum / count) / 255);
     })";
 
 using Pixels = std::vector<unsigned char>; ///< red, green, blue and alpha of each, row by row
@@ -41,14 +41,16 @@ Pixels Blurred(Pixels const &from) {
     Pixels to(from.size());
     int const count = (2 * kReach + 1) * (2 * kReach + 1);
     for (int i = 0; i < 4 * kWidth * kHeight; ++i) {
-        int const column = i / 4 % kWidth, row = i / 4 / kWidth;
-        int sum = 0;
+        int const channel = i % 4, column = i / 4 % kWidth, row = i / 4 / kWidth;
+        int sum = count / 2;
         for (int y = row - kReach; y <= row + kReach; ++y)
-            for (int x = column - kReach; x <= column + kReach; ++x)
-                sum += from[static_cast<std::size_t>(
-                    4 * (std::clamp(y, 0, kHeight - 1) * kWidth + std::clamp(x, 0, kWidth - 1)) +
-                    i % 4)];
-        to[static_cast<std::size_t>(i)] = static_cast<unsigned char>((sum + count / 2) / count);
+            for (int x = column - kReach; x <= column + kReach; ++x) {
+                auto const pixel =
+                    static_cast<std::size_t>(std::clamp(y, 0, kHeight - 1)) * kWidth +
+                    static_cast<std::size_t>(std::clamp(x, 0, kWidth - 1));
+                sum += from[4 * pixel + static_cast<std::size_t>(channel)];
+            }
+        to[static_cast<std::size_t>(i)] = static_cast<unsigned char>(sum / count);
     }
     return to;
 }
@@ -61,7 +63,7 @@ void Draw(GL::Texture2D &picture) {
     ORU_GL(Enable, GL_SCISSOR_TEST);
     for (int pane = 0; pane < 12; ++pane) {
         ORU_GL(Scissor, pane % 4 * 80, pane / 4 * 80, 80, 80);
-        ORU_GL(ClearColor, static_cast<float>(pane % 4) / 3, static_cast<float>(pane / 4) / 2,
+        ORU_GL(ClearColor, static_cast<float>(pane % 4) / 3, static_cast<float>(pane % 3) / 2,
                static_cast<float>(pane % 5) / 4, 1.f);
         ORU_GL(Clear, GL_COLOR_BUFFER_BIT);
         ORU_GL(Scissor, pane % 4 * 80 + 38, pane / 4 * 80 + 10, 3, 60);

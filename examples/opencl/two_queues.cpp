@@ -63,8 +63,8 @@ void Stream() {
     // While one part is computed, the one before comes back and the one after goes out. Transfers
     // are in order among themselves: a buffer is read before it is written again.
     auto const send = [&](std::size_t part) {
-        Event const sent = transfers.enqueueWrite(slots[part % 2].buffer, 0, kPartBytes,
-                                                  numbers.data() + part * kPartCount);
+        Event sent = transfers.enqueueWrite(slots[part % 2].buffer, 0, kPartBytes,
+                                            numbers.data() + part * kPartCount);
         transfers.flush(); // or the queue that waits for it might wait for ever
         return sent;
     };
