@@ -111,7 +111,7 @@ public:
         operation(region_);
         BoundingRect const window(Vec(-8, -8), Vec(8, 8));
         region_.intersect(window);
-        bitmap_ = Bitmap(expected.bounds()).intersected(Bitmap(window));
+        bitmap_ = Bitmap(expected.intersected(Bitmap(window)).bounds());
         if (region_.isEmpty())
             region_.makeNowhere();
         BoundingRect const bounds = bitmap_.bounds();
