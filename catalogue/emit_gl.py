@@ -29,6 +29,7 @@ def emit(folder, writer):
         UNDEFINITIONS: f'#include "{BASE}/{UNDEFINITIONS}"\n',
         "openglextension.h": enumeration(catalogue),
         "internal/catalogueogl.h": names(catalogue),
+        "internal/catalogueogl.cpp": name_tables(catalogue),
         "functiontable.h": function_table(catalogue),
         "gloperations.inc": operations(catalogue),
         "extensionmanagerogl_loaders.inc": loader_declarations(catalogue),
@@ -147,6 +148,38 @@ extern NamedExtension const kWGLExtensions[{len(catalogue.extensions) - gl_count
 """
 
 
+def name_tables(catalogue):
+    entry_points = "\n".join(f'    "{e.name}",' for e in catalogue.extended)
+    groups = "\n".join(f"    {e.group.upper()}," for e in catalogue.extended)
+
+    def named(is_wgl):
+        chosen = sorted((x.string, x.enumerator) for x in catalogue.extensions if x.is_wgl == is_wgl)
+        return "\n".join(f'    {{"{string}", {enumerator}}},' for string, enumerator in chosen)
+
+    return f"""#include "oru/oru_ogl/extensionator/internal/catalogueogl.h"
+
+namespace ORU::OGL {{
+
+char const *const kEntryPointNames[] = {{
+{entry_points}
+}};
+
+OpenGLExtension const kEntryPointGroups[] = {{
+{groups}
+}};
+
+NamedExtension const kGLExtensions[] = {{
+{named(False)}
+}};
+
+NamedExtension const kWGLExtensions[] = {{
+{named(True)}
+}};
+
+}} // namespace ORU::OGL
+"""
+
+
 def loader(runs):
     """The body of a group's loader: every entry point is asked for, also after one that is missing."""
     first, *others = [f"loadGroup({index}, {len(entries)})" for index, entries in runs] or ["true"]
@@ -167,34 +200,10 @@ def loaders(catalogue):
             continue
         bodies.append(f"bool ExtensionManager::init_{extension.string}() {loader(runs.get(extension.string, []))}")
         dispatch.append(f"    &ExtensionManager::init_{extension.string},")
-    entry_points = "\n".join(f'    "{e.name}",' for e in catalogue.extended)
-    groups = "\n".join(f"    {e.group.upper()}," for e in catalogue.extended)
-
-    def named(is_wgl):
-        chosen = sorted((x.string, x.enumerator) for x in catalogue.extensions if x.is_wgl == is_wgl)
-        return "\n".join(f'    {{"{string}", {enumerator}}},' for string, enumerator in chosen)
 
     return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 
-#include "oru/oru_ogl/extensionator/internal/catalogueogl.h"
-
 namespace ORU::OGL {{
-
-char const *const kEntryPointNames[] = {{
-{entry_points}
-}};
-
-OpenGLExtension const kEntryPointGroups[] = {{
-{groups}
-}};
-
-NamedExtension const kGLExtensions[] = {{
-{named(False)}
-}};
-
-NamedExtension const kWGLExtensions[] = {{
-{named(True)}
-}};
 
 {chr(10).join(bodies)}
 

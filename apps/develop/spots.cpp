@@ -57,14 +57,10 @@ TVec2<float> Point(double x, double y) {
 
 } // namespace
 
-std::vector<Spot> ReadSpots(std::filesystem::path const &path) {
-    std::error_code error;
-    std::ifstream file(path);
-    if (!file || std::filesystem::is_directory(path, error))
-        throw App::Failure("cannot be opened");
+std::vector<Spot> ReadSpots(std::istream &text) {
     std::vector<Spot> spots;
     std::size_t number = 0;
-    for (std::string line; std::getline(file, line);) {
+    for (std::string line; std::getline(text, line);) {
         ++number;
         std::vector<std::string> const words = Words(line);
         if (words.empty())
@@ -76,6 +72,14 @@ std::vector<Spot> ReadSpots(std::filesystem::path const &path) {
         }
     }
     return spots;
+}
+
+std::vector<Spot> ReadSpots(std::filesystem::path const &path) {
+    std::error_code error;
+    std::ifstream file(path);
+    if (!file || std::filesystem::is_directory(path, error))
+        throw App::Failure("cannot be opened");
+    return ReadSpots(file);
 }
 
 BoundingRegion RegionOf(std::vector<Spot> const &spots) {

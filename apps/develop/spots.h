@@ -4,6 +4,7 @@
 #include "oru/core/math/region_2d/boundingregion.h"
 
 #include <filesystem>
+#include <iosfwd>
 #include <vector>
 
 namespace Develop {
@@ -19,9 +20,13 @@ struct Spot {
     bool changesSomething() const { return radius > 0 && stops != 0; }
 };
 
-/// Reads a text file with a spot on each line: centre x, centre y, radius, stops. A `#` begins a
+/// Reads a text with a spot on each line: centre x, centre y, radius, stops. A `#` begins a
 /// comment.
-/// @throws Failure, with the line's number when a line is malformed
+/// @throws Failure, with the line's number, when a line is malformed
+std::vector<Spot> ReadSpots(std::istream &text);
+
+/// Reads a text file.
+/// @throws Failure also when it cannot be opened
 std::vector<Spot> ReadSpots(std::filesystem::path const &path);
 
 /// Where spots can change a picture.

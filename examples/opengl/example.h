@@ -1,15 +1,13 @@
-// What the examples share: their argument, their failures, and saving what they drew.
+// What the examples of the OpenGL layer share: their argument, and saving what they drew.
 #pragma once
 
 #include "apps/common/imagefile.h"
-#include "oru/core/exceptions/exceptionbase.h"
+#include "examples/example.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <algorithm>
-#include <exception>
 #include <filesystem>
-#include <iostream>
 
 namespace example {
 
@@ -17,19 +15,9 @@ namespace example {
 /// @return the program's exit code
 template<class Work>
 int Run(int argc, char **argv, Work work) {
-    if (argc != 2) {
-        std::cerr << "usage: " << argv[0] << " FILE\n";
-        return 2;
-    }
-    try {
-        work(std::filesystem::path(argv[1]));
-        return 0;
-    } catch (ORU::ExceptionBase const &e) {
-        std::cerr << e << '\n'; // with source position and message
-    } catch (std::exception const &e) {
-        std::cerr << e.what() << '\n';
-    }
-    return 1;
+    return Run(argc, argv, "FILE", [&work](Arguments const &arguments) {
+        work(std::filesystem::path(arguments.front()));
+    });
 }
 
 /// Saves the colours of the bound framebuffer's lower left corner as a PNG file.

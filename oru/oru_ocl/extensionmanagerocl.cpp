@@ -8,6 +8,7 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/tokenize.h"
+#include "oru/oru_ocl/internal/versiontext.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -59,25 +60,6 @@ Enum::Extension ExtensionOf(std::string_view name) {
     return found == std::end(kExtensionNames)
                ? Enum::EXTENSION_UNKNOWN
                : static_cast<Enum::Extension>(found - std::begin(kExtensionNames));
-}
-
-struct Version {
-    unsigned int major = 0;
-    unsigned int minor = 0;
-};
-
-unsigned int Digit(std::string const &text, std::size_t i) {
-    return i < text.size() && text[i] >= '0' && text[i] <= '9'
-               ? static_cast<unsigned int>(text[i] - '0')
-               : 0;
-}
-
-/// The version in "OpenCL <major>.<minor> …", one digit each; 0.0 for an empty text.
-Version ParseVersion(std::string const &text) {
-    if (text.empty())
-        return {};
-    std::string const digits = text.substr(std::strlen("OpenCL "), 3);
-    return {Digit(digits, 0), Digit(digits, 2)};
 }
 
 Version PlatformVersion(FunctionTable const &table, cl_platform_id platform) {

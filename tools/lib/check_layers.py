@@ -1,6 +1,6 @@
 #!/usr/bin/env python3
-"""Checks what the folders promise: layers that know only those below them, tests and benchmarks that lie where
-what they test lies, and files that can be read.
+"""Checks what the folders promise: layers that know only those below them, tests, benchmarks and harnesses that lie
+where what they test lies, and files that can be read.
 
 Prints each offence and ends with 1 when there is one.
 """
@@ -28,7 +28,7 @@ LAYERS = [
 CODE = {".h", ".cpp", ".c", ".py", ".cmake", ".sh"}
 LONGEST = 800
 
-# Folders of tests/ and bench/ that mirror none: helpers, and what is tested as a whole.
+# Folders of tests/, bench/ and fuzz/ that mirror none: helpers, and what is tested as a whole.
 WITHOUT_MIRROR = {"support", "package", "tools", "catalogue"}
 
 
@@ -52,7 +52,7 @@ def upward_includes(path, text):
 def strays(path):
     top, *folders = path.parts
     folders = folders[:-1]
-    if top not in ("tests", "bench") or not folders or folders[0] in WITHOUT_MIRROR or "data" in folders:
+    if top not in ("tests", "bench", "fuzz") or not folders or folders[0] in WITHOUT_MIRROR or "data" in folders:
         return
     mirrored = pathlib.Path(*folders)
     if not any((ROOT / base / mirrored).is_dir() for base in ("oru", ".")):

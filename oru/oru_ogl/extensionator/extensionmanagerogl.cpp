@@ -8,16 +8,15 @@
 #include "oru/oru_ogl/extensionator/internal/catalogueogl.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/extensionator/internal/contextservices.h"
+#include "oru/oru_ogl/extensionator/internal/findextension.h"
 #include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/extensionator/wgl/extensionswgl.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
-#include <algorithm>
 #include <cstddef>
 #include <cstring>
 #include <initializer_list>
-#include <iterator>
 #include <ostream>
 
 namespace ORU::OGL {
@@ -69,16 +68,6 @@ Rung const kLadder[] = {
     {1, 3, GL_VERSION_1_3, {}},
     {1, 2, GL_VERSION_1_2, {}},
 };
-
-/// The capability of an exact name, or UNKNOWN_OPENGL_EXTENSION.
-template<std::size_t Count>
-OpenGLExtension FindExtension(NamedExtension const (&extensions)[Count], char const *name) {
-    auto const *const found = std::lower_bound(
-        std::begin(extensions), std::end(extensions), name,
-        [](NamedExtension const &e, char const *text) { return std::strcmp(e.name, text) < 0; });
-    bool const equal = found != std::end(extensions) && !std::strcmp(found->name, name);
-    return equal ? found->value : UNKNOWN_OPENGL_EXTENSION;
-}
 
 /// A GL string by the plain call: the interceptor chain needs the record that is being built.
 std::string GLString(GLenum name) {
