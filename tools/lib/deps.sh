@@ -8,6 +8,8 @@ ORU_PACKAGES=(
     libboost-dev libcli11-dev opencl-headers opencl-clhpp-headers googletest
     wine wine64 xvfb libgl1 libgl1-mesa-dri ocl-icd-libopencl1 pocl-opencl-icd
     apitrace)
+# What tools/coverage needs beside them.
+ORU_COVERAGE_PACKAGES=(gcovr)
 
 as_root() {
     if [ "$(id -u)" -eq 0 ]; then
@@ -20,11 +22,11 @@ as_root() {
     fi
 }
 
-install_packages() {
+install_packages() { # PACKAGE...
     local package missing=()
     local installed
-    installed=$(dpkg-query -W -f '${db:Status-Abbrev} ${Package}\n' "${ORU_PACKAGES[@]}" 2>/dev/null || true)
-    for package in "${ORU_PACKAGES[@]}"; do
+    installed=$(dpkg-query -W -f '${db:Status-Abbrev} ${Package}\n' "$@" 2>/dev/null || true)
+    for package in "$@"; do
         grep -q "^ii  *$package\$" <<<"$installed" || missing+=("$package")
     done
     [ ${#missing[@]} -gt 0 ] || return 0
