@@ -30,6 +30,9 @@ TEST(Extensions, HaveExactNames) {
 TEST(Ranges, RefuseOtherDimensions) {
     EXPECT_FAILURE("N==2", Range<1>(1, 2));
     EXPECT_FAILURE("N==3", Range<2>(1, 2, 3));
+    Range<3> const range(1, 2, 3);
+    EXPECT_EQ(3u, range[2]);
+    EXPECT_FAILURE("i < range_.size()", range[3]);
     EXPECT_FAILURE("i < range_.size()", Range<2>(0)[2]);
 }
 

@@ -29,7 +29,7 @@ CODE = {".h", ".cpp", ".c", ".py", ".cmake", ".sh"}
 LONGEST = 800
 
 # Folders of tests/, bench/ and fuzz/ that mirror none: helpers, and what is tested as a whole.
-WITHOUT_MIRROR = {"support", "package", "tools", "catalogue"}
+WITHOUT_MIRROR = {"support", "soak", "sweep", "package", "tools", "catalogue"}
 
 
 def layer(path):

@@ -11,6 +11,8 @@ ORU_PACKAGES=(
 # What tools/docs needs where nothing is built, and for its look at the site.
 ORU_SITE_PACKAGES=(git python3 doxygen)
 ORU_BROWSER_PACKAGES=(chromium chromium-driver python3-selenium)
+# What tools/coverage needs beside them.
+ORU_COVERAGE_PACKAGES=(gcovr)
 
 as_root() {
     if [ "$(id -u)" -eq 0 ]; then

@@ -1,7 +1,7 @@
 # What tools/test makes of its arguments: a complaint about one that CTest does not know, or the programs
 # that a -R needs.
 #
-#     test_selection.py check ARGUMENT...            exits with 2 and one line for what CTest would ignore
+#     test_selection.py check TOOL ARGUMENT...       exits with 2 and one line for what CTest would ignore
 #     test_selection.py targets BUILD REGEX...       prints the targets whose tests a -R REGEX can choose,
 #                                                    nothing where all are needed
 #
@@ -14,8 +14,8 @@ import sys
 CASE = re.compile(r"^TEST(?:_F|_P)?\(\s*(\w+),\s*(\w+)\s*\)", re.MULTILINE)
 
 
-def complaint(arguments):
-    """What is wrong with the arguments, by CTest's own list of its options; None if nothing is."""
+def complaint(tool, arguments):
+    """What is wrong with the arguments of a tool, by CTest's own list of its options; None if nothing is."""
     usage = subprocess.run(["ctest", "--help"], capture_output=True, text=True, check=True).stdout
     options = {}
     for names in re.findall(r"^  (-[^=\n]*?) *(?:= |$)", usage, re.MULTILINE):
@@ -30,7 +30,7 @@ def complaint(arguments):
         elif name in options:
             values = int(options[name] and not has_value)
         elif not re.fullmatch(r"-j\d+", argument):
-            return f"unknown argument {argument} (see tools/test --help, ctest --help)"
+            return f"unknown argument {argument} (see tools/{tool} --help, ctest --help)"
     return f"{arguments[-1]} wants a value" if values and arguments[-1] != "-j" else None
 
 
@@ -55,9 +55,9 @@ def targets(build, patterns):
 
 if __name__ == "__main__":
     if sys.argv[1] == "check":
-        problem = complaint(sys.argv[2:])
+        problem = complaint(sys.argv[2], sys.argv[3:])
         if problem:
-            print(f"test: {problem}", file=sys.stderr)
+            print(f"{sys.argv[2]}: {problem}", file=sys.stderr)
             sys.exit(2)
     else:
         print("\n".join(targets(pathlib.Path(sys.argv[2]), sys.argv[3:])))

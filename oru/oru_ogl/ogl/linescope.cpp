@@ -40,14 +40,8 @@ TemporaryLineSmoothScope::TemporaryLineSmoothScope() {
 }
 
 TemporaryLineSmoothScope::~TemporaryLineSmoothScope() {
-    if (current_.enabled == saved_.enabled)
-        return;
-    Release([this] {
-        if (saved_.enabled)
-            ORU_GL(Enable, GL_LINE_SMOOTH);
-        else
-            ORU_GL(Disable, GL_LINE_SMOOTH);
-    });
+    if (current_.enabled && !saved_.enabled)
+        Release([] { ORU_GL(Disable, GL_LINE_SMOOTH); });
 }
 
 void LineStippleState::setToCurrentGLValues() {

@@ -25,8 +25,8 @@ public:
     TemporaryLineSmoothScope();
     TemporaryLineSmoothScope(TemporaryLineSmoothScope const &) = default;
     TemporaryLineSmoothScope &operator=(TemporaryLineSmoothScope const &) = default;
-    /// Smooths lines, or not, as before.
-    /// @note glEnable or glDisable
+    /// Stops smoothing lines where the scope began it.
+    /// @note glDisable
     ~TemporaryLineSmoothScope();
 
 private:

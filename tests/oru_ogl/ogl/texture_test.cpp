@@ -120,6 +120,11 @@ TEST_F(TextureTest, SetsParametersOfTheBoundTexture) {
         if (!IsCoreRun())
             std::fill(expected.begin() + 2, expected.end(), GL_CLAMP);
         EXPECT_EQ(expected, Sampling(kind.target, kind.sides));
+        std::array<float, 4> const colour = {0.25f, 0.5f, 0.75f, 1};
+        texture->setBorderColor(colour.data());
+        std::array<float, 4> actual = {};
+        ::glGetTexParameterfv(kind.target, GL_TEXTURE_BORDER_COLOR, actual.data());
+        EXPECT_EQ(colour, actual);
     }
     Texture2D plane(kRGBA8, 4, 4, false);
     EXPECT_FAILURE("Texture must be enabled (bound & active)",

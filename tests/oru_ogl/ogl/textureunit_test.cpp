@@ -24,6 +24,9 @@ void ExpectBinds(U const &unit, Kind const &texture, Operation bindDefault) {
     EXPECT_TRUE(texture.isBound());
     (unit.*bindDefault)();
     EXPECT_EQ(0u, texture.getBoundID());
+    unit.bind(texture.target(), texture.objectID());
+    EXPECT_TRUE(texture.isBound());
+    (unit.*bindDefault)();
 }
 
 void ExpectEnables(U const &unit, GLenum target, Operation enable, Operation disable,
