@@ -1,6 +1,6 @@
 // The hooks: oru.dll's imports and what it asks for by name lead to stubs, which know their entry
 // point.
-#include "tests/sweep/faults.h"
+#include "bench/sweep/faults.h"
 
 #include "oru/oru_ogl/platformgl.h"
 
@@ -75,14 +75,14 @@ unsigned ErrorArgument(std::string const &name) {
 
 /// Names that a call makes or gives up. A deletion that fails counts: its caller can do no more.
 void CountNames(std::string const &name, std::uintptr_t const *arguments) {
-    static std::unordered_map<std::string, int> const kSingle = {
-        {"glCreateShader", 1},   {"glCreateProgram", 1},
-        {"wglCreateContext", 1}, {"wglCreateContextAttribsARB", 1},
-        {"glDeleteShader", -1},  {"glDeleteProgram", -1},
-        {"wglDeleteContext", -1}};
-    auto const single = kSingle.find(name);
-    if (single != kSingle.end()) {
-        gHoldings.names += single->second > 0 || arguments[0] != 0 ? single->second : 0;
+    if (name == "glCreateShader" || name == "glCreateProgram") {
+        ++gHoldings.names;
+    } else if (name == "glDeleteShader" || name == "glDeleteProgram") {
+        gHoldings.names -= arguments[0] != 0;
+    } else if (Begins(name, "wglCreateContext")) {
+        ++gHoldings.contexts;
+    } else if (name == "wglDeleteContext") {
+        --gHoldings.contexts;
     } else if (name.find("Lists") != std::string::npos || Begins(name, "glGenerate")) {
         return;
     } else if (Begins(name, "glGen")) {

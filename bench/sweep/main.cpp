@@ -6,8 +6,8 @@
 // A line for each failure that nobody noticed, that is reported by the wrong exception, that leaks,
 // or after which the scenario does not run any more; a line of figures at the end. Ends with 1 when
 // there was one. Without arguments it prints the names of the scenarios.
-#include "tests/sweep/faults.h"
-#include "tests/sweep/scenarios.h"
+#include "bench/sweep/faults.h"
+#include "bench/sweep/scenarios.h"
 
 #include "oru/core/exceptions/logicalexception.h"
 #include "oru/oru_ocl/ocllibrary.h"
@@ -95,10 +95,13 @@ private:
                         outcome.text);
         };
         judge(outcome, name, finding);
-        // What the system does not let go of cannot be deleted.
+        // A program's names go with its context; a context that the system does not let go of
+        // stays.
         bool const isKept = name == "wglMakeCurrent" && FailedAtEnd();
-        if (after.names != before.names && !isKept)
+        if (after.names != before.names && picture_.empty())
             finding(std::to_string(after.names - before.names) + " names are left");
+        if (after.contexts != before.contexts && !isKept)
+            finding(std::to_string(after.contexts - before.contexts) + " contexts are left");
         if (after.memory > before.memory && grows(failing))
             finding(std::to_string(after.memory - before.memory) + " blocks of memory are left");
         if (this->handles() != handles)

@@ -1,7 +1,7 @@
 // Uses of the library's classes.
-#include "tests/sweep/scenarios.h"
+#include "bench/sweep/scenarios.h"
 
-#include "tests/sweep/faults.h"
+#include "bench/sweep/faults.h"
 
 #include "apps/develop/job.h"
 #include "apps/develop/options.h"
@@ -222,9 +222,13 @@ void DevelopSharpened() {
 
 std::vector<Scenario> const &Scenarios() {
     static std::vector<Scenario> const kScenarios = {
-        {"offscreen", OffscreenContext, Needs::OpenGL, "wglCreateContextAttribsARB SwapBuffers"},
-        {"windowed", WindowedContext, Needs::OpenGL, "wglCreateContextAttribsARB SwapBuffers"},
-        // A context of a version is tried first, then any; nothing looks at what a swap leads to.
+        // A context of a version is tried first, then any; the one that was current before is put
+        // back
+        // by a destructor; nothing looks at what a swap leads to.
+        {"offscreen", OffscreenContext, Needs::OpenGL,
+         "wglCreateContextAttribsARB wglMakeCurrent SwapBuffers"},
+        {"windowed", WindowedContext, Needs::OpenGL,
+         "wglCreateContextAttribsARB wglMakeCurrent SwapBuffers"},
         // Whether contexts share is found out by trying: what fails means that they do not.
         {"wrapped", WrappedContext, Needs::Context, "wglMakeCurrent glGenLists glIsList"},
         {"textures", Textures, Needs::Context, ""},

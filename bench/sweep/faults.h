@@ -27,8 +27,9 @@ bool FailedAtEnd();
 
 /// What the program holds at the moment.
 struct Holdings {
-    long names = 0;  ///< of OpenGL objects and WGL contexts, made less deleted
-    long memory = 0; ///< blocks of the C++ run-time library's that this thread asked for
+    long names = 0;    ///< of OpenGL objects, made less deleted
+    long contexts = 0; ///< of WGL
+    long memory = 0;   ///< blocks of the C++ run-time library's that this thread asked for
 };
 Holdings CurrentHoldings();
 
