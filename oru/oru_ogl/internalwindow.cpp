@@ -7,6 +7,8 @@
 
 #include <boost/format.hpp>
 
+#include <new>
+
 namespace ORU::OGL {
 
 namespace {
@@ -49,12 +51,22 @@ InternalWindow::~InternalWindow() {
 }
 
 void InternalWindow::destroy() {
+    ULONG_PTR const windowClass = ::GetClassLongPtrA(window_, GCW_ATOM);
     HDC const dc = ::GetDC(window_);
     ORU_ASSERT_TEXT("hDC != 0", dc);
     if (!::ReleaseDC(window_, dc))
         ORU_THROW_INTERNAL("Unable to release the device context");
     ::DestroyWindow(window_);
-    if (!::UnregisterClassA(className().c_str(), ::GetModuleHandleW(nullptr)))
+    // Without the memory for a name the class goes by its number: if it stayed, the next window at
+    // this address could not be made.
+    std::string name;
+    char const *key = reinterpret_cast<char const *>(windowClass);
+    try {
+        name = className();
+        key = name.c_str();
+    } catch (std::bad_alloc const &) {
+    }
+    if (!::UnregisterClassA(key, ::GetModuleHandleW(nullptr)))
         ORU_THROW_INTERNAL("Unable to unregister window class");
 }
 
