@@ -82,7 +82,7 @@ void CountNames(std::string const &name, std::uintptr_t const *arguments) {
     } else if (Begins(name, "wglCreateContext")) {
         ++gHoldings.contexts;
     } else if (name == "wglDeleteContext") {
-        --gHoldings.contexts;
+        gHoldings.contexts -= arguments[0] != 0;
     } else if (name.find("Lists") != std::string::npos || Begins(name, "glGenerate")) {
         return;
     } else if (Begins(name, "glGen")) {

@@ -97,7 +97,7 @@ private:
         judge(outcome, name, finding);
         // A program's names go with its context; a context that the system does not let go of
         // stays.
-        bool const isKept = name == "wglMakeCurrent" && FailedAtEnd();
+        bool const isKept = name == "wglMakeCurrent" && outcome.how == Outcome::Nothing;
         if (after.names != before.names && picture_.empty())
             finding(std::to_string(after.names - before.names) + " names are left");
         if (after.contexts != before.contexts && !isKept)

@@ -195,13 +195,11 @@ void OpenCL() {
 
 /// As the program's main does it.
 void DevelopPhoto(std::vector<std::string> const &arguments) {
-    int code = 0;
-    auto const options = Develop::ParseOptions(arguments, code);
-    if (!options)
-        throw std::logic_error("these options are refused");
     int result = 1;
     try {
-        result = Develop::RunJob(*options);
+        int code = 0;
+        auto const options = Develop::ParseOptions(arguments, code);
+        result = options ? Develop::RunJob(*options) : code;
     } catch (std::exception const &failure) {
         std::fprintf(stderr, "develop: %s\n", failure.what());
     }
