@@ -74,9 +74,9 @@ TEST_F(LadderTest, KnowsWhatIsReportedAndWhatItLacks) {
         EXPECT_EQ(record().isSupported(e), isThere) << name;
     }
     EXPECT_TRUE(record().isReported(GL_APPLE_FLUSH_RENDER));
-    EXPECT_EQ((std::vector<std::string>{"glFlushRenderAPPLE", "glFinishRenderAPPLE",
-                                        "glSwapAPPLE"}),
-              record().missingEntryPoints(GL_APPLE_FLUSH_RENDER));
+    EXPECT_EQ(
+        (std::vector<std::string>{"glFlushRenderAPPLE", "glFinishRenderAPPLE", "glSwapAPPLE"}),
+        record().missingEntryPoints(GL_APPLE_FLUSH_RENDER));
     EXPECT_EQ("", ExtensionManager::ExtensionEnumToString(UNKNOWN_OPENGL_EXTENSION));
 }
 
