@@ -5,9 +5,8 @@
 #include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/platformgl.h"
 
-#include <boost/format.hpp>
-
-#include <new>
+#include <cstdint>
+#include <cstdio>
 
 namespace ORU::OGL {
 
@@ -19,7 +18,7 @@ constexpr DWORD kExtendedStyle = WS_EX_APPWINDOW | WS_EX_WINDOWEDGE;
 } // namespace
 
 InternalWindow::InternalWindow(short x, short y) : window_(nullptr) {
-    std::string const name = className();
+    ClassName const name = className();
 
     WNDCLASSEXA windowClass = {};
     windowClass.cbSize = sizeof windowClass;
@@ -27,18 +26,18 @@ InternalWindow::InternalWindow(short x, short y) : window_(nullptr) {
     windowClass.lpfnWndProc = ::DefWindowProcW;
     windowClass.hInstance = ::GetModuleHandleW(nullptr);
     windowClass.hCursor = ::LoadCursorW(nullptr, reinterpret_cast<LPCWSTR>(IDC_ARROW));
-    windowClass.lpszClassName = name.c_str();
+    windowClass.lpszClassName = name.data();
     if (!::RegisterClassExA(&windowClass))
         ORU_THROW_INTERNAL("Unable to register window class");
 
     RECT frame = {0, 0, 8, 8};
     ::AdjustWindowRectEx(&frame, kStyle, FALSE, kExtendedStyle);
-    window_ = ::CreateWindowExA(kExtendedStyle, name.c_str(), nullptr,
+    window_ = ::CreateWindowExA(kExtendedStyle, name.data(), nullptr,
                                 kStyle | WS_CLIPSIBLINGS | WS_CLIPCHILDREN, x, y,
                                 frame.right - frame.left, frame.bottom - frame.top, nullptr,
                                 nullptr, windowClass.hInstance, nullptr);
     if (!window_) {
-        ::UnregisterClassA(name.c_str(), windowClass.hInstance);
+        ::UnregisterClassA(name.data(), windowClass.hInstance);
         ORU_THROW_INTERNAL("Unable to create window");
     }
 }
@@ -51,28 +50,23 @@ InternalWindow::~InternalWindow() {
 }
 
 void InternalWindow::destroy() {
-    ULONG_PTR const windowClass = ::GetClassLongPtrA(window_, GCW_ATOM);
     HDC const dc = ::GetDC(window_);
     ORU_ASSERT_TEXT("hDC != 0", dc);
     if (!::ReleaseDC(window_, dc))
         ORU_THROW_INTERNAL("Unable to release the device context");
     ::DestroyWindow(window_);
-    // Without the memory for a name the class goes by its number: if it stayed, the next window at
-    // this address could not be made.
-    std::string name;
-    char const *key = reinterpret_cast<char const *>(windowClass);
-    try {
-        name = className();
-        key = name.c_str();
-    } catch (std::bad_alloc const &) {
-    }
-    if (!::UnregisterClassA(key, ::GetModuleHandleW(nullptr)))
+    if (!::UnregisterClassA(className().data(), ::GetModuleHandleW(nullptr)))
         ORU_THROW_INTERNAL("Unable to unregister window class");
 }
 
-/// Unique among the live windows, as it carries the object's own address.
-std::string InternalWindow::className() const {
-    return (boost::format("OpenGL%p") % static_cast<void const *>(this)).str();
+/// Unique among the live windows, as it carries the object's own address. What Boost.Format makes
+/// of "OpenGL%p", without the streams of it: they drop the address when memory is short, and a
+/// class of another name would stay registered.
+InternalWindow::ClassName InternalWindow::className() const {
+    ClassName name;
+    std::snprintf(name.data(), name.size(), "OpenGL0x%llx",
+                  static_cast<unsigned long long>(reinterpret_cast<std::uintptr_t>(this)));
+    return name;
 }
 
 } // namespace ORU::OGL

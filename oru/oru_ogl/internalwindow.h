@@ -5,7 +5,7 @@
 #include "oru/core/math/tvec2.h"
 #include "oru/core/utility/windowsforward.h"
 
-#include <string>
+#include <array>
 
 namespace ORU::OGL {
 
@@ -29,7 +29,9 @@ public:
     HWND hWnd() const { return window_; }
 
 private:
-    std::string className() const;
+    using ClassName = std::array<char, 32>;
+
+    ClassName className() const;
     void destroy();
 
     HWND window_;
