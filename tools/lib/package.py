@@ -10,6 +10,7 @@ import hashlib
 import json
 import os
 import pathlib
+import posixpath
 import re
 import subprocess
 import sys
@@ -25,11 +26,14 @@ ROOT = pathlib.Path(__file__).resolve().parents[2]
 FILES = [
     ("packaging/README.md", "README.md"),
     ("CHANGELOG.md", "CHANGELOG.md"),
+    ("CONTRIBUTING.md", "CONTRIBUTING.md"),  # with the promise between versions
     ("LICENSE", "LICENSE"),
     ("SECURITY.md", "SECURITY.md"),
     ("docs/start.md", "docs/start.md"),
     ("docs/guide", "docs/guide"),
     ("docs/images", "docs/images"),
+    ("docs/architecture.md", "docs/architecture.md"),
+    ("docs/performance/README.md", "docs/performance/README.md"),
     ("docs/oruinfo.schema.json", "docs/oruinfo.schema.json"),
     ("examples", "examples"),
     ("apps/common", "apps/common"),  # what the examples share
@@ -80,6 +84,16 @@ def contents(build, prefix):
     return files
 
 
+def require_links(files):
+    """Every page's links lead to something in the package."""
+    folders = {str(parent) for name in files for parent in pathlib.PurePosixPath(name).parents}
+    for page in sorted(name for name in files if name.endswith(".md")):
+        for link in re.findall(r"\]\(([^)#:]+)(?:#[^)]*)?\)", files[page].decode("utf-8")):
+            target = posixpath.normpath(posixpath.join(posixpath.dirname(page), link))
+            if target not in files and target not in folders:
+                sys.exit(f"package: {page} links to {link}, which is not in the package")
+
+
 def site(scratch):
     """The documentation as tools/docs builds it, without its look in a browser."""
     folder = scratch / "site"
@@ -110,6 +124,7 @@ def main(build, output):
     with tempfile.TemporaryDirectory(dir=output, prefix=".package-") as scratch:
         scratch = pathlib.Path(scratch)
         files = contents(build, scratch / "prefix")
+        require_links(files)
         debug = {path: files.pop(path) for path in list(files) if path.endswith(DEBUG_DATA)}
         made = []
         for stem, part in ((name, files), (f"{name}-debug", debug)):

@@ -4,6 +4,7 @@
 #include "oru/oru_ogl/platformgl.h"
 
 #include <algorithm>
+#include <exception>
 #include <map>
 #include <mutex>
 #include <vector>
@@ -15,15 +16,27 @@ namespace {
 /// The places of all monitors: where these are the same, no output was moved, added or taken away.
 using Monitors = std::vector<RECT>;
 
-BOOL CALLBACK AddMonitor(HMONITOR, HDC, RECT *place, LPARAM monitors) {
-    reinterpret_cast<Monitors *>(monitors)->push_back(*place);
-    return TRUE;
+struct Listing {
+    Monitors monitors;
+    std::exception_ptr failure; ///< kept, for no exception may pass through the system's frames
+};
+
+BOOL CALLBACK AddMonitor(HMONITOR, HDC, RECT *place, LPARAM parameter) {
+    auto &listing = *reinterpret_cast<Listing *>(parameter);
+    try {
+        listing.monitors.push_back(*place);
+    } catch (...) {
+        listing.failure = std::current_exception();
+    }
+    return !listing.failure;
 }
 
 Monitors CurrentMonitors() {
-    Monitors monitors;
-    ::EnumDisplayMonitors(nullptr, nullptr, &AddMonitor, reinterpret_cast<LPARAM>(&monitors));
-    return monitors;
+    Listing listing;
+    ::EnumDisplayMonitors(nullptr, nullptr, &AddMonitor, reinterpret_cast<LPARAM>(&listing));
+    if (listing.failure)
+        std::rethrow_exception(listing.failure);
+    return std::move(listing.monitors);
 }
 
 bool AreSame(Monitors const &a, Monitors const &b) {
