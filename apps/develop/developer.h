@@ -3,6 +3,7 @@
 
 #include "apps/common/image.h"
 #include "apps/develop/areas.h"
+#include "apps/develop/colourspace.h"
 #include "apps/develop/pass.h"
 #include "apps/develop/sharpener.h"
 #include "apps/develop/spotpainter.h"
@@ -10,6 +11,7 @@
 #include "oru/oru_ogl/ogl/texture2.h"
 
 #include <memory>
+#include <optional>
 #include <vector>
 
 namespace Develop {
@@ -19,6 +21,8 @@ struct Recipe {
     double exposure = 0; ///< stops
     Sharpening sharpening;
     std::vector<Spot> spots;
+    std::optional<ColourSpace> convertTo; ///< another colour space than the photo's own
+    int quality = 90;                     ///< of JPEG files, 1 to 100
 };
 
 /// Takes a picture, or the part of it that is to be developed, through the stages, one after the
