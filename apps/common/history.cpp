@@ -176,8 +176,9 @@ Orientation TakeExif(Bytes exif, PictureHead &head) {
 
 /// What the first directory tells of a picture, not of how its pixels are stored.
 bool IsHistory(unsigned int tag) {
-    static constexpr unsigned int kTags[] = {IMAGE_DESCRIPTION, MAKE,   MODEL,         SOFTWARE,
-                                             DATE_TIME,         ARTIST, HOST_COMPUTER, COPYRIGHT};
+    static constexpr unsigned int kTags[] = {
+        IMAGE_DESCRIPTION, MAKE,      MODEL,  X_RESOLUTION,  Y_RESOLUTION, RESOLUTION_UNIT,
+        SOFTWARE,          DATE_TIME, ARTIST, HOST_COMPUTER, COPYRIGHT};
     constexpr unsigned int kFirstOfWindows = 0x9C9B, kLastOfWindows = 0x9C9F; // titles, keywords
     return std::find(std::begin(kTags), std::end(kTags), tag) != std::end(kTags) ||
            (tag >= kFirstOfWindows && tag <= kLastOfWindows);

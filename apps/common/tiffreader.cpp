@@ -235,6 +235,9 @@ private:
         orientation_ = number<std::uint16_t>(TIFFTAG_ORIENTATION);
         if (orientation_ < 1 || orientation_ > 8)
             orientation_ = kUpright;
+        if (!directory.isWhole)
+            losses.push_back(
+                "the file is cut off, and some of what it tells of its picture missing");
         if ((number<std::uint32_t>(TIFFTAG_SUBFILETYPE) & FILETYPE_REDUCEDIMAGE) != 0)
             refuse("that begins with a thumbnail, as raw files of cameras do");
         if (!::TIFFLastDirectory(tiff_.get()))

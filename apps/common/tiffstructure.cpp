@@ -88,7 +88,7 @@ TiffStructure::Directory TiffStructure::directory(std::uint64_t position) const 
     if (position == 0 || position > size)
         throw Failure("has no directory where one should be");
     std::uint64_t const count = numberAt(position, sizes.count);
-    if (count > (size - position) / sizes.entry())
+    if (count > (size - position - sizes.count) / sizes.entry())
         throw Failure("is cut off");
     Directory directory;
     directory.link = position + sizes.count + count * sizes.entry();
@@ -106,6 +106,8 @@ TiffStructure::Directory TiffStructure::directory(std::uint64_t position) const 
             field.position = numberAt(field.position, sizes.position);
         if (field.position <= size && field.bytes() <= size - field.position)
             directory.fields.push_back(field);
+        else
+            directory.isWhole = false;
     }
     return directory;
 }

@@ -41,6 +41,7 @@ public:
 
     struct Directory {
         std::vector<TiffField> fields; ///< those whose values lie in the file
+        bool isWhole = true;           ///< all their values do
         std::uint64_t link = 0;        ///< the position of the next directory's position
 
         /// The field of a tag, null without.

@@ -89,9 +89,14 @@ public:
     }
 
 private:
+    /// Adds a field, instead of what Exif data say.
     void add(unsigned int tag, TIFFDataType type, Bytes value) {
-        if (!value.empty())
-            tree_.entries.push_back({tag, static_cast<unsigned int>(type), std::move(value)});
+        if (value.empty())
+            return;
+        std::vector<TiffEntry> &entries = tree_.entries;
+        auto const isSame = [tag](TiffEntry const &entry) { return entry.tag == tag; };
+        entries.erase(std::remove_if(entries.begin(), entries.end(), isSame), entries.end());
+        entries.push_back({tag, static_cast<unsigned int>(type), std::move(value)});
     }
     void addShorts(unsigned int tag, std::vector<std::size_t> const &numbers) {
         Bytes value;

@@ -64,6 +64,8 @@ public:
             std::swap(head_.width, head_.height);
             if (head_.metadata.resolution)
                 std::swap(head_.metadata.resolution->x, head_.metadata.resolution->y);
+            if (head_.sampling)
+                std::swap(head_.sampling->horizontal, head_.sampling->vertical);
         }
     }
 
