@@ -23,6 +23,8 @@ TEST(ImageFile, FilesOfAnyName) {
     Image const image = RandomPicture({13, 5, 3, 16}, 1);
     App::WriteImage(path, image);
     EXPECT_EQ(App::ReadImage(path).pixels, image.pixels);
+    EXPECT_FAILURE("13 x 5 pixels are more than the GPU takes (12 x 12)",
+                   App::ReadImage(path, {12}));
 }
 
 // Palettes, colour keys, few bits and interlacing become plain pixels.

@@ -179,6 +179,31 @@ TEST(PictureFile, HistoryGoesFromFileToFile) {
         }
 }
 
+bool Contains(Bytes const &bytes, std::string const &text) {
+    return std::search(bytes.begin(), bytes.end(), text.begin(), text.end()) != bytes.end();
+}
+
+// What another program wrote is understood.
+TEST(PictureFile, ForeignHistory) {
+    for (std::string const name : {"history.jpg", "history.png", "history.tif"}) {
+        SCOPED_TRACE(name);
+        PictureHead const head = Opened(Foreign(name))->head();
+        App::Metadata const &history = head.metadata;
+        EXPECT_EQ(head.width, 17u);
+        EXPECT_THAT(history.losses, testing::IsEmpty());
+        EXPECT_EQ(head.colour.profile.size(), 132u);
+        EXPECT_TRUE(head.colour.isNamedSrgb);
+        EXPECT_TRUE(Contains(history.exif, "ORU"));
+        EXPECT_FALSE(Contains(history.exif, "\xFF\xD8\xFF"));
+        EXPECT_TRUE(Contains(history.xmp, "Leaf"));
+        EXPECT_TRUE(Contains(history.xmp, "<tiff:Orientation>1<"));
+        EXPECT_EQ(Contains(history.iptc, "Ulm"), head.kind != FileKind::Png);
+        ASSERT_TRUE(history.resolution.has_value());
+        bool const isInch = history.resolution->unit == App::Resolution::Unit::Inch;
+        EXPECT_NEAR(history.resolution->x * (isInch ? 1 : 2.54), 150, 0.02);
+    }
+}
+
 // Gamma and primaries are PNG's; JPEG says that it does not hold them.
 TEST(PictureFile, ColourTagsOfPng) {
     PictureHead head = HeadOf(FileKind::Png, {13, 7, 3, 8});
