@@ -106,8 +106,10 @@ TEST(PictureFile, LargeHeldInEveryWay) {
                     Upright(stored, orientation).pixels);
 }
 
+// Which lies on its side with the picture.
 TEST(PictureFile, JpegsKeepTheirSampling) {
-    PictureHead const head = HeadOf(FileKind::Jpeg, {40, 24, 3, 8});
+    PictureHead head = HeadOf(FileKind::Jpeg, {40, 24, 3, 8});
+    head.metadata.exif = ExifOf(6);
     Image const image = RandomPicture(head, 1);
     for (auto const &[horizontal, vertical] : {std::pair(1, 1), {2, 1}, {1, 2}, {2, 2}, {4, 1}}) {
         Bytes file;
@@ -121,7 +123,7 @@ TEST(PictureFile, JpegsKeepTheirSampling) {
         auto const sampling = Opened(file)->head().sampling;
         ASSERT_TRUE(sampling.has_value());
         EXPECT_EQ(std::pair(sampling->horizontal, sampling->vertical),
-                  std::pair(horizontal, vertical));
+                  std::pair(vertical, horizontal));
     }
 }
 
@@ -204,8 +206,8 @@ TEST(PictureFile, ForeignHistory) {
     }
 }
 
-// Gamma and primaries are PNG's; JPEG says that it does not hold them.
-TEST(PictureFile, ColourTagsOfPng) {
+// Gamma and primaries are PNG's; JPEG says that it does not hold them. Exif data know sRGB only.
+TEST(PictureFile, ColourTags) {
     PictureHead head = HeadOf(FileKind::Png, {13, 7, 3, 8});
     head.colour.gamma = 1.8;
     head.colour.primaries =
@@ -225,6 +227,10 @@ TEST(PictureFile, ColourTagsOfPng) {
     head.colour = {};
     head.colour.isNamedSrgb = true;
     EXPECT_TRUE(Opened(Encoded(head, pixels))->head().colour.isNamedSrgb);
+    head.colour.isNamedSrgb = false;
+    head.colour.profile.resize(1);
+    head.metadata.exif = ExifOf(1);
+    EXPECT_FALSE(Opened(Encoded(head, pixels))->head().colour.isNamedSrgb);
 }
 
 // Damaged Exif data are dropped, which is told, and never do harm.
