@@ -196,7 +196,8 @@ TiffTree HistoryTree(TiffStructure const &structure, std::vector<std::string> &l
                 ReadTiffTree(structure, structure.number(field), {INTEROPERABILITY_DIRECTORY});
             child.tag = field.tag;
             for (TiffEntry const &entry : child.entries)
-                if (entry.tag == MAKER_NOTE)
+                if (entry.tag == MAKER_NOTE &&
+                    std::find(losses.begin(), losses.end(), kMovedNote) == losses.end())
                     losses.push_back(kMovedNote);
             tree.children.push_back(std::move(child));
         }

@@ -40,7 +40,7 @@ fs::path NameOfScratch() {
     static std::atomic<unsigned int> sCount;
     std::error_code error;
     fs::path const folder = fs::temp_directory_path(error);
-    return folder / (L"develop-" + std::to_wstring(::GetCurrentProcessId()) + L"-" +
+    return folder / (L"oru-" + std::to_wstring(::GetCurrentProcessId()) + L"-" +
                      std::to_wstring(++sCount) + L".tmp");
 }
 

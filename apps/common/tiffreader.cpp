@@ -116,9 +116,15 @@ public:
         head_.width = number<std::uint32_t>(TIFFTAG_IMAGEWIDTH);
         head_.height = number<std::uint32_t>(TIFFTAG_IMAGELENGTH);
         RequirePixels(head_.width, head_.height);
+        if ((number<std::uint32_t>(TIFFTAG_SUBFILETYPE) & FILETYPE_REDUCEDIMAGE) != 0)
+            refuse("that begins with a thumbnail, as raw files of cameras do");
         readKind();
         requireUsableSize();
-        takeTags();
+        try {
+            takeTags();
+        } catch (Failure const &failure) {
+            throw Failure(std::string("damaged TIFF: a field ") + failure.what());
+        }
     }
 
     Orientation orientation() const { return orientation_; }
@@ -238,8 +244,6 @@ private:
         if (!directory.isWhole)
             losses.push_back(
                 "the file is cut off, and some of what it tells of its picture missing");
-        if ((number<std::uint32_t>(TIFFTAG_SUBFILETYPE) & FILETYPE_REDUCEDIMAGE) != 0)
-            refuse("that begins with a thumbnail, as raw files of cameras do");
         if (!::TIFFLastDirectory(tiff_.get()))
             losses.push_back("only the first picture of the TIFF is read");
     }
