@@ -24,7 +24,7 @@ run("${PYTHON}" -B "${CMAKE_CURRENT_LIST_DIR}/macros.py" "${package}/include"
     ${gcc} "-I${package}/include" -isystem "${OPENCL_INCLUDE_DIR}")
 
 run(${configure} -S "${package}/examples" -B "${work}/examples" "-Doru_DIR=${package}/lib/cmake/oru"
-    "-DCMAKE_TOOLCHAIN_FILE=${TOOLCHAIN_FILE}" # which knows where libpng and libjpeg are
+    "-DCMAKE_TOOLCHAIN_FILE=${TOOLCHAIN_FILE}" # which knows where libpng, libjpeg and libtiff are
     "-DORU_OPENCL_INCLUDE_DIR=${OPENCL_INCLUDE_DIR}")
 run("${CMAKE_COMMAND}" --build "${work}/examples")
 run(${EMULATOR} "${work}/examples/bin/hello_offscreen.exe" "${work}/hello.png")
