@@ -62,14 +62,6 @@ ColourSpace ColourSpace::DisplayP3() {
     return space;
 }
 
-std::optional<ColourSpace> ColourSpace::Named(std::string const &name) {
-    if (name == "srgb")
-        return Srgb();
-    if (name == "p3")
-        return DisplayP3();
-    return std::nullopt;
-}
-
 ColourSpace ColourSpace::Of(App::ColourTags const &tags, App::Shape const &shape,
                             std::vector<std::string> &warnings) {
     ColourSpace space = Srgb();
@@ -153,6 +145,14 @@ App::ColourTags ColourSpace::tags(App::PictureHead const &written) const {
     else
         tags.profile = WriteIccProfile(profileName_, Colours(written), curve, *primaries_);
     return tags;
+}
+
+std::optional<ColourSpace> NamedColourSpace(std::string const &name) {
+    if (name == "srgb")
+        return ColourSpace::Srgb();
+    if (name == "p3")
+        return ColourSpace::DisplayP3();
+    return std::nullopt;
 }
 
 } // namespace Develop

@@ -24,9 +24,6 @@ public:
     static ColourSpace Srgb();
     static ColourSpace DisplayP3();
 
-    /// The space of a name that people write: "srgb", "p3".
-    static std::optional<ColourSpace> Named(std::string const &name);
-
     /// Such as "Display P3 (its ICC profile)".
     std::string const &description() const { return description_; }
 
@@ -58,5 +55,8 @@ private:
     App::ColourTags tags_;                    ///< of the file
     std::string profileName_;                 ///< of the profile to make; empty for none
 };
+
+/// The space of a name that people write: "srgb" or "p3".
+std::optional<ColourSpace> NamedColourSpace(std::string const &name);
 
 } // namespace Develop
