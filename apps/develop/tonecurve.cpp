@@ -59,7 +59,7 @@ void Level(std::vector<double> &samples) {
         highest = std::max(highest, samples[i]);
         if (!(highest - lowest[i] <= 2 * kStoredStep))
             throw App::Failure("has a curve that falls");
-        samples[i] = (highest + lowest[i]) / 2;
+        samples[i] = std::clamp((highest + lowest[i]) / 2, 0.0, 1.0);
     }
 }
 

@@ -40,6 +40,8 @@ double LightOfLStar(double code) {
 std::vector<double> const kSrgbNumbers{2.4, 1 / 1.055, 0.055 / 1.055, 1 / 12.92, 0.04045};
 std::vector<double> const kLStarNumbers{3,    1 / 1.16, 0.16 / 1.16, 2700.0 / 24389,
                                         0.08, 0.002,    0.002};
+std::vector<double> const kFallingNumbers{
+    2.4, 1 / 1.055, 0.055 / 1.055, 1 / 12.92, 0.04045, -1.0 / 65536, 0};
 
 App::Shape Shape(unsigned int channels, unsigned int bits = 8) {
     return {4, 4, channels, bits};
@@ -117,6 +119,8 @@ TEST(Colour, EveryCodeHasTheLightOfItsFormulaAndComesBack) {
          Power(563.0 / 256)},
         {"sRGB", profile, Profile(RgbProfile(Maker::Function(3, kSrgbNumbers))), SrgbLight,
          kRounded},
+        {"falls by a rounding", profile, Profile(RgbProfile(Maker::Function(4, kFallingNumbers))),
+         SrgbLight, 2 * kRounded},
         {"ProPhoto", profile,
          Profile(RgbProfile(Maker::Function(3, {1.8, 1, 0, 1.0 / 16, 1.0 / 32}))), ProPhotoLight,
          kRounded},

@@ -77,14 +77,15 @@ public:
         return *this;
     }
 
-    /// Says by a table of 33 x 33 x 33 colours in CIE L*a*b* what another profile says.
-    ProfileMaker &table(App::Bytes const &other) {
+    /// Says by a table of colours in CIE L*a*b*, so many along each edge, what another profile
+    /// says.
+    ProfileMaker &table(App::Bytes const &other, unsigned int points = 33) {
         cmsHPROFILE const from =
             cmsOpenProfileFromMem(other.data(), static_cast<cmsUInt32Number>(other.size()));
         cmsHPROFILE const lab = cmsCreateLab4Profile(nullptr);
         cmsHTRANSFORM const transform = cmsCreateTransform(
             from, TYPE_RGB_16, lab, TYPE_Lab_16, INTENT_RELATIVE_COLORIMETRIC, cmsFLAGS_NOOPTIMIZE);
-        cmsStage *const colours = cmsStageAllocCLut16bit(nullptr, 33, 3, 3, nullptr);
+        cmsStage *const colours = cmsStageAllocCLut16bit(nullptr, points, 3, 3, nullptr);
         cmsStageSampleCLut16bit(
             colours,
             [](cmsUInt16Number const *in, cmsUInt16Number *out, void *cargo) -> cmsInt32Number {
