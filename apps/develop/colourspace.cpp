@@ -110,15 +110,19 @@ ColourSpace ColourSpace::OfProfile(App::Bytes const &profile, App::Shape const &
 }
 
 ColourSpace ColourSpace::OfGamma(App::ColourTags const &tags, App::Shape const &shape) {
+    bool const isLight = !tags.gamma && shape.bitsPerChannel == 32;
     CurvePtr const curve =
-        tags.gamma ? std::make_shared<ToneCurve const>(PowerCurve(*tags.gamma), CodeBits(shape))
-                   : SharedSrgbCurve();
-    std::string const name = tags.gamma ? GammaName(*tags.gamma) : "curve of sRGB";
+        tags.gamma || isLight
+            ? std::make_shared<ToneCurve const>(PowerCurve(tags.gamma.value_or(1)), CodeBits(shape))
+            : SharedSrgbCurve();
+    std::string const name = tags.gamma ? GammaName(*tags.gamma)
+                             : isLight  ? "linear light"
+                                        : "curve of sRGB";
     ColourSpace space(name + (tags.gamma && tags.primaries ? " and primaries (PNG gAMA, cHRM)"
                               : tags.gamma                 ? " (PNG gAMA)"
-                                                           : " and primaries (PNG cHRM)"),
+                                                           : " (assumed), primaries of the file"),
                       curve, tags.primaries.value_or(kSrgbPrimaries));
-    space.profileName_ = tags.primaries ? name + " and primaries of the file" : name;
+    space.profileName_ = tags.primaries ? name + ", primaries of the file" : name;
     space.tags_.gamma = tags.gamma;
     space.tags_.primaries = tags.primaries;
     return space;
@@ -135,8 +139,10 @@ ColourMatrix ColourSpace::matrixTo(ColourSpace const &other) const {
 }
 
 App::ColourTags ColourSpace::tags(App::PictureHead const &written) const {
-    bool const isToldByPng = tags_.gamma || tags_.primaries;
-    if (profileName_.empty() || (isToldByPng && written.kind == App::FileKind::Png))
+    bool const isTold = written.kind == App::FileKind::Png    ? tags_.gamma || tags_.primaries
+                        : written.kind == App::FileKind::Tiff ? tags_.primaries && !tags_.gamma
+                                                              : false;
+    if (profileName_.empty() || isTold)
         return tags_;
     StoredCurve const &curve = curves_[0]->stored();
     App::ColourTags tags;

@@ -325,7 +325,7 @@ TEST(Colour, TheSpaceIsToldOn) {
             ExpectCurve(
                 read.curve(0), 8, [&](double code) { return space.curve(0).decode(code); }, 2e-5);
             EXPECT_TRUE(channels == 1 || Difference(read.matrixTo(space), kIdentity) == 0);
-            EXPECT_EQ(tags.profile, space.tags(Written(App::FileKind::Tiff, channels)).profile);
+            EXPECT_EQ(tags.profile, space.tags(Written(App::FileKind::Jpeg, channels)).profile);
             EXPECT_EQ(Bytes(tags.profile.begin() + 24, tags.profile.begin() + 36),
                       Bytes({0x07, 0xea, 0, 1, 0, 1, 0, 0, 0, 0, 0, 0})); // no time of now
         }
@@ -338,6 +338,13 @@ TEST(Colour, FloatsAreLight) {
     EXPECT_TRUE(
         Space(Profile(RgbProfile(Maker::Function(0, {1}))), Shape(3, 32)).curve(2).isLinear());
     EXPECT_FALSE(Space({{}, true, {}, {}}, Shape(3, 32)).curve(0).isLinear());
+    ColourTags primaries;
+    primaries.primaries = kAdobePrimaries;
+    ColourSpace const space = Space(primaries, Shape(3, 32));
+    EXPECT_TRUE(space.curve(0).isLinear());
+    EXPECT_EQ(space.matrixTo(ColourSpace::Srgb()),
+              Space(Gamma(2.2, kAdobePrimaries)).matrixTo(ColourSpace::Srgb()));
+    EXPECT_EQ(space.tags(Written(App::FileKind::Tiff)).primaries, kAdobePrimaries);
 }
 
 } // namespace
