@@ -261,36 +261,6 @@ TEST(Colour, WhatCannotBeUsedIsWarnedOfOnce) {
     ExpectRefused(Gamma(1, App::Primaries{{{nan, 0}, {.64, 0}, {.3, 0}, {.15, 0}}}), "no colours");
 }
 
-// Whatever happens to a profile's bytes, it is refused or the codes still come back.
-TEST(Colour, DamagedProfilesAreRefusedOrHarmless) {
-    Bytes const whole[] = {RgbProfile(Maker::Function(3, kSrgbNumbers)),
-                           RgbProfile(Maker::Table(32, SrgbLight))};
-    std::size_t refused = 0;
-    auto const look = [&](Bytes bytes) {
-        std::vector<std::string> warnings;
-        ColourSpace const space = ColourSpace::Of(Profile(std::move(bytes)), Shape(3), warnings);
-        ASSERT_LE(warnings.size(), 1u);
-        refused += warnings.size();
-        for (std::size_t channel = 0; channel < 3; ++channel) {
-            auto const lights = space.curve(channel).lights(8);
-            auto const thresholds = space.curve(channel).thresholds(8);
-            for (std::size_t code = 0; code < lights.size(); ++code)
-                ASSERT_EQ(Nearest(thresholds, lights[code]), code);
-        }
-    };
-    for (Bytes const &bytes : whole)
-        for (std::size_t i = 0; i < bytes.size(); ++i) {
-            if (i % 8 == 0)
-                look(Bytes(bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(i)));
-            if (&bytes == whole && i % 4 != 3) // the lowest byte of a number, or some of a text
-                continue;
-            Bytes changed = bytes;
-            changed[i] ^= 0xff;
-            look(changed);
-        }
-    EXPECT_GT(refused, 100u);
-}
-
 App::PictureHead Written(App::FileKind kind, unsigned int channels = 3) {
     App::PictureHead head;
     head.channels = channels;
