@@ -29,8 +29,8 @@ unsigned int CodeBits(App::Shape const &shape) {
 
 /// Checked once, as every picture may need it.
 std::shared_ptr<ToneCurve const> SharedSrgbCurve() {
-    static auto const curve = std::make_shared<ToneCurve const>(SrgbCurve(), 16);
-    return curve;
+    static auto const kCurve = std::make_shared<ToneCurve const>(SrgbCurve(), 16);
+    return kCurve;
 }
 
 std::string GammaName(double gamma) {
@@ -46,7 +46,8 @@ std::string Warning(char const *subject, App::Failure const &failure) {
 
 } // namespace
 
-ColourSpace::ColourSpace(std::string description, CurvePtr curve, App::Primaries const &primaries)
+ColourSpace::ColourSpace(std::string description, CurvePtr const &curve,
+                         App::Primaries const &primaries)
     : description_(std::move(description)), curves_{curve, curve, curve}, toXyz_(ToXyz(primaries)),
       primaries_(primaries) {}
 

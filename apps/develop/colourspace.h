@@ -43,7 +43,7 @@ private:
     using CurvePtr = std::shared_ptr<ToneCurve const>;
 
     /// A space of primaries with the same curve for all.
-    ColourSpace(std::string description, CurvePtr curve, App::Primaries const &primaries);
+    ColourSpace(std::string description, CurvePtr const &curve, App::Primaries const &primaries);
 
     static ColourSpace OfProfile(App::Bytes const &profile, App::Shape const &shape);
     static ColourSpace OfGamma(App::ColourTags const &tags, App::Shape const &shape);
