@@ -8,6 +8,7 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
+#include <cstdint>
 #include <iterator>
 #include <memory>
 #include <new>
@@ -81,9 +82,10 @@ std::string Name(cmsHPROFILE profile) {
     return *name ? Printable(name) : "unnamed";
 }
 
-/// Refuses profiles that do not say what the codes of a picture of so many channels are.
+/// Refuses profiles that do not say what the codes of a picture of so many channels are. A file may
+/// have other numbers than the enumerations hold.
 void RequireFit(cmsHPROFILE profile, std::size_t channels) {
-    switch (cmsGetDeviceClass(profile)) {
+    switch (static_cast<std::uint32_t>(cmsGetDeviceClass(profile))) {
     case cmsSigInputClass:
     case cmsSigDisplayClass:
     case cmsSigOutputClass:
@@ -92,7 +94,7 @@ void RequireFit(cmsHPROFILE profile, std::size_t channels) {
     default:
         throw Failure("tells of no pictures, but links or names colours");
     }
-    cmsColorSpaceSignature const space = cmsGetColorSpace(profile);
+    auto const space = static_cast<std::uint32_t>(cmsGetColorSpace(profile));
     if (space != cmsSigRgbData && space != cmsSigGrayData)
         throw Failure(space == cmsSigCmykData ? "is for CMYK pictures"
                                               : "is for neither RGB nor grey pictures");
