@@ -4,11 +4,13 @@
 #include "apps/common/failure.h"
 
 #include <lcms2.h>
+#include <lcms2_plugin.h>
 
 #include <algorithm>
 #include <array>
 #include <cmath>
 #include <cstdint>
+#include <cstdlib>
 #include <iterator>
 #include <memory>
 #include <new>
@@ -22,6 +24,9 @@ using App::Failure;
 
 // The largest profiles in use are those of presses, of some megabytes.
 constexpr std::size_t kLargestProfile = std::size_t{32} << 20;
+
+// The most memory at once that a profile is given: a damaged one of some bytes may ask for any.
+constexpr std::size_t kLargestBlock = std::size_t{32} << 20;
 
 // Steps of grey at which a profile of tables is looked at.
 constexpr std::size_t kGreySteps = 4096;
@@ -51,10 +56,31 @@ std::string Printable(std::string text) {
     return text.substr(0, kLongest);
 }
 
+void *Allocate(cmsContext, cmsUInt32Number size) {
+    return size <= kLargestBlock ? std::malloc(size) : nullptr;
+}
+
+void *Reallocate(cmsContext, void *block, cmsUInt32Number size) {
+    return size <= kLargestBlock ? std::realloc(block, size) : nullptr;
+}
+
+void Release(cmsContext, void *block) {
+    std::free(block);
+}
+
 /// lcms2's state of one profile, with what it complained of last.
 class Context {
 public:
-    Context() : context_(cmsCreateContext(nullptr, &complaint_)) {
+    Context() {
+        cmsPluginMemHandler memory{
+            {cmsPluginMagicNumber, LCMS_VERSION, cmsPluginMemHandlerSig, nullptr},
+            Allocate,
+            Release,
+            Reallocate,
+            nullptr,
+            nullptr,
+            nullptr};
+        context_.reset(cmsCreateContext(&memory, &complaint_));
         if (!context_)
             throw std::bad_alloc();
         cmsSetLogErrorHandlerTHR(context_.get(), OnError);

@@ -8,4 +8,4 @@ add_library(lcms2 STATIC ${sources})
 target_include_directories(lcms2 PRIVATE include src)
 
 install(TARGETS lcms2 ARCHIVE)
-install(FILES include/lcms2.h DESTINATION include)
+install(FILES include/lcms2.h include/lcms2_plugin.h DESTINATION include)
