@@ -20,6 +20,7 @@ CROSS_BUILT = [
     (("include/png", "include/libpng", "lib/libpng"), "libpng1.6"),
     (("include/j", "lib/libjpeg"), "libjpeg-turbo"),
     (("include/tiff", "lib/libtiff"), "tiff"),
+    (("include/lcms2", "lib/liblcms2"), "lcms2"),
 ]
 
 
