@@ -2,7 +2,8 @@
 #include "apps/common/jpegreader.h"
 
 #include "apps/common/jpegerrors.h"
-#include "apps/common/orientation.h"
+#include "apps/common/jpegmarkers.h"
+#include "apps/common/uprightreader.h"
 
 #include <jerror.h>
 
@@ -76,14 +77,7 @@ public:
     }
     ~JpegReader() override { jpeg_destroy_decompress(&codec_); }
 
-    Orientation orientation() const {
-        Orientation found = kUpright;
-        for (auto const *marker = codec_.marker_list; marker && found == kUpright;
-             marker = marker->next)
-            if (marker->marker == JPEG_APP0 + 1)
-                found = ReadOrientation(marker->data, marker->data_length);
-        return found;
-    }
+    Orientation orientation() const { return orientation_; }
 
     std::string wholeReason() const override { return wholeReason_; }
 
@@ -107,13 +101,14 @@ private:
         run([&] {
             jpeg_create_decompress(&codec_);
             codec_.src = &source_.base;
-            jpeg_save_markers(&codec_, JPEG_APP0 + 1, 0xFFFF);
+            SaveJpegMarkers(&codec_);
             jpeg_read_header(&codec_, TRUE);
         });
         RequirePixels(codec_.image_width, codec_.image_height);
         head_.kind = FileKind::Jpeg;
         head_.width = codec_.image_width;
         head_.height = codec_.image_height;
+        orientation_ = TakeJpegMarkers(codec_, head_);
         codec_.out_color_space = outputColours();
         head_.channels = codec_.out_color_space == JCS_GRAYSCALE ? 1 : 3;
         if (head_.channels == 3)
@@ -175,6 +170,7 @@ private:
     JpegErrors errors_;
     JpegSource source_;
     jpeg_decompress_struct codec_ = {};
+    Orientation orientation_ = kUpright;
     bool isStarted_ = false;
     std::string wholeReason_;
 };
@@ -187,7 +183,9 @@ bool IsJpeg(Bytes const &beginning) {
 }
 
 std::unique_ptr<PictureReader> OpenJpeg(std::unique_ptr<Source> source) {
-    return std::make_unique<JpegReader>(std::move(source));
+    auto reader = std::make_unique<JpegReader>(std::move(source));
+    Orientation const orientation = reader->orientation();
+    return Upright(std::move(reader), orientation);
 }
 
 } // namespace App

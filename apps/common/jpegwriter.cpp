@@ -2,6 +2,7 @@
 #include "apps/common/jpegwriter.h"
 
 #include "apps/common/jpegerrors.h"
+#include "apps/common/jpegmarkers.h"
 
 #include <jerror.h>
 
@@ -58,7 +59,7 @@ public:
         : target_(std::move(sink)), shape_(head) {
         codec_.err = &errors_.base;
         try {
-            begin(encoding);
+            begin(head, encoding);
         } catch (...) {
             jpeg_destroy_compress(&codec_);
             throw;
@@ -82,7 +83,8 @@ public:
     }
 
 private:
-    void begin(Encoding const &encoding) {
+    void begin(PictureHead const &head, Encoding const &encoding) {
+        std::vector<JpegMarker> const markers = JpegMarkersOf(head, losses_);
         run([&] {
             jpeg_create_compress(&codec_);
             codec_.dest = &target_.base;
@@ -96,7 +98,12 @@ private:
                 codec_.comp_info[0].h_samp_factor = encoding.sampling.horizontal;
                 codec_.comp_info[0].v_samp_factor = encoding.sampling.vertical;
             }
+            if (head.metadata.resolution)
+                SetJpegDensity(&codec_, *head.metadata.resolution);
             jpeg_start_compress(&codec_, TRUE);
+            for (JpegMarker const &marker : markers)
+                jpeg_write_marker(&codec_, marker.marker, marker.bytes.data(),
+                                  static_cast<unsigned int>(marker.bytes.size()));
         });
     }
 

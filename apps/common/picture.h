@@ -39,6 +39,7 @@ struct Metadata {
     Bytes xmp;  ///< XML in UTF-8
     Bytes iptc; ///< IIM records
     std::optional<Resolution> resolution;
+    std::vector<std::string> losses; ///< what could not be read of it, for people
 };
 
 /// How JPEG stores colours: horizontal and vertical samples of luma for each of chroma's.

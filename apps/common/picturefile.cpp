@@ -8,6 +8,8 @@
 #include "apps/common/outputfile.h"
 #include "apps/common/pngreader.h"
 #include "apps/common/pngwriter.h"
+#include "apps/common/tiffreader.h"
+#include "apps/common/tiffwriter.h"
 #include "apps/common/unicode.h"
 
 namespace App {
@@ -24,6 +26,8 @@ std::unique_ptr<PictureReader> OpenPicture(std::unique_ptr<Source> source) {
         return OpenPng(std::move(source));
     if (IsJpeg(beginning))
         return OpenJpeg(std::move(source));
+    if (IsTiff(beginning))
+        return OpenTiff(std::move(source));
     throw Failure("neither a PNG, a JPEG nor a TIFF picture");
 }
 
@@ -53,7 +57,7 @@ std::unique_ptr<PictureWriter> CreatePicture(std::unique_ptr<Sink> sink, Picture
     case FileKind::Tiff:
         break;
     }
-    throw Failure("TIFF is not written");
+    return CreateTiff(std::move(sink), head);
 }
 
 std::unique_ptr<PictureWriter> CreatePicture(fs::path const &path, PictureHead const &head,

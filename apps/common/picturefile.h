@@ -52,7 +52,8 @@ public:
     /// @throws Failure when that is not possible; a file of this name that was there before stays
     virtual void finish() = 0;
 
-    /// What the file does not hold of its head, for people: "PNG holds no IPTC record".
+    /// What the file does not hold of its head, or its head of another file, for people: "PNG holds
+    /// no IPTC records".
     std::vector<std::string> const &losses() const { return losses_; }
 
 protected:

@@ -2,6 +2,8 @@
 #include "apps/common/pngreader.h"
 
 #include "apps/common/jumpguard.h"
+#include "apps/common/pngchunks.h"
+#include "apps/common/uprightreader.h"
 
 #include <png.h>
 
@@ -61,6 +63,8 @@ public:
         run([&] {
             png_set_user_limits(png_, PNG_UINT_31_MAX, PNG_UINT_31_MAX);
             png_set_read_fn(png_, this, Read);
+            // Chunks that tell nothing of how the pixels are stored are looked at elsewhere.
+            png_set_keep_unknown_chunks(png_, PNG_HANDLE_CHUNK_NEVER, nullptr, -1);
             png_read_info(png_, info_);
             png_set_expand(png_); // palettes, fewer than 8 bits, colour keys
             png_set_swap(png_);   // 16 bits come with the high byte first
@@ -72,9 +76,12 @@ public:
         head_.height = png_get_image_height(png_, info_);
         head_.channels = png_get_channels(png_, info_);
         head_.bitsPerChannel = png_get_bit_depth(png_, info_);
+        orientation_ = TakePngChunks(*source_, head_);
         isInterlaced_ = png_get_interlace_type(png_, info_) != PNG_INTERLACE_NONE;
     }
     ~PngReader() override { png_destroy_read_struct(&png_, &info_, nullptr); }
+
+    Orientation orientation() const { return orientation_; }
 
     std::string wholeReason() const override { return isInterlaced_ ? "interlaced PNG" : ""; }
 
@@ -133,6 +140,7 @@ private:
     JumpGuard guard_;
     png_structp png_ = nullptr;
     png_infop info_ = nullptr;
+    Orientation orientation_ = kUpright;
     bool isInterlaced_ = false;
     Image whole_; ///< when interlaced
     std::size_t y_ = 0;
@@ -146,7 +154,9 @@ bool IsPng(Bytes const &beginning) {
 }
 
 std::unique_ptr<PictureReader> OpenPng(std::unique_ptr<Source> source) {
-    return std::make_unique<PngReader>(std::move(source));
+    auto reader = std::make_unique<PngReader>(std::move(source));
+    Orientation const orientation = reader->orientation();
+    return Upright(std::move(reader), orientation);
 }
 
 } // namespace App

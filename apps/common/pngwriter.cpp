@@ -2,6 +2,7 @@
 #include "apps/common/pngwriter.h"
 
 #include "apps/common/jumpguard.h"
+#include "apps/common/pngchunks.h"
 
 #include <png.h>
 #include <zlib.h>
@@ -15,6 +16,12 @@ namespace {
 // Filtered photos have runs but hardly anything that repeats: the sample photos come out within 0.6
 // per cent of the size that zlib's default search gives, in a sixth of its time.
 constexpr int kCompressionStrategy = Z_RLE;
+
+// Trying all filters on each row takes half as much time again as the one that suits most photos,
+// and makes the sample photos 2 per cent smaller.
+constexpr int kFilter = PNG_FILTER_AVG;
+
+constexpr std::size_t kChunkBytes = 64 * 1024;
 
 void OnError(png_structp png, png_const_charp message) {
     static_cast<JumpGuard *>(png_get_error_ptr(png))->leave(message);
@@ -32,15 +39,20 @@ public:
         info_ = png_ ? png_create_info_struct(png_) : nullptr;
         if (!info_)
             throw std::bad_alloc();
+        std::vector<PngChunk> const chunks = PngChunksOf(head, losses_);
         run([&] {
             png_set_user_limits(png_, PNG_UINT_31_MAX, PNG_UINT_31_MAX);
             png_set_write_fn(png_, this, Write, nullptr);
             png_set_compression_strategy(png_, kCompressionStrategy);
+            png_set_compression_buffer_size(png_, kChunkBytes);
+            png_set_filter(png_, PNG_FILTER_TYPE_BASE, kFilter);
             png_set_IHDR(png_, info_, static_cast<png_uint_32>(shape_.width),
                          static_cast<png_uint_32>(shape_.height),
                          static_cast<int>(shape_.bitsPerChannel), kColourTypes[shape_.channels - 1],
                          PNG_INTERLACE_NONE, PNG_COMPRESSION_TYPE_DEFAULT, PNG_FILTER_TYPE_DEFAULT);
             png_write_info(png_, info_);
+            for (PngChunk const &chunk : chunks)
+                png_write_chunk(png_, chunk.name.data(), chunk.bytes.data(), chunk.bytes.size());
             if (shape_.bitsPerChannel == 16)
                 png_set_swap(png_);
         });
