@@ -20,6 +20,10 @@ constexpr double kLargestOffset = 0.01;
 // Files round what they store to this, or coarser.
 constexpr double kStoredStep = 1.0 / 65535;
 
+// The part of the codes that may have the same light.
+constexpr std::size_t kLongestFlat = 8;
+constexpr char const *kFlatText = "has a curve that is flat where codes differ";
+
 double Interpolated(std::vector<double> const &values, double place) {
     double const position = std::clamp(place, 0.0, 1.0) * static_cast<double>(values.size() - 1);
     std::size_t const index = std::min(static_cast<std::size_t>(position), values.size() - 2);
@@ -55,11 +59,12 @@ void Level(std::vector<double> &samples) {
         highest = std::max(highest, samples[i]);
         if (!(highest - lowest[i] <= 2 * kStoredStep))
             throw App::Failure("has a curve that falls");
-        samples[i] = (highest + lowest[i]) / 2;
+        samples[i] = std::clamp((highest + lowest[i]) / 2, 0.0, 1.0);
     }
 }
 
 /// Makes what is flat rise by less than a stored step, within what it lies between.
+/// @throws Failure when it is flat for long
 void Incline(std::vector<double> &samples) {
     std::size_t const size = samples.size();
     std::vector<double> const flat(samples);
@@ -69,6 +74,8 @@ void Incline(std::vector<double> &samples) {
             ++end;
         if (end - first < 2)
             continue;
+        if (end - first > size / kLongestFlat)
+            throw App::Failure(kFlatText);
         double reach = kStoredStep;
         if (first > 0)
             reach = std::min(reach, value - flat[first - 1]);
@@ -134,7 +141,7 @@ ToneCurve::ToneCurve(StoredCurve const &stored, unsigned int bits)
     Level(samples);
     Incline(samples);
     if (!IsDistinct(samples))
-        throw App::Failure("has a curve that is flat where codes differ");
+        throw App::Failure(kFlatText);
     repaired_ = std::move(samples);
 }
 
