@@ -16,7 +16,7 @@ std::string Measures(std::size_t width, std::size_t height) {
 std::string Shape::description() const {
     static char const *const kKinds[] = {"no channels", "grey", "grey and alpha", "RGB", "RGBA"};
     return Measures(width, height) + ", " + kKinds[channels] + ", " +
-           std::to_string(bitsPerChannel) + " bit";
+           std::to_string(bitsPerChannel) + (bitsPerChannel == 32 ? " bit float" : " bit");
 }
 
 bool operator==(Shape const &a, Shape const &b) {
@@ -24,9 +24,12 @@ bool operator==(Shape const &a, Shape const &b) {
            a.bitsPerChannel == b.bitsPerChannel;
 }
 
-void SizeLimit::require(std::size_t width, std::size_t height) const {
+void RequirePixels(std::size_t width, std::size_t height) {
     if (width == 0 || height == 0)
         throw Failure("has no pixels (" + Measures(width, height) + ")");
+}
+
+void SizeLimit::require(std::size_t width, std::size_t height) const {
     if (width > side || height > side)
         throw Failure(Measures(width, height) + " pixels are more than the GPU takes (" +
                       Measures(side, side) + ")");

@@ -8,7 +8,7 @@
 namespace App {
 
 /// Size and kind of a picture: one to four channels (grey; grey and alpha; red, green, blue; these
-/// and alpha), each an unsigned integer of 8 or 16 bits.
+/// and alpha), each an unsigned integer of 8 or 16 bits or a float of 32.
 struct Shape {
     std::size_t width = 0;
     std::size_t height = 0;
@@ -28,7 +28,7 @@ inline bool operator!=(Shape const &a, Shape const &b) {
     return !(a == b);
 }
 
-/// Pixels in rows from top to bottom, without gaps; 16-bit channels in the machine's byte order.
+/// Pixels in rows from top to bottom, without gaps; channels in the machine's byte order.
 struct Image : Shape {
     std::vector<unsigned char> pixels;
 
@@ -41,11 +41,14 @@ struct Image : Shape {
     unsigned char const *row(std::size_t y) const { return pixels.data() + y * rowBytes(); }
 };
 
+/// @throws Failure when a picture has no pixels
+void RequirePixels(std::size_t width, std::size_t height);
+
 /// The largest side, in pixels, of a picture that the GPU takes.
 struct SizeLimit {
-    std::size_t side;
+    std::size_t side = static_cast<std::size_t>(-1);
 
-    /// @throws Failure when a picture has no pixels or does not fit
+    /// @throws Failure when a picture does not fit
     void require(std::size_t width, std::size_t height) const;
 };
 

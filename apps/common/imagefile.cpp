@@ -1,40 +1,51 @@
-// Picture files.
+// Picture files, read and written whole.
 #include "apps/common/imagefile.h"
 
-#include "apps/common/failure.h"
-#include "apps/common/file.h"
-#include "apps/common/jpegcodec.h"
-#include "apps/common/pngcodec.h"
-
-#include <fstream>
-#include <system_error>
+#include "apps/common/picturefile.h"
+#include "apps/common/sink.h"
+#include "apps/common/source.h"
 
 namespace App {
 
-namespace fs = std::filesystem;
+namespace {
 
-Image ReadImage(fs::path const &path, SizeLimit limit) {
-    std::ifstream file = OpenFile(path);
-    std::vector<unsigned char> bytes;
-    // The first bytes tell whether to read the rest, which may be long.
-    AppendBytes(file, bytes, kPngSignatureBytes);
-    if (bytes.empty())
-        throw Failure("is empty");
-    bool const png = IsPng(bytes);
-    if (!png && !IsJpeg(bytes))
-        throw Failure("neither a PNG nor a JPEG picture");
-
-    std::error_code error;
-    std::uintmax_t const size = fs::file_size(path, error);
-    if (error)
-        throw Failure("cannot be read");
-    if (size > bytes.size())
-        AppendBytes(file, bytes, size - bytes.size());
-    return png ? DecodePng(bytes, limit) : DecodeJpeg(bytes, limit);
+Image ReadWhole(PictureReader &reader, SizeLimit limit) {
+    limit.require(reader.head().width, reader.head().height);
+    Image image(reader.head());
+    reader.read(image.pixels.data(), image.height);
+    return image;
 }
 
-void WriteImage(fs::path const &path, Image const &image) {
-    WriteFile(path, EncodePng(image));
+void WriteWhole(PictureWriter &writer, Image const &image) {
+    writer.write(image.pixels.data(), image.height);
+    writer.finish();
+}
+
+PictureHead HeadOf(Image const &image) {
+    PictureHead head;
+    static_cast<Shape &>(head) = image;
+    return head;
+}
+
+} // namespace
+
+Image ReadImage(std::filesystem::path const &path, SizeLimit limit) {
+    return ReadWhole(*OpenPicture(path), limit);
+}
+
+void WriteImage(std::filesystem::path const &path, Image const &image) {
+    WriteWhole(*CreatePicture(path, HeadOf(image), Encoding()), image);
+}
+
+Image Decode(std::vector<unsigned char> const &bytes, SizeLimit limit) {
+    return ReadWhole(*OpenPicture(std::make_unique<MemorySource>(bytes)), limit);
+}
+
+std::vector<unsigned char> EncodePng(Image const &image) {
+    Bytes bytes;
+    WriteWhole(*CreatePicture(std::make_unique<MemorySink>(bytes), HeadOf(image), Encoding()),
+               image);
+    return bytes;
 }
 
 } // namespace App

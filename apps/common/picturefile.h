@@ -2,6 +2,8 @@
 #pragma once
 
 #include "apps/common/picture.h"
+#include "apps/common/sink.h"
+#include "apps/common/source.h"
 
 #include <cstddef>
 #include <filesystem>
@@ -62,6 +64,7 @@ protected:
 /// Opens a PNG, JPEG or TIFF file, told by its first bytes, and reads what comes before its pixels.
 /// @throws Failure when there is no such file, or it cannot be read or used
 std::unique_ptr<PictureReader> OpenPicture(std::filesystem::path const &path);
+std::unique_ptr<PictureReader> OpenPicture(std::unique_ptr<Source> source);
 
 /// The kind of file that a name stands for by its extension; nothing for any other name.
 std::optional<FileKind> KindOfName(std::filesystem::path const &path);
@@ -78,5 +81,7 @@ struct Encoding {
 /// @throws Failure when it cannot be begun
 std::unique_ptr<PictureWriter> CreatePicture(std::filesystem::path const &path,
                                              PictureHead const &head, Encoding const &encoding);
+std::unique_ptr<PictureWriter> CreatePicture(std::unique_ptr<Sink> sink, PictureHead const &head,
+                                             Encoding const &encoding);
 
 } // namespace App

@@ -7,9 +7,10 @@
 #include "apps/common/picturefile.h"
 #include "apps/common/unicode.h"
 #include "apps/develop/cancellation.h"
-#include "apps/develop/choosesharpener.h"
+#include "apps/develop/choosedeveloper.h"
 #include "apps/develop/console.h"
 #include "apps/develop/openclruntime.h"
+#include "apps/develop/opengldeveloper.h"
 #include "apps/develop/options.h"
 #include "apps/develop/pace.h"
 #include "apps/develop/photolist.h"
@@ -211,14 +212,15 @@ private:
         App::OffscreenGpu const gpu(options_.trace);
         Introduction introduction(console_, gpu.description(), openCL);
 
-        std::unique_ptr<Sharpener> sharpener;
+        std::unique_ptr<Developer> developer;
         if (recipe.sharpening.isOn()) {
-            sharpener = ChooseSharpener(*openCL.get(), options_.device, gpu.context());
+            developer = ChooseDeveloper(*openCL.get(), options_.device, gpu.context());
             introduction.print();
-            console_.line("sharpening by " + sharpener->description());
+            console_.line("sharpening by " + developer->description());
+        } else {
+            developer = std::make_unique<OpenGLDeveloper>(nullptr);
         }
-        Developer developer(std::move(sharpener));
-        PhotoQueue queue(developer, recipe, App::ToPath(options_.base), options_.report);
+        PhotoQueue queue(*developer, recipe, App::ToPath(options_.base), options_.report);
 
         Stopwatch const stopwatch;
         Pace pace(0);

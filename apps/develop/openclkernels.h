@@ -1,10 +1,14 @@
-// The OpenCL kernels of the unsharp mask.
+// The OpenCL kernels of develop.
 #pragma once
 
 namespace Develop {
 
-/// OpenCL C 1.0. Pictures are float4 in rows without gaps; `colours` is 1 for channels that hold
-/// colours, 0 for alpha.
-extern char const *const kSharpenKernels;
+/// The unsharp mask of a texture that OpenCL and OpenGL share. OpenCL C 1.0. Pictures are float4 in
+/// rows without gaps; `colours` is 1 for channels that hold colours, 0 for alpha.
+extern char const *const kSharedKernels;
+
+/// All steps from codes to codes. OpenCL C 1.0. To be defined:
+/// SPAN, the pixels of a work item, and BITS of a channel, which some kernels are named after.
+extern char const *const kDevelopKernels;
 
 } // namespace Develop

@@ -106,22 +106,26 @@ cross_build() { # NAME SOURCE CMAKE_ARGUMENT...
 }
 
 # dependency NAME PACKAGE CMAKE_ARGUMENT...: fetches, builds and installs one library, and again when its
-# arguments, the way it is built or the toolchain file change.
+# arguments, the way it is built or the toolchain file change. A package without a CMakeLists.txt gets
+# cmake/deps/PACKAGE.cmake.
 dependency() {
     local name=$1 package=$2
     shift 2
-    local stamp=$ORU_DEPS_DIR/stamps/$name recipe
-    recipe="$package $* $(declare -f cross_build | cat - "$ORU_ROOT/cmake/toolchain-mingw64.cmake" | cksum)"
+    local stamp=$ORU_DEPS_DIR/stamps/$name recipe own=$ORU_ROOT/cmake/deps/$package.cmake
+    local recipes=("$ORU_ROOT/cmake/toolchain-mingw64.cmake")
+    [ ! -f "$own" ] || recipes+=("$own")
+    recipe="$package $* $(declare -f cross_build | cat - "${recipes[@]}" | cksum)"
     [ "$(cat "$stamp" 2>/dev/null)" != "$recipe" ] || return 0
     local source=$ORU_DEPS_DIR/src/$package
     if [ "$package" = googletest ]; then
         source=/usr/src/googletest
-    elif [ ! -f "$source/CMakeLists.txt" ]; then
+    elif [ ! -d "$source/debian" ]; then
         [ -n "${ORU_SOURCES_LISTED:-}" ] ||
             logged apt-sources "Listing Debian's source packages (in build/deps)" prepare_source_list
         ORU_SOURCES_LISTED=yes
         logged "fetch-$name" "Fetching the Debian source of $name" fetch_source "$package"
     fi
+    [ ! -f "$own" ] || cp "$own" "$source/CMakeLists.txt"
     logged "dep-$name" "Cross-building $name" cross_build "$name" "$source" "$@"
     mkdir -p "$ORU_DEPS_DIR/stamps"
     printf '%s' "$recipe" >"$stamp"
@@ -134,6 +138,7 @@ build_dependencies() {
     dependency png libpng1.6 -DPNG_SHARED=OFF -DPNG_TESTS=OFF \
         "-DZLIB_LIBRARY=$zlib/lib/libz.a" "-DZLIB_INCLUDE_DIR=$zlib/include"
     dependency jpeg libjpeg-turbo -DENABLE_SHARED=OFF -DWITH_TURBOJPEG=OFF
+    dependency lcms lcms2
     dependency gtest googletest -DBUILD_GMOCK=ON
     dependency benchmark benchmark -DGIT_VERSION=1.7.1 \
         -DBENCHMARK_ENABLE_TESTING=OFF -DBENCHMARK_ENABLE_WERROR=OFF

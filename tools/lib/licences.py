@@ -19,6 +19,7 @@ CROSS_BUILT = [
     (("include/tbb", "include/oneapi", "lib/libtbb"), "onetbb"),
     (("include/png", "include/libpng", "lib/libpng"), "libpng1.6"),
     (("include/j", "lib/libjpeg"), "libjpeg-turbo"),
+    (("include/lcms2", "lib/liblcms2"), "lcms2"),
 ]
 
 

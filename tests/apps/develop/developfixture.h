@@ -3,7 +3,6 @@
 
 #include "apps/common/file.h"
 #include "apps/common/imagefile.h"
-#include "apps/common/pngcodec.h"
 #include "apps/common/unicode.h"
 #include "tests/support/pictures.h"
 #include "tests/support/program.h"
