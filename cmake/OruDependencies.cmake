@@ -39,13 +39,10 @@ if(ORU_BUILD_APPS)
     set(ZLIB_USE_STATIC_LIBS ON)
     find_package(PNG REQUIRED)
     find_package(JPEG REQUIRED)
-<<<<<<< HEAD
     oru_find_headers(deps::lcms2 lcms2.h)
     find_library(ORU_LCMS2_LIBRARY NAMES lcms2 REQUIRED)
     target_link_libraries(deps::lcms2 INTERFACE "${ORU_LCMS2_LIBRARY}")
-=======
     find_package(TIFF REQUIRED)
->>>>>>> i14-io
     oru_find_headers(deps::cli11 CLI/CLI.hpp)
     oru_find_headers(deps::json nlohmann/json.hpp)
 endif()

@@ -15,10 +15,9 @@ bool HasOneCurve(ColourSpace const &space) {
     return &space.curve(0) == &space.curve(1) && &space.curve(0) == &space.curve(2);
 }
 
-bool IsLine(std::vector<float> const &lights, std::size_t levels) {
-    for (std::size_t i = 0; i < lights.size(); ++i)
-        if (std::abs(lights[i] * static_cast<float>(levels - 1) - static_cast<float>(i % levels)) >
-            1e-3f)
+bool AreLinear(ColourSpace const &space, std::size_t curves) {
+    for (std::size_t c = 0; c < curves; ++c)
+        if (!space.curve(c).isLinear())
             return false;
     return true;
 }
@@ -45,8 +44,8 @@ CodeTables::CodeTables(ColourSpace const &from, ColourSpace const &to, App::Shap
         thresholds.resize((c + 1) * levels, std::numeric_limits<float>::infinity());
     }
     if (isFloat) {
-        isLinear = IsLine(lights, levels);
-        becomesLinear = IsLine(thresholds, levels);
+        isLinear = AreLinear(from, curves);
+        becomesLinear = AreLinear(to, curves);
         return;
     }
     indices = std::max(std::size_t{4096}, levels);

@@ -2,7 +2,6 @@
 #include "apps/develop/opencldeveloper.h"
 
 #include "apps/develop/gaussian.h"
-#include "apps/develop/openclkernels.h"
 
 #include <algorithm>
 #include <cmath>
@@ -22,12 +21,6 @@ std::size_t PixelsOf(ORU::IntegerRect const &area) {
     return area.width() * area.height();
 }
 
-/// A spot as the kernels have it.
-struct KernelSpot {
-    std::int32_t x, y;
-    float restX, restY, radius, stops;
-};
-
 KernelSpot ToKernel(Spot const &spot) {
     double const x = std::floor(spot.x), y = std::floor(spot.y);
     return {static_cast<std::int32_t>(x),    static_cast<std::int32_t>(y),
@@ -36,14 +29,6 @@ KernelSpot ToKernel(Spot const &spot) {
 }
 
 } // namespace
-
-/// The kernels' `Tile`, member by member.
-struct OpenCLDeveloper::TileArguments {
-    std::int32_t width, height, pitch, channels, colours, reach, left, top, targetWidth,
-        targetHeight, x, y, tables, levels, indices, steps, isLinear, becomesLinear, hasMatrix,
-        spots;
-    float amount, exposure, gain;
-};
 
 OpenCLDeveloper::Kernels::Kernels(OCL::Program const &program, unsigned int bits)
     : decode(program.kernel("decode" + std::to_string(bits))), blurRows(program.kernel("blurRows")),
@@ -113,17 +98,17 @@ void OpenCLDeveloper::load(Task const &task) {
     fill(matrix_, matrix);
 }
 
-OpenCLDeveloper::TileArguments OpenCLDeveloper::argumentsOf(Tile const &tile) const {
+KernelTile ToKernel(Task const &task, Tile const &tile) {
     auto const integer = [](std::size_t value) { return static_cast<std::int32_t>(value); };
-    App::Shape const &shape = task_->shape;
-    CodeTables const &tables = task_->tables;
-    TileArguments arguments = {};
+    App::Shape const &shape = task.shape;
+    CodeTables const &tables = task.tables;
+    KernelTile arguments = {};
     arguments.width = integer(tile.source.width());
     arguments.height = integer(tile.source.height());
     arguments.pitch = integer(shape.width * shape.channels);
     arguments.channels = integer(shape.channels);
     arguments.colours = integer(shape.channels - (shape.hasAlpha() ? 1 : 0));
-    arguments.reach = integer(task_->recipe.reach());
+    arguments.reach = integer(task.recipe.reach());
     arguments.left = tile.target.offset().x - tile.source.offset().x;
     arguments.top = tile.target.offset().y - tile.source.offset().y;
     arguments.targetWidth = integer(tile.target.width());
@@ -136,10 +121,10 @@ OpenCLDeveloper::TileArguments OpenCLDeveloper::argumentsOf(Tile const &tile) co
     arguments.steps = integer(tables.steps);
     arguments.isLinear = tables.isLinear;
     arguments.becomesLinear = tables.becomesLinear;
-    arguments.hasMatrix = task_->matrix.has_value();
-    arguments.amount = static_cast<float>(task_->recipe.sharpening.amount);
-    arguments.exposure = static_cast<float>(task_->recipe.exposure);
-    arguments.gain = static_cast<float>(std::exp2(task_->recipe.exposure));
+    arguments.hasMatrix = task.matrix.has_value();
+    arguments.amount = static_cast<float>(task.recipe.sharpening.amount);
+    arguments.exposure = static_cast<float>(task.recipe.exposure);
+    arguments.gain = static_cast<float>(std::exp2(task.recipe.exposure));
     return arguments;
 }
 
@@ -178,9 +163,9 @@ bool OpenCLDeveloper::uploadSpots(Tile const &tile) {
         if (Touches(spot, tile.target))
             spots.push_back(ToKernel(spot));
     fill(spots_, spots);
-    TileArguments arguments = argumentsOf(tile);
+    KernelTile arguments = ToKernel(*task_, tile);
     arguments.spots = static_cast<std::int32_t>(spots.size());
-    fill(tile_, std::vector<TileArguments>{arguments});
+    fill(tile_, std::vector<KernelTile>{arguments});
     return !spots.empty();
 }
 

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "apps/develop/developer.h"
+#include "apps/develop/openclkernels.h"
 #include "apps/develop/openclprogram.h"
 #include "apps/develop/openclruntime.h"
 
@@ -22,7 +23,9 @@ public:
     explicit OpenCLDeveloper(OpenCLDevice const &device);
     ~OpenCLDeveloper() override;
 
-    std::string description() const override { return "OpenCL on " + device_.name; }
+    std::string description() const override {
+        return "OpenCL on " + device_.name + ", like all else";
+    }
     std::size_t sizeLimit() const override;
     void begin(Task const &task) override;
     void develop(Band const &photo, Tile const &tile, Band &developed) override;
@@ -33,14 +36,12 @@ private:
         Kernels(ORU::OCL::Program const &program, unsigned int bits);
         ORU::OCL::Kernel decode, blurRows, paintSpots, encode;
     };
-    struct TileArguments;
 
     Kernels &kernels(unsigned int bits);
     void warmUp(unsigned int bits);
     void load(Task const &task);
     template<class T>
     void fill(ReusedBuffer &buffer, std::vector<T> const &values);
-    TileArguments argumentsOf(Tile const &tile) const;
 
     void upload(Band const &photo, Tile const &tile);
     bool uploadSpots(Tile const &tile);
@@ -62,5 +63,8 @@ private:
 
     std::future<void> warmUp_; ///< uses all the others until it has ended
 };
+
+/// What the kernels are told of a tile, but for its spots.
+KernelTile ToKernel(Task const &task, Tile const &tile);
 
 } // namespace Develop

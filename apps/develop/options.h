@@ -22,7 +22,7 @@ struct Options {
     double exposure = 0;       ///< stops
     Sharpening sharpening;
     std::string openCLFolder; ///< where OpenCL.dll lies; empty for the system's folder
-    std::string device;       ///< OpenCL device to sharpen on, see ChooseSharpener
+    std::string device;       ///< OpenCL device to sharpen on, see ChooseDeveloper
     std::string spots;        ///< file of local edits, or empty
     std::string base;         ///< the picture developed without the spots, or empty
     bool report = false;      ///< whether to print how each picture was made

@@ -138,15 +138,12 @@ build_dependencies() {
     dependency png libpng1.6 -DPNG_SHARED=OFF -DPNG_TESTS=OFF \
         "-DZLIB_LIBRARY=$zlib/lib/libz.a" "-DZLIB_INCLUDE_DIR=$zlib/include"
     dependency jpeg libjpeg-turbo -DENABLE_SHARED=OFF -DWITH_TURBOJPEG=OFF
-<<<<<<< HEAD
     dependency lcms lcms2
-=======
     # Its programs and tests, and what it would compress with that hardly any photo is.
     dependency tiff tiff -Dtiff-tools=OFF -Dtiff-tests=OFF -Dtiff-contrib=OFF -Dtiff-docs=OFF -Dcxx=OFF \
         -Dlibdeflate=OFF -Djbig=OFF -Dlerc=OFF -Dlzma=OFF -Dzstd=OFF -Dwebp=OFF -Dpixarlog=OFF -Dold-jpeg=OFF \
         -Djpeg12=OFF -Dccitt=OFF -Dthunder=OFF -Dnext=OFF -Dlogluv=OFF -Dmdi=OFF \
         "-DZLIB_LIBRARY=$zlib/lib/libz.a" "-DZLIB_INCLUDE_DIR=$zlib/include"
->>>>>>> i14-io
     dependency gtest googletest -DBUILD_GMOCK=ON
     dependency benchmark benchmark -DGIT_VERSION=1.7.1 \
         -DBENCHMARK_ENABLE_TESTING=OFF -DBENCHMARK_ENABLE_WERROR=OFF

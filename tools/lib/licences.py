@@ -19,11 +19,8 @@ CROSS_BUILT = [
     (("include/tbb", "include/oneapi", "lib/libtbb"), "onetbb"),
     (("include/png", "include/libpng", "lib/libpng"), "libpng1.6"),
     (("include/j", "lib/libjpeg"), "libjpeg-turbo"),
-<<<<<<< HEAD
     (("include/lcms2", "lib/liblcms2"), "lcms2"),
-=======
     (("include/tiff", "lib/libtiff"), "tiff"),
->>>>>>> i14-io
 ]
 
 
