@@ -14,7 +14,7 @@ namespace {
 /// long that their memory counts.
 std::size_t BandRows(App::Shape const &picture, std::size_t reach, BandPlan::Limits const &limits) {
     std::size_t const affordable = limits.bytes / picture.rowBytes();
-    std::size_t const most = affordable > 3 * reach ? affordable - 2 * reach : reach;
+    std::size_t const most = std::max(reach / 2, affordable - std::min(affordable, 2 * reach));
     std::size_t const rows = std::max(limits.pixels / picture.width, std::min(4 * reach, most));
     std::size_t const fitting = limits.side > 2 * reach ? limits.side - 2 * reach : 1;
     return std::clamp<std::size_t>(rows, 1, std::min(picture.height, fitting));

@@ -10,10 +10,10 @@ namespace Develop {
 
 namespace {
 
-// Of all bands together. Fewer than three would make the stages wait for each other, more than six
-// make nothing faster.
+// Of all bands together. With fewer than three the stages wait for each other, more than six make
+// nothing faster.
 constexpr std::size_t kMostBytes = std::size_t{64} << 20;
-constexpr std::size_t kFewestBands = 3;
+constexpr std::size_t kFewestBands = 2;
 constexpr std::size_t kMostBands = 6;
 
 std::size_t BandsAtOnce(BandPlan const &plan, App::Shape const &picture) {

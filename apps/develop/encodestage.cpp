@@ -32,6 +32,7 @@ void EncodeStage::finish(PhotoWork &work) {
     {
         TimedScope const timed(work.encoding);
         writer_->finish();
+        work.isComplete = true;
     }
     for (std::string const &loss : writer_->losses())
         work.result.notes.push_back(loss);

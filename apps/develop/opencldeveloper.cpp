@@ -105,7 +105,6 @@ KernelTile ToKernel(Task const &task, Tile const &tile) {
     KernelTile arguments = {};
     arguments.width = integer(tile.source.width());
     arguments.height = integer(tile.source.height());
-    arguments.pitch = integer(shape.width * shape.channels);
     arguments.channels = integer(shape.channels);
     arguments.colours = integer(shape.channels - (shape.hasAlpha() ? 1 : 0));
     arguments.reach = integer(task.recipe.reach());
@@ -151,10 +150,22 @@ void OpenCLDeveloper::develop(Band const &photo, Tile const &tile, Band &develop
 }
 
 void OpenCLDeveloper::upload(Band const &photo, Tile const &tile) {
-    // From the first pixel of the source to its last, in rows as long as the picture's.
-    std::size_t const bytes = (tile.source.height() - 1) * photo.rowBytes() +
-                              tile.source.width() * task_->shape.bytesPerPixel();
-    queue_.enqueueBlockingWrite(codes_.reserve(context_, bytes), 0, bytes, photo.at(tile.source));
+    std::size_t const rowBytes = tile.source.width() * task_->shape.bytesPerPixel();
+    std::size_t const bytes = rowBytes * tile.source.height();
+    unsigned char const *codes = photo.at(tile.source);
+    if (rowBytes != photo.rowBytes()) {
+        codes = hostMemory(bytes);
+        for (std::size_t y = 0; y < tile.source.height(); ++y)
+            std::copy_n(photo.at(tile.source) + y * photo.rowBytes(), rowBytes,
+                        host_.data() + y * rowBytes);
+    }
+    queue_.enqueueBlockingWrite(codes_.reserve(context_, bytes), 0, bytes, codes);
+}
+
+unsigned char *OpenCLDeveloper::hostMemory(std::size_t bytes) {
+    if (host_.size() < bytes)
+        host_.resize(bytes);
+    return host_.data();
 }
 
 bool OpenCLDeveloper::uploadSpots(Tile const &tile) {
@@ -195,9 +206,7 @@ void OpenCLDeveloper::readBack(Tile const &tile, Band &developed) {
         queue_.enqueueBlockingRead(developed_.get(), 0, bytes, developed.at(tile.target));
         return;
     }
-    if (host_.size() < bytes)
-        host_.resize(bytes);
-    queue_.enqueueBlockingRead(developed_.get(), 0, bytes, host_.data());
+    queue_.enqueueBlockingRead(developed_.get(), 0, bytes, hostMemory(bytes));
     for (std::size_t y = 0; y < tile.target.height(); ++y)
         std::copy_n(host_.data() + y * rowBytes, rowBytes,
                     developed.at(tile.target) + y * developed.rowBytes());

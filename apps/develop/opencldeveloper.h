@@ -48,6 +48,7 @@ private:
     void setArguments(Kernels &kernels);
     void launch(ORU::OCL::Kernel const &kernel, std::size_t width, std::size_t height);
     void readBack(Tile const &tile, Band &developed);
+    unsigned char *hostMemory(std::size_t bytes);
 
     OpenCLDevice device_;
     std::size_t span_; ///< pixels of a work item
@@ -59,7 +60,7 @@ private:
     ReusedBuffer lights_, index_, thresholds_, weights_, matrix_; ///< of the picture
     ReusedBuffer tile_, spots_;
     ReusedBuffer codes_, light_, rows_, stops_, developed_;
-    std::vector<unsigned char> host_;
+    std::vector<unsigned char> host_; ///< rows that are shorter than the picture's
 
     std::future<void> warmUp_; ///< uses all the others until it has ended
 };

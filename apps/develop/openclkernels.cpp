@@ -53,7 +53,6 @@ kernel void sharpenColumns(global float4 *light, global float4 const *rows, int2
 char const *const kDevelopKernels = R"(
 typedef struct {
     int width, height;             // of the source
-    int pitch;                     // values from row to row of its codes
     int channels, colours;         // all of a pixel; those that are not alpha
     int reach;                     // of the blur
     int left, top;                 // of the target in the source
@@ -81,7 +80,7 @@ typedef struct {
         int const tables = tile->tables, levels = tile->levels, isLinear = tile->isLinear;         \
         int const first = (int)get_global_id(0) * SPAN;                                            \
         int const end = min(first + SPAN, width + 2 * reach);                                      \
-        global CODE const *restrict row = codes + (int)get_global_id(1) * tile->pitch;             \
+        global CODE const *restrict row = codes + (int)get_global_id(1) * width * channels;        \
         global float *restrict target =                                                            \
             light + (int)get_global_id(1) * (width + 2 * reach) * channels;                        \
         for (int p = first; p < end; ++p) {                                                        \
@@ -186,7 +185,7 @@ kernel void paintSpots(constant Tile *tile, global Spot const *restrict spots,
         int const count = min(SPAN, tile->targetWidth - first);                                    \
         int const y = get_global_id(1);                                                            \
         global CODE const *restrict source =                                                       \
-            codes + (y + tile->top) * tile->pitch + (tile->left + first) * channels;               \
+            codes + ((y + tile->top) * tile->width + tile->left + first) * channels;               \
         global CODE *restrict target = developed + (y * tile->targetWidth + first) * channels;     \
         CODE_OF                                                                                    \
     }

@@ -15,9 +15,8 @@ extern char const *const kDevelopKernels;
 
 /// Their `Tile`, member by member.
 struct KernelTile {
-    std::int32_t width, height, pitch, channels, colours, reach, left, top, targetWidth,
-        targetHeight, x, y, tables, levels, indices, steps, isLinear, becomesLinear, hasMatrix,
-        spots;
+    std::int32_t width, height, channels, colours, reach, left, top, targetWidth, targetHeight, x,
+        y, tables, levels, indices, steps, isLinear, becomesLinear, hasMatrix, spots;
     float amount, exposure, gain;
 };
 

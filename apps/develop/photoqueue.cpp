@@ -6,6 +6,7 @@
 #include "apps/develop/encodestage.h"
 
 #include <algorithm>
+#include <exception>
 #include <memory>
 #include <thread>
 
@@ -32,7 +33,7 @@ struct Belt {
 class Worker {
 public:
     template<class Work>
-    Worker(Belt &belt, Work const &work) : belt_(belt), thread_(work) {}
+    Worker(Belt &belt, Work const &work) : belt_(belt), thread_([this, work] { attempt(work); }) {}
     ~Worker() {
         if (!thread_.joinable())
             return;
@@ -42,10 +43,26 @@ public:
     Worker(Worker const &) = delete;
     Worker &operator=(Worker const &) = delete;
 
-    void join() { thread_.join(); }
+    /// Waits for the end of the work. @throws what it threw
+    void join() {
+        thread_.join();
+        if (failure_)
+            std::rethrow_exception(failure_);
+    }
 
 private:
+    template<class Work>
+    void attempt(Work const &work) {
+        try {
+            work();
+        } catch (...) { // no memory, for what fails otherwise is the photo's failure
+            failure_ = std::current_exception();
+            belt_.close();
+        }
+    }
+
     Belt &belt_;
+    std::exception_ptr failure_;
     std::thread thread_;
 };
 
@@ -79,7 +96,7 @@ void PhotoQueue::run(std::vector<Photo> const &photos,
     });
     auto const tell = [&] {
         while (auto const work = belt.done.tryPop())
-            if (!isCancelled)
+            if ((*work)->isComplete || (*work)->result.failure)
                 onDone((*work)->result);
     };
     DevelopStage stage(developer_, recipe_, !base_.empty(), withReport_);

@@ -43,6 +43,7 @@ public:
     }
 
     PhotoResult result;
+    bool isComplete = false; ///< whether the file has its name
     std::optional<BandPlan> plan;
     App::PictureHead developedHead;
     Stopwatch sinceBegin;
