@@ -16,15 +16,28 @@ using App::Image;
 
 namespace {
 
+/// Every way to develop, made once: a process opens one OpenCL runtime.
+struct Ways {
+    Ways() {
+        OpenCLDevice const device = runtime.devices().at(0);
+        all["opencl"] = std::make_unique<OpenCLDeveloper>(device);
+        // The compiler of PoCL 3 mixes up what contexts of two threads build at the same time.
+        Recipe const nothing;
+        all["opencl"]->begin(Task({1, 1, 3, 8}, ColourSpace::Srgb(), nothing));
+        all["glsl"] = std::make_unique<OpenGLDeveloper>(std::make_unique<GlslSharpener>("here"));
+        all["shared"] = std::make_unique<OpenGLDeveloper>(
+            std::make_unique<OpenCLSharpener>(device, gpu.context()));
+    }
+
+    App::OffscreenGpu gpu{std::string()};
+    OpenCLRuntime runtime{App::ToText(ProgramFolder() / "ocl_runtime")};
+    std::map<std::string, std::unique_ptr<Developer>> all;
+};
+
 class Bands : public DevelopFixture {
 protected:
-    Bands() {
-        std::vector<OpenCLDevice> const devices = runtime_.devices();
-        ways_["glsl"] = std::make_unique<OpenGLDeveloper>(std::make_unique<GlslSharpener>("here"));
-        ways_["opencl"] = std::make_unique<OpenCLDeveloper>(devices.at(0));
-        ways_["shared"] = std::make_unique<OpenGLDeveloper>(
-            std::make_unique<OpenCLSharpener>(devices.at(0), gpu_.context()));
-    }
+    static void SetUpTestSuite() { ways_ = std::make_unique<Ways>(); }
+    static void TearDownTestSuite() { ways_.reset(); }
 
     /// Develops `in.png`. @return what it became
     Image developed(Developer &developer, Recipe const &recipe, BandPlan::Limits const &limits,
@@ -44,10 +57,10 @@ protected:
         return read("out.png");
     }
 
-    App::OffscreenGpu gpu_{std::string()};
-    OpenCLRuntime runtime_{App::ToText(ProgramFolder() / "ocl_runtime")};
-    std::map<std::string, std::unique_ptr<Developer>> ways_;
+    static std::unique_ptr<Ways> ways_;
 };
+
+std::unique_ptr<Ways> Bands::ways_;
 
 double WorstDifference(Image const &a, Image const &b) {
     double worst = 0;
@@ -59,8 +72,8 @@ double WorstDifference(Image const &a, Image const &b) {
 // Neither the cut into bands and tiles nor computing over a base only what spots touch changes a
 // byte. The ways differ by what floats round.
 TEST_F(Bands, ChangeNoByte) {
-    App::Shape const shapes[] = {{61, 47, 3, 8}, {50, 64, 2, 16}, {33, 71, 4, 8}, {1, 80, 1, 8}};
-    BandPlan::Limits const cuts[] = {{1, 20, 1}, {300, 40, 1}, {700, 64, std::size_t{1} << 20}};
+    App::Shape const shapes[] = {{61, 47, 3, 8}, {50, 64, 2, 16}, {1, 80, 4, 8}};
+    BandPlan::Limits const cuts[] = {{1, 20, 1}, {700, 64, std::size_t{1} << 20}};
     for (App::Shape const &shape : shapes) {
         write("in.png", RandomPicture(shape, 5));
         for (double const amount : {0.0, 1.5}) {
@@ -70,7 +83,7 @@ TEST_F(Bands, ChangeNoByte) {
             Recipe recipe = plain;
             recipe.spots = {{5.5, 7.25, 6, 1}, {9, 8, 5, -2}, {45, 60, 8, 0.5}, {30, 20, 3, 2}};
             Image first;
-            for (auto const &[name, way] : ways_) {
+            for (auto const &[name, way] : ways_->all) {
                 SCOPED_TRACE(name + ", " + shape.description() + ", " + std::to_string(amount));
                 Image const whole = developed(*way, recipe, BandPlan::Limits());
                 write("base.png", developed(*way, plain, BandPlan::Limits()));
@@ -120,7 +133,7 @@ TEST_F(Bands, CodesBecomeThoseOfAnotherSpace) {
         std::copy(photo.pixels.begin(), photo.pixels.end(), source.row(0));
         target.hold({0, photo.height}, photo);
         ORU::IntegerRect const all = PixelRect(0, 0, photo.width, photo.height);
-        for (auto const &[name, way] : ways_) {
+        for (auto const &[name, way] : ways_->all) {
             way->begin(task);
             way->develop(source, {all, all}, target);
             Image result = photo;
