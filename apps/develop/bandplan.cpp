@@ -20,6 +20,13 @@ std::size_t BandRows(App::Shape const &picture, std::size_t reach, BandPlan::Lim
     return std::clamp<std::size_t>(rows, 1, std::min(picture.height, fitting));
 }
 
+/// A tile may be wider than its share by half, counted with the rows that it reads.
+std::size_t TileWidth(std::size_t rows, std::size_t reach, BandPlan::Limits const &limits) {
+    std::size_t const share = limits.pixels * 3 / 2 / (rows + 2 * reach);
+    std::size_t const fitting = limits.side > 2 * reach ? limits.side - 2 * reach : 1;
+    return std::max<std::size_t>(1, std::min(std::max(share, 2 * reach), fitting));
+}
+
 /// The part of an interval of a picture that is within `reach` of another, and its size.
 struct Interval {
     std::size_t first, size;
@@ -38,11 +45,7 @@ IntegerRect PixelRect(std::size_t left, std::size_t top, std::size_t width, std:
 
 BandPlan::BandPlan(App::Shape const &picture, std::size_t reach, Limits const &limits)
     : width_(picture.width), height_(picture.height), reach_(reach),
-      rows_(BandRows(picture, reach, limits)),
-      tileWidth_(std::max<std::size_t>(
-          1,
-          std::min(limits.pixels / rows_, limits.side > 2 * reach ? limits.side - 2 * reach : 1))) {
-}
+      rows_(BandRows(picture, reach, limits)), tileWidth_(TileWidth(rows_, reach, limits)) {}
 
 std::size_t BandPlan::bands() const {
     return (height_ + rows_ - 1) / rows_;
