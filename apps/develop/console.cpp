@@ -5,8 +5,6 @@
 
 #include <io.h>
 
-#include <algorithm>
-#include <cstdio>
 #include <cstdlib>
 
 namespace Develop {
@@ -14,15 +12,19 @@ namespace Develop {
 namespace {
 
 constexpr std::size_t kBarCells = 24;
-constexpr std::size_t kNameBytes = 40;
 
-/// ORU_TERMINAL tells of a terminal behind the pipe that a script put between.
-bool HasTerminal() {
-    return _isatty(_fileno(stdout)) || std::getenv("ORU_TERMINAL") != nullptr;
+/// ORU_TERMINAL tells of a terminal behind the pipe that a script put at the standard output.
+bool IsTerminal(std::FILE *file) {
+    return _isatty(_fileno(file)) || (file == stdout && std::getenv("ORU_TERMINAL") != nullptr);
 }
 
-/// A text without the drive that ORU_ROOT_DRIVE names: a script that runs on a system without
-/// drives put it before absolute paths, and who gave those shall see them again.
+void Write(std::FILE *file, std::string const &text) {
+    std::fwrite(text.data(), 1, text.size(), file);
+    std::fflush(file);
+}
+
+} // namespace
+
 std::string WithoutDrive(std::string text) {
     char const *const drive = std::getenv("ORU_ROOT_DRIVE");
     if (drive == nullptr || *drive == '\0')
@@ -33,63 +35,56 @@ std::string WithoutDrive(std::string text) {
     return text;
 }
 
-void Write(std::FILE *file, std::string const &text) {
-    std::fwrite(text.data(), 1, text.size(), file);
-    std::fflush(file);
-}
-
-/// The end of a name that is too long for a line, cut between characters of UTF-8.
-std::string Shortened(std::string const &name) {
-    if (name.size() <= kNameBytes)
-        return name;
-    std::size_t begin = name.size() - kNameBytes;
-    while (begin < name.size() && (static_cast<unsigned char>(name[begin]) & 0xC0u) == 0x80u)
-        ++begin;
-    return "..." + name.substr(begin);
-}
-
-} // namespace
-
-Console::Console(bool quiet) : quiet_(quiet), hasBar_(!quiet && HasTerminal()) {
+Console::Console(bool quiet, std::FILE *output)
+    : quiet_(quiet), output_(output), hasBar_(!quiet && IsTerminal(output)) {
     App::PrepareConsole();
 }
 
 Console::~Console() {
-    clearBar();
+    endProgress();
 }
 
 void Console::line(std::string const &text) {
     if (quiet_)
         return;
     clearBar();
-    Write(stdout, WithoutDrive(text) + "\n");
+    Write(output_, WithoutDrive(text) + "\n");
     drawBar();
 }
 
-void Console::problem(std::string const &name, std::string const &reason) {
+void Console::problem(std::string const &text) {
     hadProblems_ = true;
+    notice(text);
+}
+
+void Console::notice(std::string const &text) {
     clearBar();
-    Write(stderr, WithoutDrive("develop: " + name + ": " + reason) + "\n");
+    Write(stderr, WithoutDrive("develop: " + text) + "\n");
     drawBar();
 }
 
-void Console::progress(std::size_t done, std::size_t total, std::string const &current) {
+void Console::progress(std::size_t done, std::size_t total, std::string const &pace) {
     if (!hasBar_ || total < 2)
         return;
     clearBar();
     std::size_t const filled = kBarCells * done / total;
     bar_ = "[" + std::string(filled, '#') + std::string(kBarCells - filled, '.') + "] " +
-           std::to_string(done) + "/" + std::to_string(total) + " " + Shortened(current);
+           std::to_string(done) + "/" + std::to_string(total) + (pace.empty() ? "" : ", ") + pace;
     drawBar();
+}
+
+void Console::endProgress() {
+    clearBar();
+    bar_.clear();
 }
 
 void Console::clearBar() {
     if (!bar_.empty())
-        Write(stdout, "\r\x1b[K");
+        Write(output_, "\r\x1b[K");
 }
 
 void Console::drawBar() {
-    Write(stdout, bar_);
+    Write(output_, bar_);
 }
 
 } // namespace Develop

@@ -2,14 +2,20 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdio>
 #include <string>
 
 namespace Develop {
 
+/// A text without the drive that ORU_ROOT_DRIVE names: a script that runs on a system without
+/// drives put it before absolute paths, and who gave those shall see them again.
+std::string WithoutDrive(std::string text);
+
 class Console {
 public:
     /// @param quiet whether only problems are printed
-    explicit Console(bool quiet);
+    /// @param output where everything else goes
+    Console(bool quiet, std::FILE *output);
     ~Console();
     Console(Console const &) = delete;
     Console &operator=(Console const &) = delete;
@@ -18,18 +24,25 @@ public:
     void line(std::string const &text);
 
     /// Prints a line to the error output, which makes `hadProblems` true.
-    void problem(std::string const &name, std::string const &reason);
+    void problem(std::string const &text);
     bool hadProblems() const { return hadProblems_; }
 
+    /// As `problem`, for what was wished.
+    void notice(std::string const &text);
+
     /// Shows how far the work is, on a terminal and when there is more than one thing to do.
-    /// @param current what is being worked on
-    void progress(std::size_t done, std::size_t total, std::string const &current);
+    /// @param pace how fast it goes, or empty
+    void progress(std::size_t done, std::size_t total, std::string const &pace);
+
+    /// Takes the progress bar away.
+    void endProgress();
 
 private:
     void clearBar();
     void drawBar();
 
     bool quiet_;
+    std::FILE *output_;
     bool hasBar_; ///< whether there may be a progress bar at all
     bool hadProblems_ = false;
     std::string bar_; ///< what is on the terminal's last line, or empty

@@ -1,17 +1,16 @@
-// The stages of developing a picture on the GPU.
+// The developing of a picture's tiles.
 #pragma once
 
 #include "apps/common/image.h"
-#include "apps/develop/areas.h"
+#include "apps/develop/band.h"
+#include "apps/develop/codetables.h"
 #include "apps/develop/colourspace.h"
-#include "apps/develop/pass.h"
 #include "apps/develop/sharpener.h"
-#include "apps/develop/spotpainter.h"
+#include "apps/develop/spots.h"
 
-#include "oru/oru_ogl/ogl/texture2.h"
-
-#include <memory>
+#include <cstddef>
 #include <optional>
+#include <string>
 #include <vector>
 
 namespace Develop {
@@ -23,48 +22,44 @@ struct Recipe {
     std::vector<Spot> spots;
     std::optional<ColourSpace> convertTo; ///< another colour space than the photo's own
     int quality = 90;                     ///< of JPEG files, 1 to 100
+
+    /// How far a pixel depends on others to each side.
+    std::size_t reach() const;
 };
 
-/// Takes a picture, or the part of it that is to be developed, through the stages, one after the
-/// other:
-///
-///     developer.upload(photo, WholePicture(photo));
-///     developer.sharpen(recipe);
-///     developer.develop(recipe);
-///     Image const result = developer.readBack();
-///
-/// The GPU may still be at work when a stage returns. Works on the context that was current when it
-/// was made.
+/// A picture and what is done to it.
+struct Task {
+    /// @param space of the picture
+    Task(App::Shape const &picture, ColourSpace const &space, Recipe const &recipe);
+
+    App::Shape shape;
+    CodeTables tables;
+    std::optional<ColourMatrix> matrix; ///< of light, to another colour space
+    Recipe const &recipe;
+};
+
+/// One way to develop. Memory of the GPU is kept from tile to tile and from picture to picture.
 class Developer {
 public:
-    /// @param sharpener how to sharpen; null when no recipe will ask for it
-    explicit Developer(std::unique_ptr<Sharpener> sharpener);
+    virtual ~Developer() = default;
+    Developer(Developer const &) = delete;
+    Developer &operator=(Developer const &) = delete;
 
-    /// Takes the source area of a picture to the GPU.
-    /// @param areas not empty, within the picture
-    void upload(App::Image const &photo, Areas const &areas);
+    /// Which way it is and on what it runs, for people.
+    virtual std::string description() const = 0;
 
-    /// Decodes to linear light and sharpens, if the recipe asks for it.
-    void sharpen(Recipe const &recipe);
+    /// The largest side of a tile with what it depends on.
+    virtual std::size_t sizeLimit() const = 0;
 
-    /// Computes the developed pixels of the target area.
-    void develop(Recipe const &recipe);
+    /// Begins a picture.
+    /// @param task lives until the picture is done
+    virtual void begin(Task const &task) = 0;
 
-    /// The developed target area, of the same kind as the picture.
-    App::Image readBack();
+    /// Computes the target's pixels from the source's. The work is done when this returns.
+    virtual void develop(Band const &photo, Tile const &tile, Band &developed) = 0;
 
-private:
-    std::unique_ptr<Sharpener> sharpener_;
-    CoverPass decode_;
-    CoverPass encode_;
-    CoverPass decodeAndEncode_;
-    SpotPainter spotPainter_;
-
-    App::Shape shape_; ///< of the target area
-    Areas areas_;
-    std::unique_ptr<ORU::OGL::Texture2D> photo_;
-    std::unique_ptr<ORU::OGL::Texture2D> light_; ///< sharpened; null without sharpening
-    std::unique_ptr<ORU::OGL::Texture2D> developed_;
+protected:
+    Developer() = default;
 };
 
 } // namespace Develop

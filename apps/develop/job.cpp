@@ -2,18 +2,25 @@
 #include "apps/develop/job.h"
 
 #include "apps/common/failure.h"
+#include "apps/common/file.h"
 #include "apps/common/offscreengpu.h"
+#include "apps/common/picturefile.h"
 #include "apps/common/unicode.h"
-#include "apps/develop/choosesharpener.h"
+#include "apps/develop/cancellation.h"
+#include "apps/develop/choosedeveloper.h"
 #include "apps/develop/console.h"
 #include "apps/develop/openclruntime.h"
+#include "apps/develop/opengldeveloper.h"
 #include "apps/develop/options.h"
-#include "apps/develop/photojob.h"
+#include "apps/develop/pace.h"
 #include "apps/develop/photolist.h"
+#include "apps/develop/photoqueue.h"
+#include "apps/develop/runreport.h"
 #include "apps/develop/stopwatch.h"
 
 #include "oru/oru_ocl/exceptionocl.h"
 
+#include <algorithm>
 #include <future>
 #include <memory>
 #include <new>
@@ -26,24 +33,34 @@ namespace {
 namespace fs = std::filesystem;
 
 using RuntimePtr = std::shared_ptr<OpenCLRuntime const>;
+using Status = PhotoRecord::Status;
 
-/// Runs a piece of work about a file. What fails becomes a problem of that file.
-/// @return whether it succeeded
+/// After so many photos a failure may have left the screen.
+constexpr std::size_t kScreenful = 20;
+
+std::string ReasonOf(std::exception_ptr const &failure) {
+    try {
+        std::rethrow_exception(failure);
+    } catch (ORU::OCL::ExceptionOCL const &caught) {
+        return caught.errorDescription();
+    } catch (ORU::LogicalException const &caught) {
+        return caught.message();
+    } catch (std::bad_alloc const &) {
+        return "not enough memory";
+    } catch (std::exception const &caught) {
+        return caught.what();
+    }
+}
+
+/// Does a piece of the whole run's work.
+/// @throws Failure when it fails, which names what it is about
 template<class Work>
-bool Try(Console &console, std::string const &name, Work const &work) {
+void About(std::string const &name, Work const &work) {
     try {
         work();
-        return true;
-    } catch (ORU::OCL::ExceptionOCL const &failure) {
-        console.problem(name, failure.errorDescription());
-    } catch (ORU::LogicalException const &failure) {
-        console.problem(name, failure.message());
-    } catch (std::bad_alloc const &) {
-        console.problem(name, "not enough memory");
-    } catch (std::exception const &failure) {
-        console.problem(name, failure.what());
+    } catch (...) {
+        throw App::Failure(name + ": " + ReasonOf(std::current_exception()));
     }
-    return false;
 }
 
 /// The line about this machine, which is printed before any other.
@@ -80,88 +97,233 @@ void MakeFolder(fs::path const &folder) {
         throw App::Failure("cannot be made a folder for the developed pictures");
 }
 
-/// Develops one photo after the other; what happens to them goes to the console.
-class Batch {
-public:
-    Batch(Options const &options, Recipe const &recipe, Console &console)
-        : options_(options), recipe_(recipe), console_(console) {}
+/// Refuses to write over a picture: a pattern of the shell may have put one behind the option.
+void RefuseToReplacePicture(fs::path const &path) {
+    if (App::KindOfName(path))
+        throw App::Failure("has the name of a picture, which it would replace");
+}
 
-    void run(std::vector<Photo> const &photos) {
+/// Fails before the work where a report could not be written after it.
+void PrepareReport(std::string const &file) {
+    if (file.empty() || file == "-")
+        return;
+    fs::path const path = fs::absolute(App::ToPath(file));
+    RefuseToReplacePicture(path);
+    std::error_code error;
+    if (fs::is_directory(path, error))
+        throw App::Failure("is a folder");
+    MakeFolder(path.parent_path());
+}
+
+void WriteReport(std::string const &file, RunReport const &report) {
+    if (file.empty())
+        return;
+    std::string const text = report.json();
+    if (file != "-")
+        App::WriteFile(App::ToPath(file), std::vector<unsigned char>(text.begin(), text.end()));
+    else if (std::fwrite(text.data(), 1, text.size(), stdout) != text.size() ||
+             std::fflush(stdout) != 0)
+        throw App::Failure("the standard output takes no report");
+}
+
+/// The photos of a command line on their way; what happens to them goes to console and report.
+class Run {
+public:
+    Run(Options const &options, Console &console, Cancellation const &cancellation)
+        : options_(options), console_(console), cancellation_(cancellation) {}
+
+    RunReport const &run() {
+        Stopwatch const stopwatch;
+        try {
+            developAll();
+        } catch (App::Failure const &failure) {
+            abandon(failure.what());
+        }
+        report_.milliseconds = stopwatch.milliseconds();
+        std::size_t const count = report_.photos.size();
+        if (std::size_t const left = report_.count(Status::Cancelled))
+            console_.notice("cancelled after " + std::to_string(count - left) + " of " +
+                            std::to_string(count) + (count == 1 ? " picture" : " pictures"));
+        else if (report_.problem.empty())
+            summarise();
+        return report_;
+    }
+
+private:
+    void developAll() {
+        listPhotos();
+        if (!options_.base.empty() && photos_.size() > 1)
+            throw App::Failure(options_.base +
+                               ": is the base of one picture only, but there are several");
+        Recipe recipe;
+        recipe.exposure = options_.exposure;
+        recipe.sharpening = options_.sharpening;
+        recipe.quality = options_.quality;
+        if (!options_.convertTo.empty())
+            recipe.convertTo =
+                options_.convertTo == "p3" ? ColourSpace::DisplayP3() : ColourSpace::Srgb();
+        if (!options_.spots.empty())
+            About(options_.spots, [&] { recipe.spots = ReadSpots(App::ToPath(options_.spots)); });
+        About(options_.trace, [&] { RefuseToReplacePicture(App::ToPath(options_.trace)); });
+        About(options_.output, [&] { MakeFolder(App::ToPath(options_.output)); });
+        if (!photos_.empty())
+            About("GPU", [&] { develop(recipe); });
+    }
+
+    void listPhotos() {
+        std::vector<std::string> inputs = options_.inputs;
+        if (!options_.list.empty())
+            About(options_.list == "-" ? "the list" : options_.list, [&] {
+                std::vector<std::string> const listed = ReadList(options_.list);
+                if (listed.empty())
+                    throw App::Failure("names no picture");
+                inputs.insert(inputs.end(), listed.begin(), listed.end());
+            });
+        std::vector<std::string> alsoRead;
+        if (!options_.base.empty())
+            alsoRead = {options_.base};
+        auto const onProblem = [this](std::string const &name, std::string const &reason) {
+            PhotoRecord record;
+            record.input = name;
+            fail(record, reason);
+            report_.photos.push_back(record);
+        };
+        for (Photo const &photo :
+             ListPhotos(inputs, App::ToPath(options_.output), options_.kind, alsoRead, onProblem)) {
+            PhotoRecord record;
+            record.input = photo.name();
+            record.output = App::ToText(photo.output);
+            std::error_code error;
+            if (options_.skipExisting && fs::is_regular_file(photo.output, error)) {
+                record.status = Status::Skipped;
+                ++done_;
+            } else {
+                photos_.push_back(photo);
+                records_.push_back(report_.photos.size());
+            }
+            report_.photos.push_back(record);
+        }
+    }
+
+    void develop(Recipe const &recipe) {
         std::shared_future<RuntimePtr> openCL;
-        if (!options_.quiet || recipe_.sharpening.isOn())
+        if (!options_.quiet || recipe.sharpening.isOn())
             openCL = LoadOpenCL(options_.openCLFolder);
         App::OffscreenGpu const gpu(options_.trace);
         Introduction introduction(console_, gpu.description(), openCL);
 
-        std::unique_ptr<Sharpener> sharpener;
-        if (recipe_.sharpening.isOn()) {
-            sharpener = ChooseSharpener(*openCL.get(), options_.device, gpu.context());
+        std::unique_ptr<Developer> developer;
+        if (recipe.sharpening.isOn()) {
+            developer = ChooseDeveloper(*openCL.get(), options_.device, gpu.context());
             introduction.print();
-            console_.line("sharpening by " + sharpener->description());
+            console_.line("sharpening by " + developer->description());
+        } else {
+            developer = std::make_unique<OpenGLDeveloper>(nullptr);
         }
-        Developer developer(std::move(sharpener));
-        PhotoJob job(developer, recipe_, gpu.sizeLimit(), App::ToPath(options_.base),
-                     options_.report);
-        develop(photos, job, introduction);
+        PhotoQueue queue(*developer, recipe, App::ToPath(options_.base), options_.report);
+
+        Stopwatch const stopwatch;
+        Pace pace(0);
+        std::size_t next = 0;
+        console_.progress(done_, report_.photos.size(), std::string());
+        queue.run(
+            photos_,
+            [&](PhotoResult const &result) {
+                introduction.print();
+                finish(report_.photos[records_[next++]], result);
+                pace.add(stopwatch.milliseconds() / 1000);
+                console_.progress(++done_, report_.photos.size(), pace.text(photos_.size() - next));
+            },
+            cancellation_.isRequested());
         introduction.print();
+        console_.endProgress();
     }
 
-private:
-    void develop(std::vector<Photo> const &photos, PhotoJob &job, Introduction &introduction) {
-        Stopwatch const total;
-        std::size_t begun = 0;
-        std::size_t succeeded = 0;
-        for (Photo const &photo : photos) {
-            console_.progress(begun++, photos.size(), photo.name());
-            Stopwatch const stopwatch;
-            ReportLines report;
-            bool const developed =
-                Try(console_, photo.name(), [&] { report = job.run(photo.input, photo.output); });
-            double const time = stopwatch.milliseconds();
-            introduction.print();
-            if (!developed)
-                continue;
-            ++succeeded;
-            console_.line(photo.name() + " -> " + App::ToText(photo.output) + " (" +
-                          Milliseconds(time) + ")");
-            for (std::string const &line : report)
-                console_.line("    " + line);
+    /// Notes and tells what became of a photo.
+    void finish(PhotoRecord &record, PhotoResult const &result) {
+        record.notes = result.notes;
+        if (result.head.width != 0)
+            record.shape = result.head;
+        if (result.failure) {
+            fail(record, ReasonOf(result.failure));
+            return;
         }
-        if (photos.size() > 1)
-            console_.line(std::to_string(succeeded) + " of " + std::to_string(photos.size()) +
-                          " pictures in " + Milliseconds(total.milliseconds()));
+        record.status = Status::Developed;
+        record.milliseconds = result.milliseconds;
+        console_.line(record.input + " -> " + record.output + " (" +
+                      Milliseconds(result.milliseconds) + ")");
+        for (std::string const &note : result.notes)
+            console_.line("    note: " + note);
+        for (std::string const &line : result.report)
+            console_.line("    " + line);
+    }
+
+    void fail(PhotoRecord &record, std::string const &reason) {
+        record.status = Status::Failed;
+        record.reason = reason;
+        console_.problem(record.input + ": " + reason);
+    }
+
+    /// What ended the whole run is why the photos that were to come are not developed.
+    void abandon(std::string const &problem) {
+        console_.problem(problem);
+        report_.problem = problem;
+        for (PhotoRecord &photo : report_.photos)
+            if (photo.status == Status::Cancelled && !cancellation_.isRequested()) {
+                photo.status = Status::Failed;
+                photo.reason = problem;
+            }
+    }
+
+    void summarise() {
+        std::size_t const count = report_.photos.size();
+        std::size_t const failed = report_.count(Status::Failed);
+        std::size_t const skipped = report_.count(Status::Skipped);
+        if (count < 2 && skipped == 0)
+            return;
+        bool const repeats = failed != 0 && count > kScreenful;
+        console_.line(
+            std::to_string(report_.count(Status::Developed)) + " of " + std::to_string(count) +
+            " pictures in " + Duration(report_.milliseconds / 1000) +
+            (skipped ? ", " + std::to_string(skipped) + " skipped" : "") +
+            (failed ? "; " + std::to_string(failed) + " failed" : "") + (repeats ? ":" : ""));
+        if (repeats)
+            repeatFailures(failed);
+    }
+
+    void repeatFailures(std::size_t failed) {
+        std::size_t repeated = 0;
+        for (PhotoRecord const &photo : report_.photos)
+            if (photo.status == Status::Failed && repeated++ < kScreenful)
+                console_.line("    " + photo.input + ": " + photo.reason);
+        if (failed > kScreenful)
+            console_.line("    and " + std::to_string(failed - kScreenful) + " more");
     }
 
     Options const &options_;
-    Recipe const &recipe_;
     Console &console_;
+    Cancellation const &cancellation_;
+    RunReport report_;
+    std::vector<Photo> photos_;        ///< those to develop
+    std::vector<std::size_t> records_; ///< where each of them stands in the report
+    std::size_t done_ = 0;             ///< how many inputs are settled
 };
 
 } // namespace
 
 int RunJob(Options const &options) {
-    Console console(options.quiet);
-    auto const onProblem = [&console](std::string const &name, std::string const &reason) {
-        console.problem(name, reason);
-    };
-    Recipe recipe{options.exposure, options.sharpening, {}};
-    if (!options.spots.empty() &&
-        !Try(console, options.spots, [&] { recipe.spots = ReadSpots(App::ToPath(options.spots)); }))
-        return 1;
-
-    fs::path const output = App::ToPath(options.output);
-    std::vector<std::string> alsoRead;
-    if (!options.base.empty())
-        alsoRead = {options.base};
-    std::vector<Photo> const photos = ListPhotos(options.inputs, output, alsoRead, onProblem);
-    if (!options.base.empty() && photos.size() > 1) {
-        console.problem(options.base, "is the base of one picture only, but there are several");
-        return 1;
+    Cancellation const cancellation;
+    Console console(options.quiet, options.json == "-" ? stderr : stdout);
+    try {
+        About(options.json, [&] { PrepareReport(options.json); });
+        Run run(options, console, cancellation);
+        RunReport const &report = run.run();
+        About(options.json, [&] { WriteReport(options.json, report); });
+        if (report.count(Status::Cancelled) != 0)
+            return Cancellation::kExitCode;
+    } catch (App::Failure const &failure) {
+        console.problem(failure.what());
     }
-    Try(console, options.output, [&] {
-        MakeFolder(output);
-        Try(console, "GPU", [&] { Batch(options, recipe, console).run(photos); });
-    });
     return console.hadProblems() ? 1 : 0;
 }
 

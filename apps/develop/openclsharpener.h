@@ -1,11 +1,14 @@
-// Sharpening by OpenCL.
+// Sharpening by OpenCL on the texture that it shares with OpenGL.
 #pragma once
 
+#include "apps/develop/openclprogram.h"
 #include "apps/develop/openclruntime.h"
+#include "apps/develop/reusedtexture.h"
 #include "apps/develop/sharpener.h"
 
 #include "oru/oru_ocl/commandqueue.h"
-#include "oru/oru_ocl/programocl.h"
+
+#include <optional>
 
 namespace ORU::OGL {
 class Context;
@@ -13,43 +16,42 @@ class Context;
 
 namespace Develop {
 
-/// Kernels on a device of an OpenCL runtime. Where device and OpenGL share, they work on the
-/// texture itself; otherwise it is read back once and written once.
+/// Kernels of an OpenCL runtime on the texture itself.
 class OpenCLSharpener : public Sharpener {
 public:
-    /// @param shared the OpenGL context to share with, current on this thread; null to copy
+    /// @param shared the OpenGL context to share with, current on this thread
     /// @throws ORU::LogicalException when the device refuses, as one does that cannot share with
     ///         the context
     /// @throws Failure when the device's compiler refuses the kernels
-    OpenCLSharpener(OpenCLDevice const &device, ORU::OGL::Context const *shared);
+    OpenCLSharpener(OpenCLDevice const &device, ORU::OGL::Context const &shared);
 
-    void sharpen(std::unique_ptr<ORU::OGL::Texture2D> &light, std::size_t channels,
-                 Sharpening const &sharpening) override;
-    std::string description() const override;
+    ORU::OGL::Texture2D &light(std::size_t width, std::size_t height) override;
+    ORU::OGL::Texture2D const &sharpen(std::size_t width, std::size_t height, std::size_t channels,
+                                       Sharpening const &sharpening) override;
+    std::string description() const override {
+        return "OpenCL on " + device_.name + ", on the texture shared with OpenGL";
+    }
 
 private:
-    /// What the kernels work with.
-    struct Work;
     struct Kernels {
         explicit Kernels(ORU::OCL::Program const &program);
         ORU::OCL::Kernel loadTexture, storeTexture, blurRows, sharpenColumns;
     };
 
-    void sharpenShared(ORU::OGL::Texture2D &light, Work &work);
-    void sharpenCopy(ORU::OGL::Texture2D &light, Work &work);
-    void sharpenBuffer(Work &work);
+    void setBlur(std::size_t channels, Sharpening const &sharpening);
 
-    /// Launches a kernel whose first arguments are two pieces of memory and the picture's size.
+    /// Launches a kernel over a size, which is its third argument after two pieces of memory.
     template<class First>
-    void launch(ORU::OCL::Kernel &kernel, Work const &work, First const &first,
+    void launch(ORU::OCL::Kernel &kernel, std::size_t width, std::size_t height, First const &first,
                 ORU::OCL::Buffer const &second);
 
     OpenCLDevice device_;
-    bool isShared_;
     ORU::OCL::Context context_;
     ORU::OCL::CommandQueue queue_;
     Kernels kernels_;
-    std::vector<float> host_; ///< the copy; kept, since new memory of its size is slow to get
+    ReusedTexture texture_;
+    std::optional<ORU::OCL::Image2D> image_; ///< over the texture
+    ReusedBuffer light_, rows_, weights_;
 };
 
 } // namespace Develop

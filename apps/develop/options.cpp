@@ -6,6 +6,7 @@
 
 #include <CLI/CLI.hpp>
 
+#include <algorithm>
 #include <sstream>
 
 namespace Develop {
@@ -27,13 +28,80 @@ CLI::Validator Between(double least, double most) {
         std::string());
 }
 
+/// The words that an option takes, as a line.
+std::string Listed(std::vector<std::string> const &words) {
+    std::string line;
+    for (std::string const &word : words)
+        line += (line.empty() ? "" : ", ") + word;
+    return line;
+}
+
+CLI::Validator OneOf(std::vector<std::string> const &words) {
+    return CLI::Validator(
+        [words](std::string const &text) {
+            bool const isKnown = std::find(words.begin(), words.end(), text) != words.end();
+            return isKnown ? std::string() : "'" + text + "' is none of " + Listed(words);
+        },
+        std::string());
+}
+
+std::optional<App::FileKind> KindOfFormat(std::string const &format) {
+    if (format == "same")
+        return std::nullopt;
+    return format == "jpeg"   ? App::FileKind::Jpeg
+           : format == "tiff" ? App::FileKind::Tiff
+                              : App::FileKind::Png;
+}
+
+void DescribeFiles(CLI::App &app, Options &options) {
+    app.add_option("IMAGE", options.inputs, "PNG, JPEG or TIFF pictures, and folders of them")
+        ->type_name("")
+        ->option_text("...");
+    app.add_option(
+           "--list", options.list,
+           "Further ones: a file with a path in each line, in UTF-8; - reads the list from\n"
+           "the standard input")
+        ->type_name("FILE");
+    app.add_option("--output", options.output, "Folder for the developed pictures")
+        ->type_name("DIR")
+        ->capture_default_str();
+    app.add_option_function<std::string>(
+           "--format",
+           [&options](std::string const &format) { options.kind = KindOfFormat(format); },
+           "Their kind: png, jpeg, tiff, or same for each photo's own")
+        ->type_name("KIND")
+        ->check(OneOf({"png", "jpeg", "tiff", "same"}))
+        ->default_str("png");
+    app.add_option("--quality", options.quality, "Of JPEG files, 1 to 100")
+        ->type_name("N")
+        ->check(Between(1, 100))
+        ->capture_default_str();
+    app.add_flag("--skip-existing", options.skipExisting,
+                 "Leave out the photos whose developed picture exists");
+}
+
+void DescribeReports(CLI::App &app, Options &options) {
+    app.add_option("--trace", options.trace, "Write every OpenGL call to a file")
+        ->type_name("FILE");
+    app.add_flag("--report", options.report, "Tell how each picture was made, and the times");
+    app.add_option(
+           "--json", options.json,
+           "Write what became of each photo to a file, at the end; - writes to the standard\n"
+           "output, and all other lines go to the error output")
+        ->type_name("FILE");
+    app.add_flag("--quiet", options.quiet, "Print problems only");
+}
+
 void Describe(CLI::App &app, Options &options) {
     app.allow_windows_style_options(false); // a slash begins a path
     app.set_version_flag("--version",
                          std::string("develop " ORU_VERSION_STRING ", oru.dll ") + ORU::Version());
-    app.add_option("IMAGE", options.inputs, "PNG or JPEG pictures, and folders of them")
-        ->type_name("")
-        ->option_text("...");
+    DescribeFiles(app, options);
+    app.add_option(
+           "--convert-to", options.convertTo,
+           "Convert to the colours of srgb or p3 (Display P3), and not keep the photo's own")
+        ->type_name("SPACE")
+        ->check(OneOf({"srgb", "p3"}));
     app.add_option("--exposure", options.exposure, "Brighten by EV stops; negative darkens")
         ->type_name("EV")
         ->check(Between(-100, 100));
@@ -61,15 +129,11 @@ void Describe(CLI::App &app, Options &options) {
                    "The picture developed without the spots; only they are then computed")
         ->type_name("PICTURE")
         ->needs(spots);
-    app.add_option("--output", options.output, "Folder for the developed PNG pictures")
-        ->type_name("DIR")
-        ->capture_default_str();
-    app.add_option("--trace", options.trace, "Write every OpenGL call to a file")
-        ->type_name("FILE");
-    app.add_flag("--report", options.report, "Tell how each picture was made, and the times");
-    app.add_flag("--quiet", options.quiet, "Print problems only");
-    app.footer("Exit code: 0 when every picture was developed, 1 when one was not, 2 when the\n"
-               "command line is wrong.");
+    DescribeReports(app, options);
+    app.footer(
+        "Exit code: 0 when every picture was developed or skipped, 1 when one was not, 2 when\n"
+        "the command line is wrong, 130 when Ctrl-C ended the work: the photos under way\n"
+        "leave no file then, and a second Ctrl-C does not wait for that.");
 }
 
 } // namespace
@@ -81,7 +145,7 @@ std::optional<Options> ParseOptions(std::vector<std::string> const &arguments, i
     try {
         app.parse(std::vector<std::string>(arguments.rbegin(), arguments.rend()));
         // Asked for here, or a mistyped option would be reported as a missing picture.
-        if (options.inputs.empty())
+        if (options.inputs.empty() && options.list.empty())
             throw CLI::RequiredError("at least one picture or folder");
         return options;
     } catch (CLI::Success const &helpOrVersion) {

@@ -1,6 +1,7 @@
 // What the command line of develop asks for.
 #pragma once
 
+#include "apps/common/picture.h"
 #include "apps/develop/sharpener.h"
 
 #include <optional>
@@ -11,14 +12,21 @@ namespace Develop {
 
 struct Options {
     std::vector<std::string> inputs; ///< pictures and folders, UTF-8
+    std::string list;                ///< file of further ones, "-" for the standard input, or empty
     std::string output = "out";      ///< folder of the developed pictures
-    double exposure = 0;             ///< stops
+    /// Kind of the developed pictures; nothing to keep that of each photo.
+    std::optional<App::FileKind> kind = App::FileKind::Png;
+    int quality = 90;          ///< of JPEG files
+    bool skipExisting = false; ///< whether to leave out what is developed already
+    std::string convertTo;     ///< name of a colour space, or empty to keep the photo's
+    double exposure = 0;       ///< stops
     Sharpening sharpening;
     std::string openCLFolder; ///< where OpenCL.dll lies; empty for the system's folder
-    std::string device;       ///< OpenCL device to sharpen on, see ChooseSharpener
+    std::string device;       ///< OpenCL device to sharpen on, see ChooseDeveloper
     std::string spots;        ///< file of local edits, or empty
     std::string base;         ///< the picture developed without the spots, or empty
     bool report = false;      ///< whether to print how each picture was made
+    std::string json;         ///< file for what became of the photos, "-" for the standard output
     std::string trace;        ///< file for the OpenGL calls, or empty
     bool quiet = false;
 };

@@ -35,13 +35,13 @@ Pass::Pass(std::string const &vertexShader, std::string const &fragmentShader) {
     program_.link(true);
 }
 
-void Pass::draw(Texture2D &target, VertexBuffer &vertices, bool cleared) {
+void Pass::draw(Texture2D &target, std::size_t width, std::size_t height, VertexBuffer &vertices,
+                bool cleared) {
     framebuffer_.bind();
     framebuffer_.attach(&target, 0, 0);
     if (!framebuffer_.statusOkay(nullptr))
         throw App::Failure("this OpenGL cannot draw into such a picture");
-    ORU_GL(Viewport, 0, 0, static_cast<GLsizei>(target.width(0)),
-           static_cast<GLsizei>(target.height(0)));
+    ORU_GL(Viewport, 0, 0, static_cast<GLsizei>(width), static_cast<GLsizei>(height));
     if (cleared)
         ORU_GL(Clear, GL_COLOR_BUFFER_BIT);
     vertices.drawPrimitives();

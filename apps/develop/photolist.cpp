@@ -1,9 +1,18 @@
 // The pictures to develop, and the files they become.
 #include "apps/develop/photolist.h"
 
+#include "apps/common/failure.h"
+#include "apps/common/file.h"
+#include "apps/common/picturefile.h"
 #include "apps/common/unicode.h"
 
+#include <fcntl.h>
+#include <io.h>
+
 #include <algorithm>
+#include <cstdio>
+#include <iostream>
+#include <iterator>
 #include <map>
 #include <set>
 #include <system_error>
@@ -21,16 +30,11 @@ std::string Identity(fs::path const &path) {
     return App::FoldCase(App::ToText(error ? path : canonical));
 }
 
-bool HasPictureName(fs::path const &path) {
-    std::string const extension = App::FoldCase(App::ToText(path.extension()));
-    return extension == ".png" || extension == ".jpg" || extension == ".jpeg";
-}
-
 std::vector<fs::path> PicturesOf(fs::path const &folder, std::error_code &error) {
     std::vector<fs::path> pictures;
     for (fs::directory_iterator entry(folder, error), end; !error && entry != end;
          entry.increment(error))
-        if (HasPictureName(entry->path()) && !entry->is_directory())
+        if (App::KindOfName(entry->path()) && !entry->is_directory())
             pictures.push_back(entry->path());
     std::sort(pictures.begin(), pictures.end());
     return pictures;
@@ -51,19 +55,53 @@ std::vector<fs::path> ListFiles(std::vector<std::string> const &inputs,
         if (error)
             onProblem(input, "the folder cannot be read");
         else if (pictures.empty())
-            onProblem(input, "the folder has no PNG or JPEG files");
+            onProblem(input, "the folder has no PNG, JPEG or TIFF files");
         files.insert(files.end(), pictures.begin(), pictures.end());
     }
     return files;
 }
 
+wchar_t const *ExtensionOf(App::FileKind kind) {
+    switch (kind) {
+    case App::FileKind::Jpeg:
+        return L".jpg";
+    case App::FileKind::Tiff:
+        return L".tif";
+    case App::FileKind::Png:
+        break;
+    }
+    return L".png";
+}
+
+std::string ReadStandardInput() {
+    ::_setmode(::_fileno(stdin), _O_BINARY);
+    return std::string(std::istreambuf_iterator<char>(std::cin), {});
+}
+
 } // namespace
+
+std::vector<std::string> ReadList(std::string const &file) {
+    std::string text = file == "-" ? ReadStandardInput() : App::ReadText(App::ToPath(file));
+    if (text.find('\0') != std::string::npos)
+        throw App::Failure("is not a list of paths in UTF-8");
+    if (text.compare(0, 3, "\xEF\xBB\xBF") == 0) // a mark that some editors begin UTF-8 with
+        text.erase(0, 3);
+    std::vector<std::string> lines;
+    for (std::size_t begin = 0; begin < text.size();) {
+        std::size_t const end = std::min(text.find_first_of("\r\n", begin), text.size());
+        if (end > begin)
+            lines.push_back(text.substr(begin, end - begin));
+        begin = end + 1;
+    }
+    return lines;
+}
 
 std::string Photo::name() const {
     return App::ToText(input);
 }
 
 std::vector<Photo> ListPhotos(std::vector<std::string> const &inputs, fs::path const &outputFolder,
+                              std::optional<App::FileKind> kind,
                               std::vector<std::string> const &alsoRead,
                               ProblemHandler const &onProblem) {
     std::vector<fs::path> const files = ListFiles(inputs, onProblem);
@@ -76,7 +114,9 @@ std::vector<Photo> ListPhotos(std::vector<std::string> const &inputs, fs::path c
     std::vector<Photo> photos;
     std::map<std::string, std::string> writers; // by output
     for (fs::path const &file : files) {
-        Photo const photo{file, outputFolder / (file.stem().wstring() + L".png")};
+        App::FileKind const own = App::KindOfName(file).value_or(App::FileKind::Png);
+        Photo const photo{file,
+                          outputFolder / (file.stem().wstring() + ExtensionOf(kind.value_or(own)))};
         std::string const output = Identity(photo.output);
         auto const [writer, isNew] = writers.emplace(output, photo.name());
         if (inputFiles.count(output))

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "apps/common/picture.h"
+#include "apps/develop/bandplan.h"
 #include "apps/develop/developer.h"
 #include "apps/develop/photolist.h"
 
@@ -33,14 +34,14 @@ public:
     /// @param base the picture developed without the recipe's spots, of which only what these can
     ///        change is computed; empty to compute all
     /// @param withReport whether to measure each stage
+    /// @param limits of bands and tiles, which change no pixel
     PhotoQueue(Developer &developer, Recipe const &recipe, std::filesystem::path const &base,
-               bool withReport);
+               bool withReport, BandPlan::Limits const &limits = BandPlan::Limits());
 
     /// Develops photos. Which of them fails does not keep the others.
     /// @param onDone is called for each, on this thread, in their order
-    /// @param isCancelled once true, no further photo is begun, and those under way leave no file
-    /// and
-    ///        are not reported
+    /// @param isCancelled once true, no further photo is begun, and those under way leave no
+    ///        file and are not reported
     void run(std::vector<Photo> const &photos,
              std::function<void(PhotoResult const &)> const &onDone,
              std::atomic<bool> const &isCancelled);
@@ -50,6 +51,7 @@ private:
     Recipe const &recipe_;
     std::filesystem::path base_;
     bool withReport_;
+    BandPlan::Limits limits_;
 };
 
 } // namespace Develop

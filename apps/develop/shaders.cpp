@@ -16,51 +16,81 @@ void main() {
 
 namespace {
 
-// The transfer functions are those of IEC 61966-2-1. Drivers compute pow by approximations of
-// different quality, so one step of Newton's method follows it: on z^5 = t^12, and on y^12 = x^5.
-// The value is rounded here, not by the driver's conversion to the texture's format.
+// Curves are tables in rows of 256 texels, whose channels are those of the picture. The value is
+// rounded here, not by the driver's conversion to the texture's format.
 char const *const kDevelopSource = R"(
 uniform sampler2D source;
 uniform ivec2 offset; // of the target's first pixel in the source
 uniform vec4 colours; // 1 for channels that hold colours, 0 for alpha
+uniform int levels;   // entries of a curve
+uniform bool isFloat; // whether the codes are floats
 
 out vec4 result;
 
-#ifdef DECODE
-
-vec4 PowerOf2_4(vec4 t) {
-    vec4 z = pow(t, vec4(2.4));
-    vec4 t2 = t * t;
-    vec4 t4 = t2 * t2;
-    vec4 z2 = z * z;
-    return (4.0 * z + t4 * t4 * t4 / (z2 * z2)) / 5.0;
+vec4 Entry(sampler2D table, int place) {
+    return texelFetch(table, ivec2(place & 255, place >> 8), 0);
 }
 
-vec4 Decode(vec4 code) {
-    return mix(code / 12.92, PowerOf2_4((code + 0.055) / 1.055),
-               greaterThan(code, vec4(0.04045)));
+vec4 Entries(sampler2D table, ivec4 place) {
+    return vec4(Entry(table, place.r).r, Entry(table, place.g).g, Entry(table, place.b).b, 0.0);
+}
+
+#ifdef DECODE
+
+uniform sampler2D lights; // of codes
+uniform bool isLinear;    // whether floats are the light itself
+
+vec4 Decode(vec4 stored) {
+    if (!isFloat)
+        return Entries(lights, ivec4(stored * float(levels - 1) + 0.5));
+    if (isLinear)
+        return stored;
+    // A curve is continued beyond 1 by its last line.
+    vec4 place = max(stored, 0.0) * float(levels - 1);
+    ivec4 below = ivec4(min(place, float(levels - 2)));
+    vec4 light = Entries(lights, below);
+    return light + (place - vec4(below)) * (Entries(lights, below + 1) - light);
 }
 
 #endif
 #ifdef ENCODE
 
-uniform sampler2D spots; // stops that the spots add
+uniform sampler2D light;      // sharpened
+uniform sampler2D thresholds; // where one code ends and the next begins; lights of float codes
+uniform sampler2D index;      // thresholds that are reached for certain, by the light's root
+uniform int indices;          // entries of the index
+uniform int steps;            // thresholds that may be reached beside
+uniform bool becomesLinear;   // whether floats are the light itself
+uniform bool hasMatrix;
+uniform mat3 matrix;          // to another colour space
+uniform sampler2D spots;      // stops that the spots add
 uniform bool hasSpots;
-uniform float exposure;  // stops
-uniform float gain;      // 2^exposure
-uniform float levels;    // largest stored value
+uniform float exposure;       // stops
+uniform float gain;           // 2^exposure
 
-vec4 RootOf2_4(vec4 x) {
-    vec4 y = pow(x, vec4(1.0 / 2.4));
-    vec4 x2 = x * x;
-    vec4 y2 = y * y;
-    vec4 y4 = y2 * y2;
-    return (11.0 * y + x2 * x2 * x / (y4 * y4 * y2 * y)) / 12.0;
+vec4 EncodeFloat(vec4 light) {
+    if (becomesLinear)
+        return light;
+    ivec4 below = ivec4(0);
+    for (int span = levels / 2; span > 0; span /= 2) {
+        ivec4 next = min(below + span, levels - 2);
+        bvec4 reached = lessThanEqual(Entries(thresholds, next), light);
+        below += (next - below) * ivec4(reached);
+    }
+    vec4 first = Entries(thresholds, below);
+    vec4 rise = Entries(thresholds, below + 1) - first;
+    vec4 part = (light - first) / max(rise, 1e-30) * vec4(greaterThan(rise, vec4(0.0)));
+    return (vec4(below) + part) / float(levels - 1);
 }
 
 vec4 Encode(vec4 light) {
-    vec4 curve = 1.055 * RootOf2_4(max(light, 0.0031308)) - 0.055;
-    return mix(light * 12.92, curve, greaterThan(light, vec4(0.0031308)));
+    if (isFloat)
+        return EncodeFloat(light);
+    light = min(light, 1.0);
+    ivec4 code = ivec4(Entries(index, ivec4(sqrt(light) * float(indices - 1))));
+    for (int s = 0; s < steps; ++s)
+        code += ivec4(greaterThanEqual(light, Entries(thresholds, code)));
+    return vec4(code) / float(levels - 1);
 }
 
 // Where no spot adds anything the result must be that of a picture without spots, to the last bit.
@@ -72,13 +102,18 @@ float Gain() {
 #endif
 
 void main() {
-    vec4 stored = texelFetch(source, ivec2(gl_FragCoord.xy) + offset, 0);
-    vec4 value = stored;
+    ivec2 pixel = ivec2(gl_FragCoord.xy) + offset;
+    vec4 stored = texelFetch(source, pixel, 0);
 #ifdef DECODE
-    value = Decode(value);
+    vec4 value = Decode(stored);
+#else
+    vec4 value = texelFetch(light, pixel, 0);
 #endif
 #ifdef ENCODE
-    value = floor(Encode(clamp(value * Gain(), 0.0, 1.0)) * levels + 0.5) / levels;
+    value *= Gain();
+    if (hasMatrix)
+        value.rgb = matrix * value.rgb;
+    value = Encode(max(value, 0.0));
 #endif
     result = mix(stored, value, colours);
 }
@@ -94,6 +129,7 @@ std::string DevelopShader(Steps steps) {
 
 char const *const kBlurRowsShader = R"(
 uniform sampler2D source;
+uniform int last; // pixel of a row
 uniform int taps;
 uniform float weights[61];
 
@@ -101,7 +137,6 @@ out vec4 result;
 
 void main() {
     ivec2 pixel = ivec2(gl_FragCoord.xy);
-    int last = textureSize(source, 0).x - 1;
     vec4 sum = weights[0] * texelFetch(source, pixel, 0);
     for (int k = 1; k < taps; ++k)
         sum += weights[k] * (texelFetch(source, ivec2(max(pixel.x - k, 0), pixel.y), 0) +
@@ -113,6 +148,7 @@ void main() {
 char const *const kSharpenColumnsShader = R"(
 uniform sampler2D light;
 uniform sampler2D rows; // light, its rows blurred
+uniform int last;       // row
 uniform int taps;
 uniform float weights[61];
 uniform float amount;
@@ -122,7 +158,6 @@ out vec4 result;
 
 void main() {
     ivec2 pixel = ivec2(gl_FragCoord.xy);
-    int last = textureSize(rows, 0).y - 1;
     vec4 sum = weights[0] * texelFetch(rows, pixel, 0);
     for (int k = 1; k < taps; ++k)
         sum += weights[k] * (texelFetch(rows, ivec2(pixel.x, max(pixel.y - k, 0)), 0) +

@@ -17,7 +17,8 @@ extern char const *const kCoverVertexShader;
 /// What a developing pass does.
 enum class Steps { Decode, Encode, DecodeAndEncode };
 
-/// From sRGB to linear light, and from there, brightened and clamped, to sRGB.
+/// From codes to linear light, and from there, brightened, in another colour space and clamped, to
+/// codes.
 std::string DevelopShader(Steps steps);
 
 /// Unsharp mask, first and second pass.

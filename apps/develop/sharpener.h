@@ -4,7 +4,6 @@
 #include "oru/oru_ogl/ogl/texture2.h"
 
 #include <cstddef>
-#include <memory>
 #include <string>
 
 namespace Develop {
@@ -18,18 +17,23 @@ struct Sharpening {
     bool isOn() const { return amount != 0; }
 };
 
-/// One way of doing it.
+/// One way of doing it on textures.
 class Sharpener {
 public:
     virtual ~Sharpener() = default;
     Sharpener(Sharpener const &) = delete;
     Sharpener &operator=(Sharpener const &) = delete;
 
-    /// Sharpens a texture of linear light, or puts a sharpened one in its place.
-    /// @param light of the format kLightFormat, not bound
+    /// The texture of linear light to sharpen, of the format kLightFormat, to be drawn into.
+    /// @param width, height that it has at least
+    virtual ORU::OGL::Texture2D &light(std::size_t width, std::size_t height) = 0;
+
+    /// Sharpens the rectangle at the beginning of what `light` gave; no texture may be bound.
     /// @param channels of the picture that it holds, which tells where alpha is
-    virtual void sharpen(std::unique_ptr<ORU::OGL::Texture2D> &light, std::size_t channels,
-                         Sharpening const &sharpening) = 0;
+    /// @return the texture that holds the result until the next call
+    virtual ORU::OGL::Texture2D const &sharpen(std::size_t width, std::size_t height,
+                                               std::size_t channels,
+                                               Sharpening const &sharpening) = 0;
 
     /// Which way it is and on what it runs, for people.
     virtual std::string description() const = 0;

@@ -82,11 +82,10 @@ VertexBuffer SpotVertices::makeBuffer() const {
 
 SpotPainter::SpotPainter() : pass_(kSpotVertexShader, kSpotShader) {}
 
-std::unique_ptr<Texture2D> SpotPainter::paint(std::vector<Spot> const &spots,
-                                              ORU::IntegerRect const &area) {
+Texture2D const *SpotPainter::paint(std::vector<Spot> const &spots, ORU::IntegerRect const &area) {
     SpotVertices vertices;
     for (Spot const &spot : spots)
-        if (spot.changesSomething())
+        if (Touches(spot, area))
             vertices.append(spot, area);
     if (vertices.position.empty())
         return nullptr;
@@ -94,14 +93,13 @@ std::unique_ptr<Texture2D> SpotPainter::paint(std::vector<Spot> const &spots,
     buffer.setupWithProgram(&pass_.program());
     buffer.marshallData();
 
-    auto stops = std::make_unique<Texture2D>(Texture::INTERNALFORMAT_R32F, area.width(),
-                                             area.height(), false);
+    Texture2D &stops = stops_.reserve(Texture::INTERNALFORMAT_R32F, area.width(), area.height());
     ProgramEnabledScope const enabled(&pass_.program());
     pass_.program().setUniform2("offset", 1,
                                 std::array<int, 2>{area.offset().x, area.offset().y}.data());
     AdditiveBlendScope const adding;
-    pass_.draw(*stops, buffer, true);
-    return stops;
+    pass_.draw(stops, area.width(), area.height(), buffer, true);
+    return &stops;
 }
 
 } // namespace Develop

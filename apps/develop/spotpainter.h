@@ -2,12 +2,12 @@
 #pragma once
 
 #include "apps/develop/pass.h"
+#include "apps/develop/reusedtexture.h"
 #include "apps/develop/spots.h"
 
 #include "oru/core/utility/integerrect.h"
-#include "oru/oru_ogl/ogl/texture2.h"
 
-#include <memory>
+#include <vector>
 
 namespace Develop {
 
@@ -17,13 +17,13 @@ class SpotPainter {
 public:
     SpotPainter();
 
-    /// Makes a texture of the stops that spots add to the pixels of an area of the picture; null
-    /// when none of them changes anything.
-    std::unique_ptr<ORU::OGL::Texture2D> paint(std::vector<Spot> const &spots,
-                                               ORU::IntegerRect const &area);
+    /// Paints the stops that spots add to the pixels of an area of the picture into the beginning
+    /// of a texture, which the next call changes; null when none of them changes anything.
+    ORU::OGL::Texture2D const *paint(std::vector<Spot> const &spots, ORU::IntegerRect const &area);
 
 private:
     Pass pass_;
+    ReusedTexture stops_;
 };
 
 } // namespace Develop

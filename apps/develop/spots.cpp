@@ -4,8 +4,6 @@
 #include "apps/common/failure.h"
 #include "apps/common/number.h"
 
-#include "oru/core/math/region_2d/boundingrect.h"
-
 #include <cmath>
 #include <fstream>
 #include <optional>
@@ -16,7 +14,6 @@ namespace Develop {
 
 using ambra::lumo::TVec2;
 using ORU::BoundingRect;
-using ORU::BoundingRegion;
 
 namespace {
 
@@ -82,13 +79,20 @@ std::vector<Spot> ReadSpots(std::filesystem::path const &path) {
     return ReadSpots(file);
 }
 
-BoundingRegion RegionOf(std::vector<Spot> const &spots) {
-    BoundingRegion region;
-    for (Spot const &spot : spots)
-        if (spot.changesSomething())
-            region.include(BoundingRect(Point(spot.x - spot.radius, spot.y - spot.radius),
-                                        Point(spot.x + spot.radius, spot.y + spot.radius)));
-    region.dilate(BoundingRect(Point(-1, -1), Point(1, 1))); // what the floats were rounded by
+bool Touches(Spot const &spot, ORU::IntegerRect const &area) {
+    auto const meets = [reach = spot.radius + 2](double centre, int first, std::size_t size) {
+        return centre + reach >= first && centre - reach <= first + static_cast<double>(size);
+    };
+    return spot.changesSomething() && meets(spot.x, area.offset().x, area.width()) &&
+           meets(spot.y, area.offset().y, area.height());
+}
+
+BoundingRect RegionOf(Spot const &spot) {
+    if (!spot.changesSomething())
+        return BoundingRect();
+    BoundingRect region(Point(spot.x - spot.radius, spot.y - spot.radius),
+                        Point(spot.x + spot.radius, spot.y + spot.radius));
+    region.outset(TVec2<float>(1, 1)); // what the floats were rounded by
     return region;
 }
 

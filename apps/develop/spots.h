@@ -1,7 +1,8 @@
 // Local edits: round spots of more or less exposure.
 #pragma once
 
-#include "oru/core/math/region_2d/boundingregion.h"
+#include "oru/core/math/region_2d/boundingrect.h"
+#include "oru/core/utility/integerrect.h"
 
 #include <filesystem>
 #include <iosfwd>
@@ -29,7 +30,10 @@ std::vector<Spot> ReadSpots(std::istream &text);
 /// @throws Failure also when it cannot be opened
 std::vector<Spot> ReadSpots(std::filesystem::path const &path);
 
-/// Where spots can change a picture.
-ORU::BoundingRegion RegionOf(std::vector<Spot> const &spots);
+/// Whether a spot can change pixels of an area; a few that cannot are let through.
+bool Touches(Spot const &spot, ORU::IntegerRect const &area);
+
+/// Where a spot can change a picture; nowhere when it changes nothing.
+ORU::BoundingRect RegionOf(Spot const &spot);
 
 } // namespace Develop

@@ -1,14 +1,15 @@
 // Many photos in one process.
 #include "apps/common/imagefile.h"
 #include "apps/common/offscreengpu.h"
-#include "apps/develop/choosesharpener.h"
+#include "apps/develop/choosedeveloper.h"
 #include "apps/develop/openclruntime.h"
-#include "apps/develop/photojob.h"
+#include "apps/develop/photoqueue.h"
 #include "bench/soak/footprint.h"
 #include "bench/soak/soaks.h"
 #include "tests/support/nameledger.h"
 #include "tests/support/pictures.h"
 
+#include <atomic>
 #include <cstdio>
 #include <system_error>
 
@@ -56,27 +57,32 @@ private:
 /// spots, each with a period of its own.
 class Studio {
 public:
-    explicit Studio(App::OffscreenGpu const &gpu) : limit_(gpu.sizeLimit()) {
-        developers_.push_back(
-            std::make_unique<Develop::Developer>(ChooseSharpener(runtime_, "none", gpu.context())));
+    explicit Studio(App::OffscreenGpu const &gpu) {
+        developers_.push_back(ChooseDeveloper(runtime_, "none", gpu.context()));
         if (!runtime_.devices().empty())
-            developers_.push_back(
-                std::make_unique<Develop::Developer>(ChooseSharpener(runtime_, "", gpu.context())));
+            developers_.push_back(ChooseDeveloper(runtime_, "", gpu.context()));
     }
 
     std::size_t ways() const { return developers_.size(); }
 
     void develop(std::size_t turn, fs::path const &input, fs::path const &output) {
-        Develop::Recipe recipe{0.5, {turn % 5 == 0 ? 0 : 0.8, 1.5}, {}};
+        Develop::Recipe recipe;
+        recipe.exposure = 0.5;
+        recipe.sharpening = {turn % 5 == 0 ? 0 : 0.8, 1.5};
         if (turn % 3 == 0)
             recipe.spots = {{20, 20, 15, 1}, {35, 30, 8, -0.5}};
-        Develop::PhotoJob(*developers_[turn / 7 % ways()], recipe, limit_, fs::path(), false)
-            .run(input, output);
+        std::atomic<bool> const isCancelled = false;
+        Develop::PhotoQueue(*developers_[turn / 7 % ways()], recipe, fs::path(), false)
+            .run({{input, output}}, RethrowFailure, isCancelled);
     }
 
 private:
+    static void RethrowFailure(Develop::PhotoResult const &result) {
+        if (result.failure)
+            std::rethrow_exception(result.failure);
+    }
+
     Develop::OpenCLRuntime runtime_{std::string()};
-    App::SizeLimit limit_;
     std::vector<std::unique_ptr<Develop::Developer>> developers_;
 };
 

@@ -11,7 +11,7 @@ import sys
 import tempfile
 
 IMPORTS = pathlib.Path("/usr/x86_64-w64-mingw32/lib")
-SYSTEM = ["opengl32", "gdi32", "user32", "dxgi", "d3d11", "dxguid", "kernel32", "ucrtbase"]
+SYSTEM = ["opengl32", "gdi32", "user32", "dxgi", "dxguid", "kernel32", "ucrtbase"]
 # Standard library, oneTBB, and what the compiler itself calls: allocation, statics, thread-local variables, checks of
 # the stack, type information; four functions that MinGW keeps elsewhere than in ucrtbase.
 RUN_TIME = re.compile(r"""\bstd:: | \btbb:: | \boperator\ (new|delete)\b | ^const\ type_info::

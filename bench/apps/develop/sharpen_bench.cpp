@@ -1,44 +1,63 @@
-// The sharpening stage of develop against the same kernels called by the plain C functions.
-#include "apps/common/offscreengpu.h"
+// Developing by OpenCL against the same kernels called by the plain C functions.
 #include "apps/develop/gaussian.h"
-#include "apps/develop/openclkernels.h"
-#include "apps/develop/openclsharpener.h"
-#include "apps/develop/pixelformat.h"
-#include "apps/develop/shaders.h"
+#include "apps/develop/opencldeveloper.h"
 #include "bench/comparison.h"
 
 #include "oru/oru_ocl/extensionmanagerocl.h"
-#include "oru/oru_ogl/platformgl.h"
 
-#include <memory>
 #include <stdexcept>
 
 using namespace Develop;
-using ORU::OGL::Texture2D;
 
 namespace {
 
-constexpr std::size_t kWidth = 2400;
-constexpr std::size_t kHeight = 1600;
-constexpr double kMegapixels = kWidth * kHeight / 1e6;
-constexpr Sharpening kSharpening = {0.8, 1.5};
+constexpr App::Shape kShape = {4000, 125, 3, 8};
+constexpr std::size_t kReach = 5;
+constexpr std::size_t kRows = kShape.height + 2 * kReach;
+constexpr std::size_t kSpan = 512;
+constexpr double kMegapixels = 4000 * 125 / 1e6;
 
 void Check(cl_int code) {
     if (code != CL_SUCCESS)
         throw std::runtime_error("OpenCL error " + std::to_string(code));
 }
 
-std::unique_ptr<Texture2D> MakeLight() {
-    return std::make_unique<Texture2D>(kLightFormat.storage, kWidth, kHeight, false);
-}
+/// A band of a picture, and how to develop it.
+struct Work {
+    Work() : task(Whole(), ColourSpace::Srgb(), RecipeOf()), tile(MakeTile()) {
+        photo.hold({0, kRows}, kShape);
+        developed.hold({kReach, kReach + kShape.height}, kShape);
+    }
 
-/// The stage without the library: C functions, and OpenGL's own.
-class RawSharpener {
+    static App::Shape Whole() {
+        App::Shape whole = kShape;
+        whole.height = kRows;
+        return whole;
+    }
+    static Recipe const &RecipeOf() {
+        static Recipe const recipe = [] {
+            Recipe sharpened;
+            sharpened.sharpening = {0.8, 1.5};
+            return sharpened;
+        }();
+        return recipe;
+    }
+    static Tile MakeTile() {
+        return {PixelRect(0, kReach, kShape.width, kShape.height),
+                PixelRect(0, 0, kShape.width, kRows)};
+    }
+
+    Task task;
+    Tile tile;
+    Band photo, developed;
+};
+
+/// The work without the library: C functions.
+class RawDeveloper {
 public:
-    explicit RawSharpener(OpenCLDevice const &device)
-        : cl_(ORU::OCL::ExtensionManager::instance()->table()),
-          weights_(GaussianWeights(kSharpening.sigma)),
-          host_(kWidth * kHeight * kLightBytes / sizeof(float)) {
+    RawDeveloper(OpenCLDevice const &device, Work &work)
+        : cl_(ORU::OCL::ExtensionManager::instance()->table()), work_(work),
+          arguments_(ToKernel(work.task, work.tile)) {
         cl_device_id const id = device.device.id();
         cl_context_properties const properties[] = {
             CL_CONTEXT_PLATFORM, reinterpret_cast<cl_context_properties>(device.platform.id()), 0};
@@ -47,138 +66,148 @@ public:
         Check(code);
         queue_ = cl_.clCreateCommandQueue(context_, id, 0, &code);
         Check(code);
-        char const *source = kSharpenKernels;
+        char const *source = kDevelopKernels;
         program_ = cl_.clCreateProgramWithSource(context_, 1, &source, nullptr, &code);
         Check(code);
-        Check(cl_.clBuildProgram(program_, 0, nullptr, "", nullptr, nullptr));
-        blurRows_ = cl_.clCreateKernel(program_, "blurRows", &code);
-        Check(code);
-        sharpenColumns_ = cl_.clCreateKernel(program_, "sharpenColumns", &code);
-        Check(code);
+        Check(cl_.clBuildProgram(program_, 0, nullptr, "-D SPAN=512 -D BITS=8", nullptr, nullptr));
+        makeMemory();
+        makeKernels();
     }
-    ~RawSharpener() {
-        cl_.clReleaseKernel(blurRows_);
-        cl_.clReleaseKernel(sharpenColumns_);
+    ~RawDeveloper() {
+        for (cl_kernel const kernel : {decode_, blurRows_, encode_})
+            cl_.clReleaseKernel(kernel);
+        for (cl_mem const memory :
+             {tile_, codes_, lights_, light_, weights_, rows_, index_, thresholds_, developed_})
+            cl_.clReleaseMemObject(memory);
         cl_.clReleaseProgram(program_);
         cl_.clReleaseCommandQueue(queue_);
         cl_.clReleaseContext(context_);
     }
-    RawSharpener(RawSharpener const &) = delete;
-    RawSharpener &operator=(RawSharpener const &) = delete;
+    RawDeveloper(RawDeveloper const &) = delete;
+    RawDeveloper &operator=(RawDeveloper const &) = delete;
 
-    void sharpen(unsigned int texture) {
-        Memory const memory(*this, CL_MEM_READ_WRITE, nullptr);
-        ::glBindTexture(GL_TEXTURE_2D, texture);
-        ::glGetTexImage(GL_TEXTURE_2D, 0, GL_RGBA, GL_FLOAT, host_.data());
-        Check(cl_.clEnqueueWriteBuffer(queue_, memory.light, CL_TRUE, 0, bytes(), host_.data(), 0,
-                                       nullptr, nullptr));
-        launch(memory);
-        Check(cl_.clEnqueueReadBuffer(queue_, memory.light, CL_TRUE, 0, bytes(), host_.data(), 0,
-                                      nullptr, nullptr));
-        ::glTexSubImage2D(GL_TEXTURE_2D, 0, 0, 0, static_cast<GLsizei>(kWidth),
-                          static_cast<GLsizei>(kHeight), GL_RGBA, GL_FLOAT, host_.data());
-        ::glBindTexture(GL_TEXTURE_2D, 0);
+    void develop() {
+        write(tile_, sizeof arguments_, &arguments_);
+        write(codes_, kRows * kShape.rowBytes(), work_.photo.row(0));
+        launch();
+        Check(cl_.clEnqueueReadBuffer(queue_, developed_, CL_TRUE, 0,
+                                      kShape.height * kShape.rowBytes(),
+                                      work_.developed.row(kReach), 0, nullptr, nullptr));
     }
 
     /// The kernels alone, on memory of the device.
     double secondsOfKernels() {
-        Memory const memory(*this, CL_MEM_READ_WRITE | CL_MEM_COPY_HOST_PTR, host_.data());
         return oru_bench::Seconds([&] {
-            launch(memory);
+            launch();
             Check(cl_.clFinish(queue_));
         });
     }
 
 private:
-    /// What the kernels work on, for a scope.
-    struct Memory {
-        /// @param host what the picture is filled with, if anything
-        Memory(RawSharpener &sharpener, cl_mem_flags flags, float *host)
-            : cl(sharpener.cl_), light(sharpener.buffer(flags, sharpener.bytes(), host)),
-              rows(sharpener.buffer(CL_MEM_READ_WRITE, sharpener.bytes(), nullptr)),
-              weights(sharpener.buffer(CL_MEM_READ_ONLY | CL_MEM_COPY_HOST_PTR,
-                                       sharpener.weights_.size() * sizeof(float),
-                                       sharpener.weights_.data())) {}
-        ~Memory() {
-            for (cl_mem const memory : {light, rows, weights})
-                cl.clReleaseMemObject(memory);
-        }
-        Memory(Memory const &) = delete;
-        Memory &operator=(Memory const &) = delete;
-
-        ORU::OCL::FunctionTable const &cl;
-        cl_mem light, rows, weights;
-    };
-
-    std::size_t bytes() const { return host_.size() * sizeof(float); }
-
-    cl_mem buffer(cl_mem_flags flags, std::size_t size, float *host) {
+    cl_mem buffer(std::size_t size) {
         cl_int code = CL_SUCCESS;
-        cl_mem const memory = cl_.clCreateBuffer(context_, flags, size, host, &code);
+        cl_mem const memory = cl_.clCreateBuffer(context_, CL_MEM_READ_WRITE, size, nullptr, &code);
         Check(code);
         return memory;
     }
 
-    void launch(Memory const &memory) {
-        auto const taps = static_cast<cl_int>(weights_.size());
-        cl_int const size[2] = {static_cast<cl_int>(kWidth), static_cast<cl_int>(kHeight)};
-        auto const amount = static_cast<float>(kSharpening.amount);
-        auto const colours = ColourMask(3);
-        for (cl_kernel const kernel : {blurRows_, sharpenColumns_}) {
-            Check(cl_.clSetKernelArg(kernel, 0, sizeof memory.light, &memory.light));
-            Check(cl_.clSetKernelArg(kernel, 1, sizeof memory.rows, &memory.rows));
-            Check(cl_.clSetKernelArg(kernel, 2, sizeof size, size));
-            Check(cl_.clSetKernelArg(kernel, 3, sizeof memory.weights, &memory.weights));
-            Check(cl_.clSetKernelArg(kernel, 4, sizeof taps, &taps));
-        }
-        Check(cl_.clSetKernelArg(sharpenColumns_, 5, sizeof amount, &amount));
-        Check(cl_.clSetKernelArg(sharpenColumns_, 6, sizeof colours, colours.data()));
-        static constexpr std::size_t kGlobal[2] = {kWidth, kHeight};
-        static constexpr std::size_t kLocal[2] = {16, 4};
-        for (cl_kernel const kernel : {blurRows_, sharpenColumns_})
-            Check(cl_.clEnqueueNDRangeKernel(queue_, kernel, 2, nullptr, kGlobal, kLocal, 0,
-                                             nullptr, nullptr));
+    void write(cl_mem memory, std::size_t size, void const *values) {
+        Check(cl_.clEnqueueWriteBuffer(queue_, memory, CL_TRUE, 0, size, values, 0, nullptr,
+                                       nullptr));
+    }
+
+    template<class T>
+    cl_mem buffer(std::vector<T> const &values) {
+        cl_mem const memory = buffer(values.size() * sizeof(T));
+        write(memory, values.size() * sizeof(T), values.data());
+        return memory;
+    }
+
+    void makeMemory() {
+        std::size_t const light =
+            (kShape.width + 2 * kReach) * kRows * kShape.channels * sizeof(float);
+        tile_ = buffer(sizeof arguments_);
+        codes_ = buffer(kRows * kShape.rowBytes());
+        light_ = buffer(light);
+        rows_ = buffer(light);
+        developed_ = buffer(kShape.height * kShape.rowBytes());
+        lights_ = buffer(work_.task.tables.lights);
+        index_ = buffer(work_.task.tables.index);
+        thresholds_ = buffer(work_.task.tables.thresholds);
+        weights_ = buffer(GaussianWeights(work_.task.recipe.sharpening.sigma));
+    }
+
+    cl_kernel kernel(char const *name, std::vector<cl_mem> const &arguments) {
+        cl_int code = CL_SUCCESS;
+        cl_kernel const made = cl_.clCreateKernel(program_, name, &code);
+        Check(code);
+        for (std::size_t i = 0; i < arguments.size(); ++i)
+            Check(cl_.clSetKernelArg(made, static_cast<cl_uint>(i), sizeof(cl_mem), &arguments[i]));
+        return made;
+    }
+
+    void makeKernels() {
+        decode_ = kernel("decode8", {tile_, codes_, lights_, light_});
+        blurRows_ = kernel("blurRows", {tile_, light_, weights_, rows_});
+        encode_ = kernel("encode8", {tile_, codes_, light_, rows_, weights_, weights_, weights_,
+                                     index_, thresholds_, developed_});
+    }
+
+    void launch() {
+        launch(decode_, kShape.width + 2 * kReach, kRows);
+        launch(blurRows_, kShape.width, kRows);
+        launch(encode_, kShape.width, kShape.height);
+    }
+
+    void launch(cl_kernel kernel, std::size_t width, std::size_t height) {
+        std::size_t const global[2] = {(width + kSpan - 1) / kSpan, height};
+        static constexpr std::size_t kLocal[2] = {1, 1};
+        Check(cl_.clEnqueueNDRangeKernel(queue_, kernel, 2, nullptr, global, kLocal, 0, nullptr,
+                                         nullptr));
     }
 
     ORU::OCL::FunctionTable const &cl_;
-    std::vector<float> weights_;
-    std::vector<float> host_;
+    Work &work_;
+    KernelTile arguments_;
     cl_context context_ = nullptr;
     cl_command_queue queue_ = nullptr;
     cl_program program_ = nullptr;
-    cl_kernel blurRows_ = nullptr;
-    cl_kernel sharpenColumns_ = nullptr;
+    cl_mem tile_ = nullptr, codes_ = nullptr, lights_ = nullptr, light_ = nullptr,
+           weights_ = nullptr, rows_ = nullptr, index_ = nullptr, thresholds_ = nullptr,
+           developed_ = nullptr;
+    cl_kernel decode_ = nullptr, blurRows_ = nullptr, encode_ = nullptr;
 };
 
-// The whole stage on a copy of the texture: read back, two kernels, write back. `kernels_Mpx_s` is
-// the speed of the kernels alone.
-void SharpenStage(benchmark::State &state) {
+// A band from codes to codes: written, three kernels, read back. `kernels_Mpx_s` is the speed of
+// the kernels alone.
+void SharpenBand(benchmark::State &state) {
     OpenCLRuntime const runtime{std::string()};
     std::vector<OpenCLDevice> const devices = runtime.devices();
     if (devices.empty()) {
         state.SkipWithError("no OpenCL device");
         return;
     }
-    App::OffscreenGpu const gpu{std::string()};
-    OpenCLSharpener sharpener(devices.front(), nullptr);
-    RawSharpener raw(devices.front());
-    auto light = MakeLight();
-    sharpener.sharpen(light, 3, kSharpening); // compiles what is compiled at first use
-    raw.sharpen(light->objectID());
+    Work work;
+    OpenCLDeveloper developer(devices.front());
+    RawDeveloper raw(devices.front(), work);
+    developer.begin(work.task);
+    developer.develop(work.photo, work.tile, work.developed); // compiles at first use
+    raw.develop();
 
-    std::vector<double> base, stage;
+    std::vector<double> base, library;
     {
         oru_bench::Comparison comparison(state);
         while (state.KeepRunning()) {
-            base.push_back(oru_bench::Seconds([&] { raw.sharpen(light->objectID()); }));
-            stage.push_back(oru_bench::Seconds([&] { sharpener.sharpen(light, 3, kSharpening); }));
-            comparison.add(base.back(), stage.back());
+            base.push_back(oru_bench::Seconds([&] { raw.develop(); }));
+            library.push_back(oru_bench::Seconds(
+                [&] { developer.develop(work.photo, work.tile, work.developed); }));
+            comparison.add(base.back(), library.back());
         }
     }
     state.counters["raw_Mpx_s"] = kMegapixels / oru_bench::Median(base);
-    state.counters["oru_Mpx_s"] = kMegapixels / oru_bench::Median(stage);
+    state.counters["oru_Mpx_s"] = kMegapixels / oru_bench::Median(library);
     state.counters["kernels_Mpx_s"] = kMegapixels / raw.secondsOfKernels();
 }
-BENCHMARK(SharpenStage)->UseManualTime()->Iterations(15)->Unit(benchmark::kMillisecond);
+BENCHMARK(SharpenBand)->UseManualTime()->Iterations(50)->Unit(benchmark::kMillisecond);
 
 } // namespace

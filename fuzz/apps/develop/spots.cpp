@@ -1,10 +1,11 @@
-// Files of spots, and the part of a picture that they change.
+// Files of spots, and the parts of a picture that they change.
 #include "fuzz/harness.h"
 
 #include "apps/common/failure.h"
-#include "apps/develop/areas.h"
-#include "apps/develop/spots.h"
+#include "apps/develop/bandplan.h"
+#include "apps/develop/spotareas.h"
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
 #include <sstream>
@@ -13,7 +14,7 @@ namespace {
 
 using Develop::Spot;
 
-constexpr std::size_t kWidth = 40, kHeight = 24;
+constexpr std::size_t kWidth = 40, kHeight = 24, kBand = 8;
 
 std::vector<Spot> Read(std::string const &text) {
     std::istringstream stream(text);
@@ -43,19 +44,25 @@ bool Reaches(Spot const &spot, std::size_t x, std::size_t y) {
 }
 
 void FindAreas(std::vector<Spot> const &spots) {
-    auto const areas = Develop::AreasOfSpots(spots, {1, 0.5}, {kWidth, kHeight, 3, 8});
-    for (ORU::IntegerRect const &area : {areas.target, areas.source}) {
-        HOLDS(area.offset().x >= 0 && area.offset().y >= 0);
-        HOLDS(static_cast<std::size_t>(area.offset().x) + area.width() <= kWidth);
-        HOLDS(static_cast<std::size_t>(area.offset().y) + area.height() <= kHeight);
+    Develop::SpotAreas const areas(spots, {kWidth, kHeight, 3, 8}, 2);
+    for (std::size_t top = 0; top < kHeight; top += kBand) {
+        auto const found = areas.in(Develop::PixelRect(0, top, kWidth, kBand));
+        for (ORU::IntegerRect const &area : found)
+            HOLDS(area.offset().x >= 0 && area.offset().y >= static_cast<int>(top) &&
+                  static_cast<std::size_t>(area.offset().x) + area.width() <= kWidth &&
+                  static_cast<std::size_t>(area.offset().y) + area.height() <= top + kBand);
+        for (std::size_t y = top; y < top + kBand; ++y)
+            for (std::size_t x = 0; x < kWidth; ++x) {
+                auto const times =
+                    std::count_if(found.begin(), found.end(), [=](ORU::IntegerRect const &area) {
+                        return Contains(area, x, y);
+                    });
+                HOLDS(times <= 1);
+                if (times == 0)
+                    for (Spot const &spot : spots)
+                        HOLDS(!Reaches(spot, x, y));
+            }
     }
-    for (std::size_t y = 0; y < kHeight; ++y)
-        for (std::size_t x = 0; x < kWidth; ++x) {
-            HOLDS(!Contains(areas.target, x, y) || Contains(areas.source, x, y));
-            if (!Contains(areas.target, x, y))
-                for (Spot const &spot : spots)
-                    HOLDS(!Reaches(spot, x, y));
-        }
 }
 
 } // namespace

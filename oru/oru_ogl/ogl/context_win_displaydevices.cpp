@@ -1,6 +1,7 @@
 // Display devices of Windows: adapters and their outputs, by DXGI.
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/dropexceptions.h"
+#include "oru/oru_ogl/extensionator/internal/functioncast.h"
 #include "oru/oru_ogl/ogl/context.h"
 #include "oru/oru_ogl/ogl/internal/contexts/adapterorigins_win.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -90,6 +91,16 @@ DisplayDeviceKey AdapterDisplayKey(UINT adapterIndex) {
     return MakeKey(description, output);
 }
 
+/// Direct3D's function, or null where the system has no Direct3D. Its library is large and brings
+/// others along, so it is loaded only when a window's display is asked for; it stays then.
+PFN_D3D11_CREATE_DEVICE_AND_SWAP_CHAIN LoadCreateDeviceAndSwapChain() {
+    HMODULE const library = ::LoadLibraryW(L"d3d11.dll");
+    if (!library)
+        return nullptr;
+    return internal::FunctionCast<PFN_D3D11_CREATE_DEVICE_AND_SWAP_CHAIN>(
+        ::GetProcAddress(library, "D3D11CreateDeviceAndSwapChain"));
+}
+
 /// The name of the output that shows a window; the system answers only through a swap chain.
 std::string WindowOutputName(HWND window) {
     RECT windowRect;
@@ -106,14 +117,17 @@ std::string WindowOutputName(HWND window) {
     swapChainDesc.Windowed = TRUE;
     swapChainDesc.SwapEffect = DXGI_SWAP_EFFECT_DISCARD;
 
+    auto const create = LoadCreateDeviceAndSwapChain();
     ComPtr<IDXGISwapChain> swapChain;
     ComPtr<ID3D11Device> d3dDevice;
-    // The check's text is what hosts see: a line break after a parenthesis would be a blank there.
-    // clang-format off
-    ORU_ASSERT_SUCCEEDED(D3D11CreateDeviceAndSwapChain(nullptr, D3D_DRIVER_TYPE_HARDWARE, nullptr,
-        0x0, nullptr, 0, D3D11_SDK_VERSION, &swapChainDesc, swapChain.ReleaseAndGetAddressOf(),
-        d3dDevice.ReleaseAndGetAddressOf(), nullptr, nullptr));
-    // clang-format on
+    ORU_ASSERT_TEXT(
+        "D3D11CreateDeviceAndSwapChain(nullptr, D3D_DRIVER_TYPE_HARDWARE, nullptr, 0x0, nullptr, "
+        "0, D3D11_SDK_VERSION, &swapChainDesc, swapChain.ReleaseAndGetAddressOf(), "
+        "d3dDevice.ReleaseAndGetAddressOf(), nullptr, nullptr)",
+        create &&
+            SUCCEEDED(create(nullptr, D3D_DRIVER_TYPE_HARDWARE, nullptr, 0x0, nullptr, 0,
+                             D3D11_SDK_VERSION, &swapChainDesc, swapChain.ReleaseAndGetAddressOf(),
+                             d3dDevice.ReleaseAndGetAddressOf(), nullptr, nullptr)));
     ComPtr<IDXGIOutput> primaryOutput;
     ORU_ASSERT_SUCCEEDED(swapChain->GetContainingOutput(&primaryOutput));
     DXGI_OUTPUT_DESC outputDesc;

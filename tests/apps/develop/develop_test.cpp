@@ -60,7 +60,7 @@ TEST_F(Develop, BadInput) {
                 "half.jpg taken.png b/FIRST.png last.png");
     EXPECT_EQ(exitCode, 1);
     for (char const *const line :
-         {"missing.png: no such file", "out: the folder has no PNG or JPEG files",
+         {"missing.png: no such file", "out: the folder has no PNG, JPEG or TIFF files",
           "empty.png: is empty", "text.png: neither a PNG nor a JPEG picture",
           "cut.png: damaged PNG: the file is cut off", "half.jpg: damaged JPEG: ",
           "taken.png: cannot be written: there is a folder of this name",

@@ -46,7 +46,7 @@ TEST_F(Sharpen, IsExactOnEveryPath) {
     Path const paths[] = {{"shared",
                            "--opencl \"" + App::ToText(ProgramFolder() / "ocl_runtime") + "\"",
                            "on the texture shared with OpenGL"},
-                          {"copy", "--device 0.0", "on a copy"},
+                          {"alone", "--device 0.0", "like all else"},
                           {"glsl", "--device none", "sharpening by GLSL: as wished"},
                           {"bare", "--opencl in", "sharpening by GLSL: no OpenCL runtime"}};
     for (auto const &[strength, sigma] : {std::pair(5, 0.3), std::pair(2, 20.0)}) {

@@ -1,7 +1,7 @@
-// Which way to sharpen on this machine.
+// Which way to develop on this machine.
 #pragma once
 
-#include "apps/develop/sharpener.h"
+#include "apps/develop/developer.h"
 
 #include <memory>
 #include <string>
@@ -14,13 +14,13 @@ namespace Develop {
 
 class OpenCLRuntime;
 
-/// The best way: OpenCL on a device that shares with OpenGL, else on a GPU, else on any device,
-/// else GLSL.
+/// The best way to sharpen among others: by OpenGL, sharpening by OpenCL on a device that shares
+/// with it; else all by OpenCL on a GPU, else on any device; else all by OpenGL.
 /// @param wish "PLATFORM.DEVICE" by numbers, a part of their names, or "none" for no OpenCL; the
 ///        best when empty
 /// @param context the current OpenGL context
 /// @throws Failure when no device is what is wished
-std::unique_ptr<Sharpener> ChooseSharpener(OpenCLRuntime const &runtime, std::string const &wish,
+std::unique_ptr<Developer> ChooseDeveloper(OpenCLRuntime const &runtime, std::string const &wish,
                                            ORU::OGL::Context const &context);
 
 } // namespace Develop

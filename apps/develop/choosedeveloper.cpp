@@ -1,11 +1,13 @@
-// Which way to sharpen on this machine.
-#include "apps/develop/choosesharpener.h"
+// Which way to develop on this machine.
+#include "apps/develop/choosedeveloper.h"
 
 #include "apps/common/failure.h"
 #include "apps/common/unicode.h"
 #include "apps/develop/glslsharpener.h"
+#include "apps/develop/opencldeveloper.h"
 #include "apps/develop/openclruntime.h"
 #include "apps/develop/openclsharpener.h"
+#include "apps/develop/opengldeveloper.h"
 
 #include "oru/core/exceptions/logicalexception.h"
 
@@ -48,34 +50,38 @@ void KeepWished(std::vector<OpenCLDevice> &devices, std::string const &wish) {
                            (names.empty() ? std::string("none") : names));
 }
 
-std::unique_ptr<Sharpener> MakeOpenCLSharpener(OpenCLDevice const &device,
+std::unique_ptr<Developer> MakeOpenCLDeveloper(OpenCLDevice const &device,
                                                ORU::OGL::Context const &context) {
     if (Shares(device)) {
         try {
-            return std::make_unique<OpenCLSharpener>(device, &context);
+            return std::make_unique<OpenGLDeveloper>(
+                std::make_unique<OpenCLSharpener>(device, context));
         } catch (ORU::LogicalException const &) {
             // It shares with other contexts than this one: a GPU beside the one that draws, say.
         }
     }
-    return std::make_unique<OpenCLSharpener>(device, nullptr);
+    return std::make_unique<OpenCLDeveloper>(device);
+}
+
+std::unique_ptr<Developer> MakeGlslDeveloper(std::string const &reason) {
+    return std::make_unique<OpenGLDeveloper>(std::make_unique<GlslSharpener>(reason));
 }
 
 } // namespace
 
-std::unique_ptr<Sharpener> ChooseSharpener(OpenCLRuntime const &runtime, std::string const &wish,
+std::unique_ptr<Developer> ChooseDeveloper(OpenCLRuntime const &runtime, std::string const &wish,
                                            ORU::OGL::Context const &context) {
     if (wish == "none")
-        return std::make_unique<GlslSharpener>("as wished");
+        return MakeGlslDeveloper("as wished");
     std::vector<OpenCLDevice> devices = runtime.devices();
     if (!wish.empty())
         KeepWished(devices, wish);
     if (devices.empty())
-        return std::make_unique<GlslSharpener>(runtime.isAvailable() ? "no OpenCL device"
-                                                                     : "no OpenCL runtime");
+        return MakeGlslDeveloper(runtime.isAvailable() ? "no OpenCL device" : "no OpenCL runtime");
     auto const best = std::min_element(
         devices.begin(), devices.end(),
         [](OpenCLDevice const &a, OpenCLDevice const &b) { return Rank(a) < Rank(b); });
-    return MakeOpenCLSharpener(*best, context);
+    return MakeOpenCLDeveloper(*best, context);
 }
 
 } // namespace Develop
