@@ -2,7 +2,6 @@
 #include "apps/common/offscreengpu.h"
 
 #include "apps/common/failure.h"
-#include "apps/common/unicode.h"
 
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
@@ -19,10 +18,8 @@ using namespace ORU::OGL;
 
 OffscreenGpu::OffscreenGpu(std::string const &traceFile) {
     if (!traceFile.empty()) {
-        traceStream_.open(ToPath(traceFile));
-        if (!traceStream_)
-            throw Failure("the trace " + traceFile + " cannot be written");
-        tracer_ = std::make_unique<InterceptorScope<OpenGLTracer>>(traceStream_);
+        traceFile_ = std::make_unique<TraceFile>(traceFile);
+        tracer_ = std::make_unique<InterceptorScope<OpenGLTracer>>(traceFile_->stream());
     }
     context_ = std::make_unique<ContextOffscreen>();
     context_->makeCurrent();

@@ -2,11 +2,11 @@
 #pragma once
 
 #include "apps/common/image.h"
+#include "apps/common/tracefile.h"
 
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 
-#include <fstream>
 #include <memory>
 #include <string>
 
@@ -40,7 +40,7 @@ public:
 
 private:
     ORU::OGL::AutoInitializer library_;
-    std::ofstream traceStream_;
+    std::unique_ptr<TraceFile> traceFile_;
     std::unique_ptr<ORU::OGL::InterceptorScope<ORU::OGL::OpenGLTracer>> tracer_;
     std::unique_ptr<ORU::OGL::ContextOffscreen> context_;
 };

@@ -63,13 +63,12 @@ void Console::notice(std::string const &text) {
     drawBar();
 }
 
-void Console::progress(std::size_t done, std::size_t total, std::string const &pace) {
-    if (!hasBar_ || total < 2)
+void Console::progress(double share, std::string const &text) {
+    if (!hasBar_)
         return;
     clearBar();
-    std::size_t const filled = kBarCells * done / total;
-    bar_ = "[" + std::string(filled, '#') + std::string(kBarCells - filled, '.') + "] " +
-           std::to_string(done) + "/" + std::to_string(total) + (pace.empty() ? "" : ", ") + pace;
+    auto const filled = static_cast<std::size_t>(share * kBarCells);
+    bar_ = "[" + std::string(filled, '#') + std::string(kBarCells - filled, '.') + "] " + text;
     drawBar();
 }
 

@@ -30,9 +30,9 @@ public:
     /// As `problem`, for what was wished.
     void notice(std::string const &text);
 
-    /// Shows how far the work is, on a terminal and when there is more than one thing to do.
-    /// @param pace how fast it goes, or empty
-    void progress(std::size_t done, std::size_t total, std::string const &pace);
+    /// Shows how far the work is, on a terminal.
+    /// @param share from 0 to 1
+    void progress(double share, std::string const &text);
 
     /// Takes the progress bar away.
     void endProgress();

@@ -90,6 +90,12 @@ std::shared_future<RuntimePtr> LoadOpenCL(std::string const &folder) {
         .share();
 }
 
+/// The colours of a developed picture.
+ColourSpace SpaceOf(App::PictureHead const &head, Recipe const &recipe) {
+    std::vector<std::string> told; // by the queue already
+    return recipe.convertTo ? *recipe.convertTo : ColourSpace::Of(head.colour, head, told);
+}
+
 void MakeFolder(fs::path const &folder) {
     std::error_code error;
     fs::create_directories(folder, error);
@@ -160,8 +166,7 @@ private:
         recipe.sharpening = options_.sharpening;
         recipe.quality = options_.quality;
         if (!options_.convertTo.empty())
-            recipe.convertTo =
-                options_.convertTo == "p3" ? ColourSpace::DisplayP3() : ColourSpace::Srgb();
+            recipe.convertTo = NamedColourSpace(options_.convertTo);
         if (!options_.spots.empty())
             About(options_.spots, [&] { recipe.spots = ReadSpots(App::ToPath(options_.spots)); });
         About(options_.trace, [&] { RefuseToReplacePicture(App::ToPath(options_.trace)); });
@@ -225,25 +230,39 @@ private:
         Stopwatch const stopwatch;
         Pace pace(0);
         std::size_t next = 0;
-        console_.progress(done_, report_.photos.size(), std::string());
-        queue.run(
-            photos_,
-            [&](PhotoResult const &result) {
-                introduction.print();
-                finish(report_.photos[records_[next++]], result);
-                pace.add(stopwatch.milliseconds() / 1000);
-                console_.progress(++done_, report_.photos.size(), pace.text(photos_.size() - next));
-            },
-            cancellation_.isRequested());
+        showProgress(std::string());
+        auto const onDone = [&](PhotoResult const &result) {
+            introduction.print();
+            finish(report_.photos[records_[next++]], result, recipe);
+            pace.add(stopwatch.milliseconds() / 1000);
+            ++done_;
+            showProgress(pace.text(photos_.size() - next));
+        };
+        auto const onBand = [&](double share) {
+            // A small photo has one band; after Ctrl-C the bands under way only pass.
+            if (report_.photos.size() == 1 && share < 1 && !cancellation_.isRequested())
+                console_.progress(share, pace.textOfOne(share, stopwatch.milliseconds() / 1000));
+        };
+        queue.run(photos_, onDone, cancellation_.isRequested(), onBand);
         introduction.print();
         console_.endProgress();
     }
 
+    void showProgress(std::string const &pace) {
+        std::size_t const count = report_.photos.size();
+        if (count > 1)
+            console_.progress(static_cast<double>(done_) / static_cast<double>(count),
+                              std::to_string(done_) + "/" + std::to_string(count) +
+                                  (pace.empty() ? "" : ", ") + pace);
+    }
+
     /// Notes and tells what became of a photo.
-    void finish(PhotoRecord &record, PhotoResult const &result) {
+    void finish(PhotoRecord &record, PhotoResult const &result, Recipe const &recipe) {
         record.notes = result.notes;
-        if (result.head.width != 0)
+        if (result.head.width != 0) {
             record.shape = result.head;
+            record.colourSpace = SpaceOf(result.head, recipe).description();
+        }
         if (result.failure) {
             fail(record, ReasonOf(result.failure));
             return;

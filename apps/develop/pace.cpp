@@ -10,6 +10,15 @@ namespace {
 
 constexpr std::size_t kPhotos = 20;
 
+/// Such as ", 12 s left"; empty when nothing is left.
+std::string Left(double seconds) {
+    double const whole = std::ceil(seconds);
+    if (whole < 1)
+        return std::string();
+    return ", " + (whole < 60 ? std::to_string(static_cast<int>(whole)) + " s" : Duration(whole)) +
+           " left";
+}
+
 } // namespace
 
 std::string Duration(double seconds) {
@@ -39,11 +48,12 @@ std::string Pace::text(std::size_t left) const {
     double const each = time / static_cast<double>(ends_.size() - 1);
     char rate[64];
     std::snprintf(rate, sizeof rate, "%.*f photos a minute", each > 6 ? 1 : 0, 60 / each);
-    double const rest = std::ceil(each * static_cast<double>(left));
-    if (left == 0)
-        return rate;
-    return std::string(rate) + ", " +
-           (rest < 60 ? std::to_string(static_cast<int>(rest)) + " s" : Duration(rest)) + " left";
+    return rate + Left(each * static_cast<double>(left));
+}
+
+std::string Pace::textOfOne(double share, double now) const {
+    double const time = now - ends_.front();
+    return std::to_string(static_cast<int>(share * 100)) + " %" + Left(time / share - time);
 }
 
 } // namespace Develop

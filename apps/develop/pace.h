@@ -24,6 +24,9 @@ public:
     /// @param left how many photos are not done yet
     std::string text(std::size_t left) const;
 
+    /// As `text`, when there is only one photo and a share of it is done.
+    std::string textOfOne(double share, double now) const;
+
 private:
     std::deque<double> ends_; ///< of the last photos, with that of the one before them
 };

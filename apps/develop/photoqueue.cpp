@@ -78,7 +78,8 @@ PhotoQueue::PhotoQueue(Developer &developer, Recipe const &recipe,
 
 void PhotoQueue::run(std::vector<Photo> const &photos,
                      std::function<void(PhotoResult const &)> const &onDone,
-                     std::atomic<bool> const &isCancelled) {
+                     std::atomic<bool> const &isCancelled,
+                     std::function<void(double share)> const &onBand) {
     Belt belt;
     Worker decoder(belt, [&] {
         DecodeStage stage(base_, recipe_.reach(), limits_, belt.pool, belt.decoded);
@@ -102,6 +103,9 @@ void PhotoQueue::run(std::vector<Photo> const &photos,
     DevelopStage stage(developer_, recipe_, !base_.empty(), withReport_);
     while (std::optional<Piece> piece = belt.decoded.pop()) {
         stage.run(*piece);
+        if (onBand && piece->bands)
+            onBand(static_cast<double>(piece->number + 1) /
+                   static_cast<double>(piece->work->plan->bands()));
         belt.developed.push(std::move(*piece));
         tell();
     }

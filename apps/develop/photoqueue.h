@@ -42,9 +42,12 @@ public:
     /// @param onDone is called for each, on this thread, in their order
     /// @param isCancelled once true, no further photo is begun, and those under way leave no
     ///        file and are not reported
+    /// @param onBand is called on this thread with the share of a photo that is developed, before
+    ///        the photo is reported
     void run(std::vector<Photo> const &photos,
              std::function<void(PhotoResult const &)> const &onDone,
-             std::atomic<bool> const &isCancelled);
+             std::atomic<bool> const &isCancelled,
+             std::function<void(double share)> const &onBand = {});
 
 private:
     Developer &developer_;

@@ -22,7 +22,7 @@ struct PhotoRecord {
     std::vector<std::string> notes;
     double milliseconds = 0;
     std::optional<App::Shape> shape; ///< when the photo could be opened
-    std::string colourSpace;         ///< of the photo, or empty
+    std::string colourSpace;         ///< of the developed picture
 };
 
 struct RunReport {

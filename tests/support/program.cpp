@@ -6,6 +6,7 @@
 #include <windows.h>
 
 #include <algorithm>
+#include <cstring>
 #include <fstream>
 #include <iterator>
 
@@ -55,6 +56,15 @@ int Process::exitCode() const {
     DWORD code = 0;
     bool const ended = ::WaitForSingleObject(handle_, kMilliseconds) == WAIT_OBJECT_0;
     return ended && ::GetExitCodeProcess(handle_, &code) ? static_cast<int>(code) : -1;
+}
+
+void Process::pressControlC() const {
+    // The system starts this routine in all processes of a console, which the tests' may lack.
+    FARPROC const routine = ::GetProcAddress(::GetModuleHandleW(L"kernelbase.dll"), "CtrlRoutine");
+    LPTHREAD_START_ROUTINE start;
+    static_assert(sizeof start == sizeof routine, "function pointers have one size");
+    std::memcpy(&start, &routine, sizeof start);
+    ::CloseHandle(::CreateRemoteThread(handle_, nullptr, 0, start, nullptr, 0, nullptr));
 }
 
 Outcome RunProgram(std::string const &name, std::string const &arguments, fs::path const &folder) {

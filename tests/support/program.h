@@ -29,6 +29,9 @@ public:
     /// Waits for its end. @return its exit code, -1 when it never began or goes on for minutes
     int exitCode() const;
 
+    /// Does to it what a console does when Ctrl-C is pressed.
+    void pressControlC() const;
+
 private:
     void *handle_;
 };

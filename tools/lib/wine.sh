@@ -103,17 +103,23 @@ start_wine() {
     export ORU_WINE=$WINE
 }
 
+# pass_on: cat that Ctrl-C does not end, for a pipe: the program before it ends by itself.
+pass_on() {
+    trap '' INT
+    exec cat
+}
+
 # run_program PROGRAM ARGUMENT...: a Windows program whose output a person may watch. Wine must see no
 # terminal, or it draws a console of its own there that garbles UTF-8; ORU_TERMINAL=1 in the environment
-# tells the program that there is one all the same.
+# tells the program that there is one all the same. Ctrl-C ends the program; what it says then passes too.
 run_program() {
     local command=("$ORU_ROOT/tools/wine-run" "$@")
     if [ -t 1 ] && [ -t 2 ]; then
-        ORU_TERMINAL=1 "${command[@]}" 2>&1 8>&- | cat
+        ORU_TERMINAL=1 "${command[@]}" 2>&1 8>&- | pass_on
     elif [ -t 1 ]; then
-        ORU_TERMINAL=1 "${command[@]}" 8>&- | cat
+        ORU_TERMINAL=1 "${command[@]}" 8>&- | pass_on
     elif [ -t 2 ]; then
-        { "${command[@]}" 2>&1 >&3 8>&- | cat >&2; } 3>&1
+        { "${command[@]}" 2>&1 >&3 8>&- | pass_on >&2; } 3>&1
     else
         "${command[@]}" 8>&-
     fi

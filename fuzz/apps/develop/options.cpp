@@ -38,9 +38,10 @@ int LLVMFuzzerTestOneInput(std::uint8_t const *data, std::size_t size) {
         HOLDS(exitCode == 0 || exitCode == 2);
         return 0;
     }
-    HOLDS(exitCode == -1 && !options->inputs.empty());
+    HOLDS(exitCode == -1 && !(options->inputs.empty() && options->list.empty()));
     HOLDS(IsWithin(options->exposure, -100, 100));
     HOLDS(IsWithin(options->sharpening.amount, 0, 100));
     HOLDS(IsWithin(options->sharpening.sigma, 0.3, 20));
+    HOLDS(IsWithin(options->quality, 1, 100));
     return 0;
 }
