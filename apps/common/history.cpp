@@ -72,7 +72,7 @@ public:
     void set(unsigned int tag, std::uint64_t number) {
         TiffField const *const field = find(tag);
         bool const isLong = field && field->type == kLong;
-        if (field && field->count == 1 && (isLong || (field->type == kShort && number <= 0xFFFF)))
+        if (isLong || (field && field->type == kShort && number <= 0xFFFF))
             put(field->position, number, isLong ? 4 : 2);
     }
 
@@ -167,6 +167,9 @@ Orientation TakeExif(Bytes exif, PictureHead &head) {
             head.metadata.resolution = resolution;
         data.set(ORIENTATION, kUpright);
         data.dropThumbnail();
+        // Of directories that share bytes one spoils the other.
+        if (Exif(exif).number(ORIENTATION) > kUpright)
+            throw Failure("cannot be changed");
         head.metadata.exif = std::move(exif);
     } catch (Failure const &) {
         head.metadata.losses.push_back("the Exif data are damaged");
