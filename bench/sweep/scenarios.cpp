@@ -194,11 +194,11 @@ void OpenCL() {
 }
 
 /// As the program's main does it.
-void DevelopPhoto(std::vector<std::string> const &arguments) {
+void DevelopPhoto(std::initializer_list<char const *> arguments) {
     int result = 1;
     try {
         int code = 0;
-        auto const options = Develop::ParseOptions(arguments, code);
+        auto const options = Develop::ParseOptions({arguments.begin(), arguments.end()}, code);
         result = options ? Develop::RunJob(*options) : code;
     } catch (std::exception const &failure) {
         std::fprintf(stderr, "develop: %s\n", failure.what());
