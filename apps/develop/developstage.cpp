@@ -4,6 +4,8 @@
 #include "apps/common/picturefile.h"
 
 #include <cstdio>
+#include <string>
+#include <utility>
 
 namespace Develop {
 
@@ -23,6 +25,17 @@ App::PictureHead DevelopedHead(PhotoResult const &result, ColourSpace const &spa
     head.kind = App::KindOfName(result.photo.output).value_or(App::FileKind::Png);
     head.colour = space.tags(head);
     return head;
+}
+
+/// The records that a photo brings, for people.
+std::string History(App::Metadata const &metadata) {
+    std::string text;
+    for (auto const &[record, name] :
+         {std::pair(&metadata.exif, "Exif"), std::pair(&metadata.xmp, "XMP"),
+          std::pair(&metadata.iptc, "IPTC")})
+        if (!record->empty())
+            text += (text.empty() ? "" : ", ") + std::string(name);
+    return text.empty() ? "none" : text;
 }
 
 } // namespace
@@ -48,8 +61,10 @@ void DevelopStage::begin(PhotoWork &work) {
     ColourSpace const space =
         ColourSpace::Of(work.result.head.colour, work.result.head, work.result.notes);
     work.developedHead = DevelopedHead(work.result, recipe_.convertTo.value_or(space));
-    if (withReport_)
+    if (withReport_) {
         work.result.report.push_back("colours: " + space.description());
+        work.result.report.push_back("history: " + History(work.result.head.metadata));
+    }
     current_.emplace(work, space, recipe_);
     developer_.begin(current_->task);
 }
