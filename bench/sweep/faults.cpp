@@ -75,9 +75,9 @@ unsigned ErrorArgument(std::string const &name) {
 
 /// Names that a call makes or gives up. A deletion that fails counts: its caller can do no more.
 void CountNames(std::string const &name, std::uintptr_t const *arguments) {
-    if (name == "glCreateShader" || name == "glCreateProgram") {
+    if (name == "glCreateShader" || name == "glCreateProgram" || name == "glFenceSync") {
         ++gHoldings.names;
-    } else if (name == "glDeleteShader" || name == "glDeleteProgram") {
+    } else if (name == "glDeleteShader" || name == "glDeleteProgram" || name == "glDeleteSync") {
         gHoldings.names -= arguments[0] != 0;
     } else if (Begins(name, "wglCreateContext")) {
         ++gHoldings.contexts;

@@ -10,16 +10,23 @@
 #include "oru/oru_ocl/ocllibrary.h"
 #include "oru/oru_ocl/programocl.h"
 #include "oru/oru_ocl/sampler.h"
+#include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/blendscope.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
+#include "oru/oru_ogl/ogl/conditionalrenderscope.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
+#include "oru/oru_ogl/ogl/fence.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
+#include "oru/oru_ogl/ogl/gputimer.h"
 #include "oru/oru_ogl/ogl/linescope.h"
+#include "oru/oru_ogl/ogl/mappedrange.h"
 #include "oru/oru_ogl/ogl/programenabledscope.h"
 #include "oru/oru_ogl/ogl/programogl.h"
+#include "oru/oru_ogl/ogl/query.h"
+#include "oru/oru_ogl/ogl/queryscope.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 #include "oru/oru_ogl/ogl/shader.h"
@@ -29,11 +36,14 @@
 #include "oru/oru_ogl/ogl/texturebindscope.h"
 #include "oru/oru_ogl/ogl/texturestate.h"
 #include "oru/oru_ogl/ogl/textureunit.h"
+#include "oru/oru_ogl/ogl/uniformblockwriter.h"
+#include "oru/oru_ogl/ogl/vertexarray.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 #include "oru/oru_ogl/platformgl.h"
 #include "tests/support/testwindow.h"
 
 #include <array>
+#include <chrono>
 #include <cstdio>
 #include <stdexcept>
 
@@ -120,7 +130,75 @@ void Buffers() {
     Buffer::BindDefaultArrayBuffer();
     buffer.convertToElementArrayBuffer();
     buffer.bind();
+    buffer.orphan();
     Buffer::BindDefaultElementArrayBuffer();
+    Buffer other(64, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, bytes.data());
+    buffer.copySubData(other, 0, 32, 32);
+    buffer.bindRange(GL_UNIFORM_BUFFER, 0, 0, 64);
+    buffer.bindBase(GL_UNIFORM_BUFFER, 1);
+    Buffer::BindDefaultBase(GL_UNIFORM_BUFFER, 1);
+    MappedRange range(other, 0, 64, MappedRange::ACCESS_WRITE | MappedRange::ACCESS_FLUSH_EXPLICIT);
+    range.flush(0, 32);
+    range.unmap();
+    MappedRange const rest(other, 32, 32, MappedRange::ACCESS_READ);
+    BeginEnd();
+}
+
+void Queries() {
+    Fence const fence = Fence::ForOtherContexts();
+    static_cast<void>(fence.isSignalled());
+    static_cast<void>(fence.clientWait(std::chrono::seconds(1)));
+    fence.wait();
+    Query samples(Query::TYPE_SAMPLES), stamp(Query::TYPE_TIMESTAMP);
+    samples.begin();
+    samples.end();
+    static_cast<void>(samples.available());
+    static_cast<void>(samples.result());
+    stamp.record();
+    Query const borrowed(samples.objectID(), Query::TYPE_SAMPLES, borrow_name_tag());
+    GpuTimer timer(1);
+    for (int frame = 0; frame < 2; ++frame) {
+        timer.begin();
+        timer.end();
+        ORU_GL0(Finish);
+    }
+    static_cast<void>(timer.take());
+    ConditionalRenderScope const conditional(samples, ConditionalRenderScope::MODE_WAIT);
+    Query time(Query::TYPE_TIME_ELAPSED);
+    QueryScope const timing(time);
+    BeginEnd();
+}
+
+void VertexArrays() {
+    char const *const vertex = "#version 140\nin vec4 place; uniform Look { vec4 shift[2]; };"
+                               "void main() { gl_Position = place + shift[1]; }";
+    Program program;
+    program.loadVertexShader(1, &vertex, nullptr);
+    program.link(true);
+    program.enable();
+    UniformBlock const block(program, "Look");
+    block.setBinding(1);
+    static_cast<void>(block.binding());
+    UniformBlockWriter writer(block);
+    writer.set("shift", {1.f, 2.f, 3.f, 4.f}, 1);
+    Buffer look(block.size(), Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr);
+    writer.upload(look);
+    look.bindBase(GL_UNIFORM_BUFFER, 1);
+    std::array<unsigned int, 8> const numbers = {1, 1, 0, 0, 0, 1, 1, 0};
+    Buffer const buffer(sizeof numbers, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW,
+                        numbers.data());
+    VertexArray array;
+    array.setAttribute(0, buffer, VertexArray::Attribute(4, GL_UNSIGNED_BYTE).normalised());
+    array.setAttribute(1, buffer, VertexArray::Attribute(1, GL_INT).integer().divisor(1));
+    array.disableAttribute(1);
+    array.setIndices(buffer, GL_UNSIGNED_INT);
+    array.drawArrays(GL_POINTS, 0, 1);
+    array.drawElementsInstanced(GL_POINTS, 1, 2);
+    array.drawArraysIndirect(GL_POINTS, buffer);
+    array.bind();
+    array.drawRangeElements(GL_POINTS, 0, 1, 2, 0, 1);
+    VertexArray::BindDefault();
+    program.disable();
     BeginEnd();
 }
 
@@ -231,6 +309,8 @@ std::vector<Scenario> const &Scenarios() {
         {"wrapped", WrappedContext, Needs::Context, "wglMakeCurrent glGenLists glIsList"},
         {"textures", Textures, Needs::Context, ""},
         {"buffers", Buffers, Needs::Context, ""},
+        {"queries", Queries, Needs::Context, ""},
+        {"arrays", VertexArrays, Needs::Context, ""},
         {"framebuffers", Framebuffers, Needs::Context, ""},
         {"programs", Programs, Needs::Context, ""},
         // Wrappers do not look at what retaining and releasing lead to.

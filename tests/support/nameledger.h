@@ -5,6 +5,7 @@
 #include "oru/oru_ogl/extensionator/openglforwarder.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <cstdint>
 #include <map>
 #include <mutex>
 #include <string>
@@ -31,6 +32,7 @@ public:
     }
     ORU_FOLLOW(Buffers)
     ORU_FOLLOW(FramebuffersEXT)
+    ORU_FOLLOW(Queries)
     ORU_FOLLOW(RenderbuffersEXT)
     ORU_FOLLOW(Textures)
     ORU_FOLLOW(VertexArrays)
@@ -50,6 +52,17 @@ public:
     ORU_FOLLOW(Program, (char const *file, unsigned int line), file, line)
 #undef ORU_FOLLOW
 
+    GLsync cgmFenceSync(char const *file, unsigned int line, GLenum condition,
+                        GLbitfield flags) override {
+        GLsync const sync = OpenGLForwarder::cgmFenceSync(file, line, condition, flags);
+        note(sync, 1);
+        return sync;
+    }
+    void cgmDeleteSync(char const *file, unsigned int line, GLsync sync) override {
+        note(sync, -1);
+        OpenGLForwarder::cgmDeleteSync(file, line, sync);
+    }
+
     /// The names that were not deleted or deleted twice, empty when all is well.
     std::string leaks() const {
         std::string text;
@@ -63,6 +76,11 @@ private:
         std::lock_guard<std::mutex> const lock(mutex_);
         for (GLsizei i = 0; i < n; ++i)
             balances_[kind + std::to_string(names[i])] += change;
+    }
+
+    void note(GLsync sync, int change) {
+        std::lock_guard<std::mutex> const lock(mutex_);
+        balances_["Sync" + std::to_string(reinterpret_cast<std::uintptr_t>(sync))] += change;
     }
 
     std::mutex mutex_;

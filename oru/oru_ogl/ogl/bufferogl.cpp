@@ -6,6 +6,7 @@
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/adopting.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
+#include "oru/oru_ogl/ogl/internal/objects/ending.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
@@ -170,17 +171,33 @@ void Buffer::convertToUnpackBuffer() {
               "Buffer::convertToUnpackBuffer cannot convert buffer target while bound");
 }
 
-void *Buffer::map(unsigned int access) {
+template<class Call>
+void *Buffer::mapBy(Call call) {
     if (isMapped())
         ORU_THROW_INTERNAL("Buffer is already mapped (this will cause a GL error)");
     try {
-        void *const address = ORU_GL(MapBuffer, target(), access);
+        void *const address = call();
         mapped_ = true;
         return address;
     } catch (...) {
         askWhetherMapped();
         throw;
     }
+}
+
+void *Buffer::map(unsigned int access) {
+    return mapBy([&] { return ORU_GL(MapBuffer, target(), access); });
+}
+
+void *Buffer::mapRange(std::int64_t offset, std::int64_t size, unsigned int access) {
+    requireRange("mapRange", offset, size);
+    return mapBy([&] { return ORU_GL(MapBufferRange, target(), offset, size, access); });
+}
+
+void Buffer::flushMappedRange(std::int64_t offset, std::int64_t size) {
+    if (!isMapped())
+        ORU_THROW_INTERNAL("Buffer::flushMappedRange: the buffer is not mapped");
+    ORU_GL(FlushMappedBufferRange, target(), offset, size);
 }
 
 void Buffer::askWhetherMapped() noexcept {
@@ -206,9 +223,25 @@ void Buffer::unmap() {
     mapped_ = false;
 }
 
-void Buffer::checkTransfer(char const *operation, std::int64_t offset, void const *data) const {
+void Buffer::requireUnmapped(char const *operation) const {
     if (isMapped())
         ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " buffer cannot be mapped"));
+}
+
+void Buffer::requireRange(char const *operation, std::int64_t offset, std::int64_t size) const {
+    requireObject();
+    if (offset < 0)
+        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " offset must not be negative"));
+    if (size < 1)
+        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " size must be at least 1"));
+    if (offset > size_ || size > size_ - offset)
+        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " the range of ", size,
+                                       " bytes from ", offset, " on leaves the buffer, which has ",
+                                       size_));
+}
+
+void Buffer::checkTransfer(char const *operation, std::int64_t offset, void const *data) const {
+    requireUnmapped(operation);
     if (!data)
         ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " pointer to data must not be NULL"));
     if (offset < 0)
@@ -223,6 +256,47 @@ void Buffer::subData(std::int64_t offset, std::int64_t size, void const *data) {
 void Buffer::getSubData(std::int64_t offset, std::int64_t size, void *data) {
     checkTransfer("getSubData", offset, data);
     ORU_GL(GetBufferSubData, target(), offset, size, data);
+}
+
+void Buffer::orphan() {
+    requireUnmapped("orphan");
+    ORU_GL(BufferData, target(), size_, nullptr, Usage2GL(usagePolicy_));
+}
+
+void Buffer::copySubData(Buffer const &source, std::int64_t sourceOffset, std::int64_t offset,
+                         std::int64_t size) {
+    requireUnmapped("copySubData");
+    source.requireUnmapped("copySubData");
+    source.requireRange("copySubData", sourceOffset, size);
+    requireRange("copySubData", offset, size);
+    GLint reader = 0, writer = 0;
+    // The names of these two targets ask for what is bound to them, too.
+    ORU_GL(GetIntegerv, GL_COPY_READ_BUFFER, &reader);
+    ORU_GL(GetIntegerv, GL_COPY_WRITE_BUFFER, &writer);
+    internal::Ending restoreReader(
+        [=] { ORU_GL(BindBuffer, GL_COPY_READ_BUFFER, static_cast<GLuint>(reader)); });
+    ORU_GL(BindBuffer, GL_COPY_READ_BUFFER, source.objectID_);
+    internal::Ending restoreWriter(
+        [=] { ORU_GL(BindBuffer, GL_COPY_WRITE_BUFFER, static_cast<GLuint>(writer)); });
+    ORU_GL(BindBuffer, GL_COPY_WRITE_BUFFER, objectID_);
+    ORU_GL(CopyBufferSubData, GL_COPY_READ_BUFFER, GL_COPY_WRITE_BUFFER, sourceOffset, offset,
+           size);
+    restoreWriter.now();
+    restoreReader.now();
+}
+
+void Buffer::bindBase(unsigned int target, unsigned int index) const {
+    ORU_GL(BindBufferBase, target, index, checkedID());
+}
+
+void Buffer::bindRange(unsigned int target, unsigned int index, std::int64_t offset,
+                       std::int64_t size) const {
+    requireRange("bindRange", offset, size);
+    ORU_GL(BindBufferRange, target, index, objectID_, offset, size);
+}
+
+void Buffer::BindDefaultBase(unsigned int target, unsigned int index) {
+    ORU_GL(BindBufferBase, target, index, 0);
 }
 
 bool Buffer::isArrayBuffer() const {

@@ -9,8 +9,8 @@ namespace ORU::OGL {
 
 /// One OpenGL buffer object, used as pixel unpack, pixel pack, array or element array buffer.
 ///
-/// `map`, `unmap`, `subData` and `getSubData` act on what is bound to the buffer's target and do
-/// not bind: call `bind()` first.
+/// `map`, `mapRange`, `unmap`, `subData`, `getSubData` and `orphan` act on what is bound to the
+/// buffer's target and do not bind: call `bind()` first. A MappedRange binds by itself.
 ///
 /// ```cpp
 /// Buffer pixels(width * height * 4, Buffer::TYPE_PIXEL_UNPACK_BUFFER,
@@ -123,6 +123,62 @@ public:
     /// @note glGetBufferSubData
     void getSubData(std::int64_t offset, std::int64_t size, void *data);
 
+    /// Maps a part of the store into memory; `unmap()` ends that. A MappedRange does both.
+    /// @param offset, size bytes
+    /// @param access bits: GL_MAP_READ_BIT and its kin
+    /// @return `size` bytes, valid until `unmap()`
+    /// @throws InternalException when mapped already, or for a range that leaves the store;
+    ///         ExceptionOGL when OpenGL refuses, the buffer not being bound say
+    /// @note glMapBufferRange; needs OpenGL 3.0 or GL_ARB_map_buffer_range
+    void *mapRange(std::int64_t offset, std::int64_t size, unsigned int access);
+
+    /// Hands over what was written to a part of the mapping that was made with
+    /// GL_MAP_FLUSH_EXPLICIT_BIT.
+    /// @param offset, size bytes, counted from the beginning of the mapping
+    /// @throws InternalException when not mapped; ExceptionOGL for a range that leaves the mapping
+    /// @note glFlushMappedBufferRange; needs OpenGL 3.0 or GL_ARB_map_buffer_range
+    void flushMappedRange(std::int64_t offset, std::int64_t size);
+
+    /// Gives the store up to the commands that still read it and makes a new one of the same size
+    /// and usage, without contents: what is written next waits for nobody.
+    /// @throws InternalException while mapped; ExceptionOGL when there is no memory
+    /// @note glBufferData
+    void orphan();
+
+    /// Copies a part of another buffer, or of this one, without a way through the host's memory.
+    /// @param source may be this buffer, for ranges that do not meet
+    /// @param sourceOffset, offset, size bytes
+    /// @throws InternalException while one of the two is mapped, or for a range that leaves its
+    ///         store; ExceptionOGL for ranges of one buffer that meet
+    /// @note glGetIntegerv, glBindBuffer, glCopyBufferSubData; needs OpenGL 3.1 or
+    ///       GL_ARB_copy_buffer
+    void copySubData(Buffer const &source, std::int64_t sourceOffset, std::int64_t offset,
+                     std::int64_t size);
+
+    /// @name Numbered binding points
+    /// Where a program finds uniform blocks, and feedback is written to. OpenGL binds the buffer to
+    /// the target itself too. OpenGL 3.0, for uniform blocks 3.1 or GL_ARB_uniform_buffer_object.
+    /// @param target GL_UNIFORM_BUFFER or GL_TRANSFORM_FEEDBACK_BUFFER, or what else the context
+    /// has
+    /// @param index which binding point
+    /// @throws ExceptionOGL for a target that has no such point
+    /// @{
+
+    /// Binds the whole buffer. @note glBindBufferBase
+    void bindBase(unsigned int target, unsigned int index) const;
+
+    /// Binds a part of the buffer.
+    /// @param offset, size bytes; of a uniform block the offset is a multiple of
+    ///        UniformBlock::OffsetAlignment()
+    /// @throws InternalException for a range that leaves the store
+    /// @note glBindBufferRange
+    void bindRange(unsigned int target, unsigned int index, std::int64_t offset,
+                   std::int64_t size) const;
+
+    /// Binds no buffer. @note glBindBufferBase
+    static void BindDefaultBase(unsigned int target, unsigned int index);
+    /// @}
+
     /// @name What the buffer is bound to
     /// One of them is true.
     /// @{
@@ -164,9 +220,15 @@ private:
     void fill(void const *data);
     void deleteObject() noexcept;
 
+    /// Maps by a call that returns the address.
+    template<class Call>
+    void *mapBy(Call call);
+
     /// After a map or unmap that failed: an error that was pending before ends them, too, when they
     /// are done. @note glGetBufferParameteriv
     void askWhetherMapped() noexcept;
+    void requireRange(char const *operation, std::int64_t offset, std::int64_t size) const;
+    void requireUnmapped(char const *operation) const;
     void checkTransfer(char const *operation, std::int64_t offset, void const *data) const;
 
     std::int64_t size_;

@@ -3,10 +3,13 @@
 #include "tests/support/texturekinds.h"
 
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
+#include "oru/oru_ogl/ogl/fence.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/programogl.h"
+#include "oru/oru_ogl/ogl/query.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/shader.h"
+#include "oru/oru_ogl/ogl/vertexarray.h"
 
 #include <functional>
 #include <type_traits>
@@ -108,6 +111,43 @@ struct Handling<Renderbuffer> {
         }};
 };
 
+template<>
+struct Handling<Query> {
+    static Query Make() {
+        Query query(Query::TYPE_SAMPLES);
+        query.begin(); // until then its name stands for none yet
+        query.end();
+        return query;
+    }
+    static bool Lives(unsigned int name) { return ORU_GL(IsQuery, name); }
+    static std::string Tell(Query const &q) { return TextOf(q.type(), q.result()); }
+    static inline std::function<void(Query &)> const kUses[] = {
+        [](Query &q) { q.begin(); },  [](Query &q) { q.end(); },       [](Query &q) { q.record(); },
+        [](Query &q) { q.type(); },   [](Query &q) { q.available(); }, [](Query &q) { q.result(); },
+        [](Query &q) { q.isBound(); }};
+};
+
+template<>
+struct Handling<VertexArray> {
+    static VertexArray Make() { return VertexArray(); }
+    static bool Lives(unsigned int name) { return ORU_GL(IsVertexArray, name); }
+    static std::string Tell(VertexArray const &a) { return TextOf(a.target()); }
+    static inline std::function<void(VertexArray &)> const kUses[] = {
+        [](VertexArray &a) { a.bind(); }, [](VertexArray &a) { a.disableAttribute(0); },
+        [](VertexArray &a) { a.drawArrays(GL_POINTS, 0, 1); },
+        [](VertexArray &a) { a.drawElements(GL_POINTS, 1); }};
+};
+
+template<>
+struct Handling<Fence> {
+    static Fence Make() { return Fence(); }
+    static bool Lives(GLsync sync) { return ORU_GL(IsSync, sync); }
+    static std::string Tell(Fence const &f) { return TextOf(f.clientWait(std::chrono::hours(1))); }
+    static inline std::function<void(Fence &)> const kUses[] = {
+        [](Fence &f) { f.wait(); }, [](Fence &f) { f.clientWait({}); },
+        [](Fence &f) { f.isSignalled(); }, [](Fence &f) { f.disown(); }};
+};
+
 char const *const kSource = "void main() { gl_Position = vec4(0.0); }";
 
 template<>
@@ -139,6 +179,7 @@ protected:
     static unsigned int NameOf(ORU::OGL::Object const &object) { return object.objectID(); }
     static unsigned int NameOf(Shader const &shader) { return shader.shaderID(); }
     static unsigned int NameOf(Program const &program) { return program.programID(); }
+    static GLsync NameOf(Fence const &fence) { return fence.sync(); }
 
     static void ExpectEmpty(Object &object) {
         for (auto const &use : Handling<Object>::kUses) {
@@ -149,8 +190,9 @@ protected:
     }
 };
 
-using Kinds = testing::Types<Texture1D, Texture2D, TextureRECT, Texture1DArray, Texture3D,
-                             Texture2DArray, Buffer, Framebuffer, Renderbuffer, Shader, Program>;
+using Kinds =
+    testing::Types<Texture1D, Texture2D, TextureRECT, Texture1DArray, Texture3D, Texture2DArray,
+                   Buffer, Fence, Framebuffer, Query, Renderbuffer, Shader, Program, VertexArray>;
 
 } // namespace
 
@@ -159,7 +201,7 @@ TYPED_TEST_SUITE(Handles, Kinds, ); // with the comma, as clang wants an argumen
 TYPED_TEST(Handles, Move) {
     using It = Handling<TypeParam>;
     TypeParam first = It::Make();
-    unsigned int const name = this->NameOf(first);
+    auto const name = this->NameOf(first);
     std::string const told = It::Tell(first);
     TypeParam second(std::move(first));
     EXPECT_EQ(name, this->NameOf(second));
@@ -167,7 +209,7 @@ TYPED_TEST(Handles, Move) {
     this->ExpectEmpty(first);
 
     TypeParam third = It::Make();
-    unsigned int const replaced = this->NameOf(third);
+    auto const replaced = this->NameOf(third);
     third = std::move(second);
     EXPECT_EQ(name, this->NameOf(third));
     EXPECT_EQ(told, It::Tell(third));
@@ -190,11 +232,13 @@ TYPED_TEST(Handles, Move) {
 TYPED_TEST(Handles, TakeOverAndGiveUpNames) {
     using It = Handling<TypeParam>;
     TypeParam owner = It::Make();
-    unsigned int const name = this->NameOf(owner);
+    auto const name = this->NameOf(owner);
     std::string const told = It::Tell(owner);
     auto const made = [&](ownership_tag ownership) {
         if constexpr (std::is_same_v<TypeParam, Buffer>)
             return Buffer(name, Buffer::TYPE_PIXEL_UNPACK_BUFFER, ownership);
+        else if constexpr (std::is_same_v<TypeParam, Query>)
+            return Query(name, Query::TYPE_SAMPLES, ownership);
         else
             return TypeParam(name, ownership);
     };

@@ -2,14 +2,21 @@
 #include "tests/support/texturekinds.h"
 
 #include "oru/oru_ogl/ogl/blendscope.h"
+#include "oru/oru_ogl/ogl/conditionalrenderscope.h"
+#include "oru/oru_ogl/ogl/fence.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
+#include "oru/oru_ogl/ogl/gputimer.h"
 #include "oru/oru_ogl/ogl/linescope.h"
+#include "oru/oru_ogl/ogl/mappedrange.h"
 #include "oru/oru_ogl/ogl/oruopengl.h"
 #include "oru/oru_ogl/ogl/programenabledscope.h"
 #include "oru/oru_ogl/ogl/programogl.h"
+#include "oru/oru_ogl/ogl/query.h"
+#include "oru/oru_ogl/ogl/queryscope.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/shader.h"
 #include "oru/oru_ogl/ogl/texturebindscope.h"
+#include "oru/oru_ogl/ogl/vertexarray.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 
 using namespace oru_test;
@@ -26,6 +33,13 @@ struct Everything {
     VertexBuffer vertices{{VertexBuffer::Field("", VertexBuffer::ATTRIBUTETYPE_FLOAT, {})},
                           1,
                           VertexBuffer::PRIMITIVETYPE_POINTS};
+    VertexArray array;
+    Fence fence;
+    GpuTimer timer;
+    Query samples{Query::TYPE_SAMPLES}, time{Query::TYPE_TIME_ELAPSED};
+    QueryScope timing{time};
+    std::optional<ConditionalRenderScope> conditional;
+    std::optional<MappedRange> mapped;
     TemporaryAlphaBlendScope blend;
     TemporaryLineWidthScope width{3};
     TemporaryLineSmoothScope smooth;
@@ -36,6 +50,10 @@ struct Everything {
     Everything() {
         if (!IsCoreRun())
             stipple.emplace(static_cast<unsigned char>(1), 2, static_cast<unsigned short>(0xAAAA));
+        mapped.emplace(buffer, 0, 4, MappedRange::ACCESS_WRITE);
+        samples.begin();
+        samples.end();
+        conditional.emplace(samples, ConditionalRenderScope::MODE_NO_WAIT);
         char const *const source = "void main() { gl_Position = vec4(0); }";
         program.loadVertexShader(1, &source, nullptr);
         program.link(true);
