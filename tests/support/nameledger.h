@@ -32,6 +32,7 @@ public:
     ORU_FOLLOW(Buffers)
     ORU_FOLLOW(FramebuffersEXT)
     ORU_FOLLOW(RenderbuffersEXT)
+    ORU_FOLLOW(Samplers)
     ORU_FOLLOW(Textures)
     ORU_FOLLOW(VertexArrays)
 #undef ORU_FOLLOW

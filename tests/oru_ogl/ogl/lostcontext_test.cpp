@@ -8,6 +8,8 @@
 #include "oru/oru_ogl/ogl/programenabledscope.h"
 #include "oru/oru_ogl/ogl/programogl.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
+#include "oru/oru_ogl/ogl/sampler.h"
+#include "oru/oru_ogl/ogl/samplerbindscope.h"
 #include "oru/oru_ogl/ogl/shader.h"
 #include "oru/oru_ogl/ogl/texturebindscope.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
@@ -21,6 +23,8 @@ struct Everything {
     Buffer buffer{4, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr};
     Framebuffer framebuffer;
     Renderbuffer renderbuffer{GL_RGBA8, 1, 1};
+    Sampler sampler{Texture::FILTER_LINEAR, Texture::FILTER_LINEAR, Texture::WRAPMODE_REPEAT};
+    SamplerBindScope sampled{sampler, 1};
     VertexShader shader;
     Program program;
     VertexBuffer vertices{{VertexBuffer::Field("", VertexBuffer::ATTRIBUTETYPE_FLOAT, {})},
