@@ -15,6 +15,7 @@
 #include "oru/oru_ogl/ogl/blendscope.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/conditionalrenderscope.h"
+#include "oru/oru_ogl/ogl/buffertexture.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
@@ -28,12 +29,16 @@
 #include "oru/oru_ogl/ogl/query.h"
 #include "oru/oru_ogl/ogl/queryscope.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
+#include "oru/oru_ogl/ogl/sampler.h"
+#include "oru/oru_ogl/ogl/samplerbindscope.h"
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 #include "oru/oru_ogl/ogl/shader.h"
 #include "oru/oru_ogl/ogl/texture1.h"
 #include "oru/oru_ogl/ogl/texture2.h"
+#include "oru/oru_ogl/ogl/texture2dmultisample.h"
 #include "oru/oru_ogl/ogl/texture3.h"
 #include "oru/oru_ogl/ogl/texturebindscope.h"
+#include "oru/oru_ogl/ogl/texturecube.h"
 #include "oru/oru_ogl/ogl/texturestate.h"
 #include "oru/oru_ogl/ogl/textureunit.h"
 #include "oru/oru_ogl/ogl/uniformblockwriter.h"
@@ -224,6 +229,56 @@ void Framebuffers() {
     BeginEnd();
 }
 
+void LaterTextures() {
+    std::vector<unsigned char> pixels(8 * 8 * 4 * 4);
+    PixelUnpackParameters const plain;
+    TextureCube sky(kRGBA8, 8, true);
+    TextureUnit::Unit(0)->bind(&sky);
+    auto const face = TextureCube::FACE_NEGATIVE_Z;
+    sky.subImage(face, 0, 0, 0, 8, 8, kRGBA, kBytes, pixels.data(), plain);
+    sky.generateMipmap();
+    sky.getPixelData(face, pixels.data(), 0, kRGBA, kBytes, 1);
+    sky.setLevelRange(0, 2);
+    sky.setSwizzle(Texture::SWIZZLE_RED, Texture::SWIZZLE_RED, Texture::SWIZZLE_RED,
+                   Texture::SWIZZLE_ONE);
+    sky.setCompare(Texture::COMPARE_NONE);
+    TextureCubeArray const rooms(kRGBA8, 4, 2, false);
+    Texture2D blocks(Texture::INTERNALFORMAT_COMPRESSED_RED_RGTC1, 8, 8, false);
+    TextureUnit::Unit(0)->bind(&blocks);
+    blocks.compressedSubImage(0, 0, 0, 8, 8, pixels.data(), 32);
+    blocks.getCompressedData(pixels.data(), 32, 0);
+    Buffer buffer(256, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr);
+    BufferTexture const row(kRGBA8, buffer);
+    ORU::OGL::Sampler smooth(Texture::FILTER_LINEAR, Texture::FILTER_LINEAR,
+                             Texture::WRAPMODE_REPEAT);
+    SamplerBindScope const scope(smooth, 1);
+    BeginEnd();
+}
+
+void FramebufferTransfers() {
+    ORU::IntegerRect const all({0, 0}, ORU::size2(8, 8));
+    std::array<unsigned char, 256> pixels = {};
+    float const colour[4] = {};
+    Texture2D picture(kRGBA8, 8, 8, false);
+    Texture2DMultisample const samples(kRGBA8, 8, 8, 4);
+    Renderbuffer const depth(GL_DEPTH24_STENCIL8, 8, 8, 4);
+    Framebuffer several;
+    several.bind();
+    several.attachTexture(samples, 0, Framebuffer::ATTACHMENT_COLOR0);
+    several.attachRenderbuffer(depth, Framebuffer::ATTACHMENT_DEPTH_AND_STENCIL);
+    several.setDrawBuffers({Framebuffer::ATTACHMENT_COLOR0});
+    Framebuffer one;
+    one.bind();
+    one.attachTexture(picture, 0, Framebuffer::ATTACHMENT_COLOR0);
+    if (!one.incompleteness().empty())
+        throw std::logic_error("the framebuffer is not complete");
+    Framebuffer::BindDefault();
+    Framebuffer::ClearColor(&several, 0, colour, &all);
+    Framebuffer::Resolve(&several, &one, all.size());
+    Framebuffer::Read(&one, all, kRGBA, kBytes, pixels.data(), 1);
+    BeginEnd();
+}
+
 void Programs() {
     char const *const vertex = "attribute vec4 place; void main() { gl_Position = place; }";
     char const *const fragment = "uniform vec4 colour; void main() { gl_FragColor = colour; }";
@@ -312,6 +367,8 @@ std::vector<Scenario> const &Scenarios() {
         {"queries", Queries, Needs::Context, ""},
         {"arrays", VertexArrays, Needs::Context, ""},
         {"framebuffers", Framebuffers, Needs::Context, ""},
+        {"later-textures", LaterTextures, Needs::Context, ""},
+        {"framebuffer-transfers", FramebufferTransfers, Needs::Context, ""},
         {"programs", Programs, Needs::Context, ""},
         // Wrappers do not look at what retaining and releasing lead to.
         {"opencl", OpenCL, Needs::OpenCL, "clRetain clRelease"},

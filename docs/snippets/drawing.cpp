@@ -13,6 +13,7 @@
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/shader.h"
 #include "oru/oru_ogl/ogl/texture2.h"
+#include "oru/oru_ogl/ogl/texture2dmultisample.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 #include "oru/oru_ogl/platformgl.h"
 
@@ -150,6 +151,29 @@ TEST_F(DrawingGuide, DrawsASquare) {
     framebuffer.detach(&picture, 0);
     framebuffer.unbind();
     // [unbind]
+}
+
+TEST_F(DrawingGuide, ResolvesSamples) {
+    // [resolve]
+    Texture2DMultisample const samples(Texture::INTERNALFORMAT_RGBA8, 64, 64, 4);
+    Texture2D smooth(Texture::INTERNALFORMAT_RGBA8, 64, 64, false);
+    Framebuffer scene, resolved;
+    resolved.bind();
+    resolved.attachTexture(smooth, 0, Framebuffer::ATTACHMENT_COLOR0);
+    scene.bind();
+    scene.attachTexture(samples, 0, Framebuffer::ATTACHMENT_COLOR0);
+    std::string const problem = scene.incompleteness(); // empty: it can be drawn into
+
+    float const red[] = {1, 0, 0, 1};
+    Framebuffer::ClearColor(&scene, 0, red, nullptr); // all of it; or a rectangle
+    Framebuffer::Resolve(&scene, &resolved, ORU::size2(64, 64));
+    std::array<unsigned char, 4> texel = {};
+    Framebuffer::Read(&resolved, ORU::IntegerRect({5, 7}, 1), Texture::FORMAT_RGBA,
+                      Texture::TYPE_UNSIGNED_BYTE, texel.data(), 1);
+    // [resolve]
+    EXPECT_EQ("", problem);
+    EXPECT_EQ((std::array<unsigned char, 4>{255, 0, 0, 255}), texel);
+    Framebuffer::BindDefault();
 }
 
 TEST_F(DrawingGuide, ChangesOneField) {

@@ -6,9 +6,12 @@
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
+#include "oru/oru_ogl/ogl/sampler.h"
+#include "oru/oru_ogl/ogl/samplerbindscope.h"
 #include "oru/oru_ogl/ogl/texture1.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"
+#include "oru/oru_ogl/ogl/texturecube.h"
 #include "oru/oru_ogl/ogl/texturestate.h"
 #include "oru/oru_ogl/ogl/textureunit.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -169,6 +172,40 @@ TEST_F(TexturesGuide, HasLevelsAndLayers) {
     std::vector<unsigned char> back(64 * 64 * 4 * 10);
     frames.getPixelData(back.data(), 0, Texture::FORMAT_RGBA, Texture::TYPE_UNSIGNED_BYTE, 1);
     EXPECT_TRUE(std::equal(pixels.begin(), pixels.end(), &back[64 * 64 * 4 * 7]));
+}
+
+TEST_F(TexturesGuide, HasCubesBlocksAndSamplers) {
+    std::vector<unsigned char> const pixels = photo(64 * 64 * 4), blocks = photo(64 * 64);
+    {
+        // [compressed]
+        Texture2D texture(Texture::INTERNALFORMAT_COMPRESSED_RGBA_S3TC_DXT5_EXT, 64, 64, true);
+        TextureUnit::Unit(0)->bind(&texture);
+        texture.compressedSubImage(0, 0, 0, 64, 64, blocks.data(), blocks.size());
+        // [compressed]
+        std::vector<unsigned char> back(blocks.size());
+        texture.getCompressedData(back.data(), back.size(), 0);
+        EXPECT_EQ(blocks, back);
+    }
+    // [cube]
+    TextureCube sky(Texture::INTERNALFORMAT_SRGB8_ALPHA8, 64, true);
+    TextureUnit::Unit(0)->bind(&sky);
+    for (TextureCube::Face face : kCubeFaces)
+        sky.subImage(face, 0, 0, 0, 64, 64, Texture::FORMAT_RGBA, Texture::TYPE_UNSIGNED_BYTE,
+                     pixels.data(), PixelUnpackParameters());
+    sky.generateMipmap();
+    // [cube]
+    std::vector<unsigned char> back(pixels.size());
+    sky.getPixelData(TextureCube::FACE_NEGATIVE_Z, back.data(), 0, Texture::FORMAT_RGBA,
+                     Texture::TYPE_UNSIGNED_BYTE, 1);
+    EXPECT_EQ(pixels, back);
+    // [sampler]
+    Sampler shadows(Texture::FILTER_LINEAR, Texture::FILTER_LINEAR,
+                    Texture::WRAPMODE_CLAMP_TO_EDGE);
+    shadows.setCompare(Texture::COMPARE_LEQUAL); // for a sampler2DShadow
+    SamplerBindScope const scope(shadows, 2);
+    // [sampler]
+    TextureState::SetActiveTextureUnit(2);
+    EXPECT_TRUE(shadows.isBound());
 }
 
 TEST_F(TexturesGuide, CopiesWhatWasDrawn) {

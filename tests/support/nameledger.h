@@ -34,6 +34,7 @@ public:
     ORU_FOLLOW(FramebuffersEXT)
     ORU_FOLLOW(Queries)
     ORU_FOLLOW(RenderbuffersEXT)
+    ORU_FOLLOW(Samplers)
     ORU_FOLLOW(Textures)
     ORU_FOLLOW(VertexArrays)
 #undef ORU_FOLLOW

@@ -12,7 +12,9 @@
 #include "oru/oru_ogl/ogl/texture3.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <algorithm>
 #include <utility>
+#include <vector>
 
 namespace ORU::OGL {
 
@@ -28,6 +30,48 @@ GLenum ColorAttachment(unsigned int colorIndex) {
         ORU_THROW_INTERNAL(ComposeText("Invalid color buffer attachment only ", maximum,
                                        " attachments supported with ", colorIndex, " requested"));
     return GL_COLOR_ATTACHMENT0_EXT + colorIndex;
+}
+
+/// Calls `attach` with the GL points that a point stands for.
+template<class Attach>
+void ForEachPoint(Framebuffer::AttachmentPoint point, Attach attach) {
+    if (point == Framebuffer::ATTACHMENT_NONE)
+        ORU_THROW_INTERNAL("Nothing can be attached at ATTACHMENT_NONE: name a colour, depth or "
+                           "stencil");
+    if (point < Framebuffer::ATTACHMENT_DEPTH)
+        attach(ColorAttachment(point));
+    if (point == Framebuffer::ATTACHMENT_DEPTH ||
+        point == Framebuffer::ATTACHMENT_DEPTH_AND_STENCIL)
+        attach(GL_DEPTH_ATTACHMENT_EXT);
+    if (point == Framebuffer::ATTACHMENT_STENCIL ||
+        point == Framebuffer::ATTACHMENT_DEPTH_AND_STENCIL)
+        attach(GL_STENCIL_ATTACHMENT_EXT);
+}
+
+/// What draws into a point, or reads from it, as OpenGL takes it.
+GLenum ColorBuffer(Framebuffer::AttachmentPoint point) {
+    if (point == Framebuffer::ATTACHMENT_NONE)
+        return GL_NONE;
+    if (point >= Framebuffer::ATTACHMENT_DEPTH)
+        ORU_THROW_INTERNAL("Depth and stencil are no draw or read buffers: name colours, or "
+                           "ATTACHMENT_NONE");
+    return ColorAttachment(point);
+}
+
+/// How many images a level of a texture has that can be attached one by one; 0 for just one.
+std::uint64_t LayersOf(Texture const &texture, unsigned int level) {
+    switch (texture.target()) {
+    case GL_TEXTURE_1D_ARRAY:
+        return texture.height(0);
+    case GL_TEXTURE_3D:
+        return std::max<std::uint64_t>(texture.depth(level), 1);
+    case GL_TEXTURE_2D_ARRAY:
+    case GL_TEXTURE_CUBE_MAP:
+    case GL_TEXTURE_CUBE_MAP_ARRAY:
+        return texture.depth(0);
+    default:
+        return 0;
+    }
 }
 
 void RequireUnbound(Object const &texture) {
@@ -133,6 +177,75 @@ GLenum Framebuffer::AttachmentFor(Renderbuffer const &renderbuffer, unsigned int
         ORU_THROW_INTERNAL(ComposeText("Color buffer index is not supported with attachment:",
                                        ORUOGLTokenName(attachment)));
     return attachment + colorIndex;
+}
+
+void Framebuffer::attachImage(AttachmentPoint point, unsigned int image, unsigned int name,
+                              unsigned int level) {
+    ForEachPoint(point, [&](GLenum attachment) {
+        auto const glLevel = static_cast<GLint>(level);
+        if (image == GL_TEXTURE_1D)
+            ORU_GL(FramebufferTexture1DEXT, target(), attachment, image, name, glLevel);
+        else
+            ORU_GL(FramebufferTexture2DEXT, target(), attachment, image, name, glLevel);
+    });
+}
+
+void Framebuffer::attachTexture(Texture const &texture, unsigned int level, AttachmentPoint point) {
+    unsigned int const name = texture.checkedID();
+    requireBound(kAttachUnbound);
+    if (LayersOf(texture, level) == 0)
+        return attachImage(point, texture.target(), name, level);
+    ORU_ASSERT_SUPPORTED(GL_VERSION_3_2);
+    ForEachPoint(point, [&](GLenum attachment) {
+        ORU_GL(FramebufferTexture, target(), attachment, name, static_cast<GLint>(level));
+    });
+}
+
+void Framebuffer::attachLayer(Texture const &texture, unsigned int level, unsigned int layer,
+                              AttachmentPoint point) {
+    unsigned int const name = texture.checkedID();
+    requireBound(kAttachUnbound);
+    std::uint64_t const layers = LayersOf(texture, level);
+    if (layer >= layers)
+        ORU_THROW_INTERNAL(ComposeText("There is no layer ", layer, " in a texture of ", layers,
+                                       ": they count from 0, and textures without any are attached "
+                                       "by attachTexture"));
+    if (texture.target() == GL_TEXTURE_CUBE_MAP)
+        return attachImage(point, GL_TEXTURE_CUBE_MAP_POSITIVE_X + layer, name, level);
+    ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
+    ForEachPoint(point, [&](GLenum attachment) {
+        ORU_GL(FramebufferTextureLayer, target(), attachment, name, static_cast<GLint>(level),
+               static_cast<GLint>(layer));
+    });
+}
+
+void Framebuffer::attachRenderbuffer(Renderbuffer const &renderbuffer, AttachmentPoint point) {
+    unsigned int const name = renderbuffer.checkedID();
+    requireBound(kAttachUnbound);
+    ForEachPoint(point, [&](GLenum attachment) {
+        ORU_GL(FramebufferRenderbufferEXT, target(), attachment, GL_RENDERBUFFER_EXT, name);
+    });
+}
+
+void Framebuffer::detachFrom(AttachmentPoint point) {
+    requireBound(kDetachUnbound);
+    ForEachPoint(point, [&](GLenum attachment) {
+        ORU_GL(FramebufferRenderbufferEXT, target(), attachment, GL_RENDERBUFFER_EXT, 0);
+    });
+}
+
+void Framebuffer::setDrawBuffers(std::initializer_list<AttachmentPoint> points) {
+    requireBound("Framebuffer object must be bound before its draw and read buffers are set");
+    ORU_ASSERT_SUPPORTED(GL_VERSION_2_0);
+    std::vector<GLenum> buffers;
+    for (AttachmentPoint const point : points)
+        buffers.push_back(ColorBuffer(point));
+    ORU_GL(DrawBuffers, static_cast<GLsizei>(buffers.size()), buffers.data());
+}
+
+void Framebuffer::setReadBuffer(AttachmentPoint point) {
+    requireBound("Framebuffer object must be bound before its draw and read buffers are set");
+    ORU_GL(ReadBuffer, ColorBuffer(point));
 }
 
 void Framebuffer::detach(Texture2 *texture, unsigned int colorIndex) {

@@ -40,6 +40,9 @@ GLenum AttachmentOf(GLenum format) {
 } // namespace
 
 Renderbuffer::Renderbuffer(unsigned int format, int width, int height)
+    : Renderbuffer(format, width, height, 0) {}
+
+Renderbuffer::Renderbuffer(unsigned int format, int width, int height, int samples)
     : Object(GL_RENDERBUFFER_EXT, GL_RENDERBUFFER_BINDING_EXT), format_(format),
       attachment_(AttachmentOf(format)), width_(width), height_(height) {
     ORU_ASSERT_SUPPORTED(GL_EXT_FRAMEBUFFER_OBJECT);
@@ -50,18 +53,28 @@ Renderbuffer::Renderbuffer(unsigned int format, int width, int height)
     if (height > maximum) // the check's text is what hosts see, with its "width"
         ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of width ", height,
                                        ", a max height of ", maximum, " is supported"));
+    if (samples != 0) {
+        ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
+        int const most = MaxSamples();
+        if (samples < 0 || samples > most)
+            ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of ", samples,
+                                           " samples, at most ", most, " are supported"));
+    }
     try {
         ORU_GL(GenRenderbuffersEXT, 1, &objectID_);
-        makeStorage();
+        makeStorage(samples);
     } catch (...) {
         deleteObject();
         throw;
     }
 }
 
-void Renderbuffer::makeStorage() {
+void Renderbuffer::makeStorage(int samples) {
     internal::BoundObjectScope bound(*this, ORU_BINDER(BindRenderbufferEXT));
-    ORU_GL(RenderbufferStorageEXT, target(), format_, width_, height_);
+    if (samples == 0)
+        ORU_GL(RenderbufferStorageEXT, target(), format_, width_, height_);
+    else
+        ORU_GL(RenderbufferStorageMultisample, target(), samples, format_, width_, height_);
     ORU_ASSERT(objectID_ != 0);
     unbind();
     bound.restore();
@@ -119,6 +132,12 @@ int Renderbuffer::MaxSize() {
     GLint maximum = 0;
     ORU_GL(GetIntegerv, GL_MAX_RENDERBUFFER_SIZE_EXT, &maximum);
     return maximum;
+}
+
+int Renderbuffer::MaxSamples() {
+    GLint most = 0;
+    ORU_GL(GetIntegerv, GL_MAX_SAMPLES, &most);
+    return most;
 }
 
 bool Renderbuffer::IsSupported() {

@@ -18,6 +18,12 @@ public:
     /// @note glGenRenderbuffersEXT, glRenderbufferStorageEXT
     Renderbuffer(unsigned int format, int width, int height);
 
+    /// Makes a renderbuffer with several samples a pixel, for `Framebuffer::Resolve`.
+    /// @param samples of a pixel, at most `MaxSamples()`; OpenGL may take more
+    /// @throws InternalException also without OpenGL 3.0 or GL_ARB_framebuffer_object
+    /// @note glGenRenderbuffersEXT, glRenderbufferStorageMultisample
+    Renderbuffer(unsigned int format, int width, int height, int samples);
+
     /// A renderbuffer that was made elsewhere; size and format are what OpenGL tells. After a
     /// failure the name is the caller's as before.
     /// @throws InternalException without the extension, and for a name that is no renderbuffer
@@ -58,6 +64,9 @@ public:
     /// The largest width and height in pixels. @note glGetIntegerv
     static int MaxSize();
 
+    /// The most samples of a pixel. @note glGetIntegerv
+    static int MaxSamples();
+
     /// Whether the current context has GL_EXT_framebuffer_object; false without a context.
     static bool IsSupported();
 
@@ -71,7 +80,7 @@ protected:
     }
 
 private:
-    void makeStorage();
+    void makeStorage(int samples);
     void deleteObject() noexcept;
 
     unsigned int format_;

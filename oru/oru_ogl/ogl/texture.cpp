@@ -10,9 +10,11 @@
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
+#include "oru/oru_ogl/ogl/internal/textures/laterformats.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturetables.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <algorithm>
 #include <ostream>
 #include <utility>
 
@@ -27,6 +29,11 @@ std::uint64_t AtLevel(std::uint64_t size, unsigned int level) {
     return level < 64 ? size >> level : 0;
 }
 
+/// A side of a level that is there.
+std::uint64_t AtLeastOne(std::uint64_t size) {
+    return std::max<std::uint64_t>(size, 1);
+}
+
 /// The format of a texture that was made elsewhere.
 Texture::InternalFormat FormatOf(GLenum gl) {
     // What RED and RG make, by the name that OpenGL gives it.
@@ -34,7 +41,9 @@ Texture::InternalFormat FormatOf(GLenum gl) {
         return Texture::INTERNALFORMAT_RED;
     if (gl == GL_RG8)
         return Texture::INTERNALFORMAT_RG;
-    auto const *const row = internal::kInternalFormats.findGL(gl);
+    if (auto const *const row = internal::kInternalFormats.findGL(gl))
+        return row->value;
+    auto const *const row = internal::kLaterFormats.findGL(gl);
     if (!row)
         ORU_THROW_INTERNAL(ComposeText("A texture of the format ", ORUOGLTokenName(gl),
                                        " cannot be taken over: no InternalFormat stands for it"));
@@ -65,12 +74,17 @@ Texture::Texture(Target target, TargetBinding binding, unsigned int name, owners
     internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
     auto const ofLevel0 = [&](GLenum parameter) {
         GLint value = 0;
-        ORU_GL(GetTexLevelParameteriv, this->target(), 0, parameter, &value);
+        ORU_GL(GetTexLevelParameteriv,
+               target == TARGET_TEXTURE_CUBE_MAP ? GL_TEXTURE_CUBE_MAP_POSITIVE_X : this->target(),
+               0, parameter, &value);
         return static_cast<unsigned int>(value);
     };
     width_ = ofLevel0(GL_TEXTURE_WIDTH);
     height_ = ofLevel0(GL_TEXTURE_HEIGHT);
-    if (target == TARGET_TEXTURE_3D || target == TARGET_TEXTURE_2D_ARRAY)
+    if (target == TARGET_TEXTURE_CUBE_MAP)
+        depth_ = 6;
+    else if (target == TARGET_TEXTURE_3D || target == TARGET_TEXTURE_2D_ARRAY ||
+             target == TARGET_TEXTURE_CUBE_MAP_ARRAY)
         depth_ = ofLevel0(GL_TEXTURE_DEPTH);
     if (width_ == 0)
         ORU_THROW_INTERNAL(ComposeText("The texture ", name, " has no level 0 yet"));
@@ -124,6 +138,8 @@ int Texture::sizeInBytes() const {
 }
 
 unsigned int Texture::getGLFormat(InternalFormat format) const {
+    if (auto const *const row = internal::kLaterFormats.find(format))
+        return row->clientFormat;
     if (format < INTERNALFORMAT_RED || format >= INTERNALFORMAT_RGB)
         return GL_BGRA;
     return format < INTERNALFORMAT_RG ? GL_RED : GL_RG;
@@ -158,7 +174,82 @@ void Texture::generateMipmap() {
                            "GL_EXT_framebuffer_object: upload each level");
 }
 
+void Texture::setSwizzle(Swizzle red, Swizzle green, Swizzle blue, Swizzle alpha) {
+    ORU_ASSERT_SUPPORTED(GL_ARB_TEXTURE_SWIZZLE);
+    GLint channels[4] = {};
+    Swizzle const sources[] = {red, green, blue, alpha};
+    for (int i = 0; i < 4; ++i)
+        channels[i] = static_cast<GLint>(Swizzle2GL(sources[i]));
+    ORU_GL(TexParameteriv, target(), GL_TEXTURE_SWIZZLE_RGBA, channels);
+}
+
+void Texture::setMaxAnisotropy(float ratio) {
+    internal::RequireAnisotropy(ratio);
+    ORU_GL(TexParameterf, target(), GL_TEXTURE_MAX_ANISOTROPY_EXT, ratio);
+}
+
+void Texture::setCompare(Compare compare) {
+    ORU_ASSERT_SUPPORTED(GL_VERSION_1_4);
+    auto const function = static_cast<GLint>(Compare2GL(compare));
+    ORU_GL(TexParameteri, target(), GL_TEXTURE_COMPARE_MODE,
+           compare == COMPARE_NONE ? GL_NONE : GL_COMPARE_REF_TO_TEXTURE);
+    if (compare != COMPARE_NONE)
+        ORU_GL(TexParameteri, target(), GL_TEXTURE_COMPARE_FUNC, function);
+}
+
+void Texture::setLevelRange(unsigned int first, unsigned int last) {
+    constexpr unsigned int kMostLevels = 1000; // what OpenGL itself begins with as the last
+    if (last < first || last > kMostLevels)
+        ORU_THROW_INTERNAL(ComposeText("Levels ", first, " to ", last,
+                                       " are no range: the last is not before the first, and at "
+                                       "most ",
+                                       kMostLevels));
+    ORU_GL(TexParameteri, target(), GL_TEXTURE_BASE_LEVEL, static_cast<GLint>(first));
+    ORU_GL(TexParameteri, target(), GL_TEXTURE_MAX_LEVEL, static_cast<GLint>(last));
+}
+
+float Texture::MaxAnisotropy() {
+    float most = 1;
+    if (internal::Supports(GL_EXT_TEXTURE_FILTER_ANISOTROPIC))
+        ORU_GL(GetFloatv, GL_MAX_TEXTURE_MAX_ANISOTROPY_EXT, &most);
+    return most;
+}
+
+bool Texture::IsFormatSupported(InternalFormat format) {
+    return internal::RecordOfCurrent() && internal::IsFormatSupported(format);
+}
+
+bool Texture::IsCompressed(InternalFormat format) {
+    auto const *const row = internal::kLaterFormats.find(format);
+    return row && row->block > 1;
+}
+
+std::size_t Texture::compressedSize(unsigned int level) const {
+    return SizeInBytes(format(), AtLeastOne(width(level)), AtLeastOne(height(level)),
+                       AtLeastOne(depth(level)));
+}
+
+void Texture::checkCompressed(std::uint64_t width, std::uint64_t height, std::uint64_t depth,
+                              std::size_t bytes) const {
+    if (!IsCompressed(format()))
+        ORU_THROW_INTERNAL(ComposeText("A texture of ", format(),
+                                       " is not compressed: use subImage and getPixelData"));
+    std::size_t const needed = SizeInBytes(format(), width, height, depth);
+    if (bytes != needed)
+        ORU_THROW_INTERNAL(ComposeText("Blocks of ", format(), " for ", width, " x ", height, " x ",
+                                       depth, " texels take ", needed, " bytes, not ", bytes));
+}
+
+void Texture::checkCompressedLevel(int level, std::uint64_t depth, std::size_t bytes) const {
+    if (level < 0)
+        ORU_THROW_INTERNAL("a negative texture image mip-map level supplied");
+    auto const at = static_cast<unsigned int>(level);
+    checkCompressed(AtLeastOne(width(at)), AtLeastOne(height(at)), AtLeastOne(depth), bytes);
+}
+
 std::size_t Texture::Channels(InternalFormat format) {
+    if (auto const *const row = internal::kLaterFormats.find(format))
+        return row->channels;
     auto const *const row = internal::kInternalFormats.find(format);
     if (!row || row->channels == 0)
         ORU_THROW_INTERNAL("InternalFormat enums are not all properly sized.");
@@ -166,7 +257,8 @@ std::size_t Texture::Channels(InternalFormat format) {
 }
 
 std::size_t Texture::Channels(Format format) {
-    auto const *const row = internal::kFormats.find(format);
+    auto const *const later = internal::kLaterPixelFormats.find(format);
+    auto const *const row = later ? later : internal::kFormats.find(format);
     if (!row)
         ORU_THROW_INTERNAL("InternalFormat enums are not all properly sized.");
     return row->channels;
@@ -174,6 +266,12 @@ std::size_t Texture::Channels(Format format) {
 
 std::size_t Texture::SizeInBytes(InternalFormat format, std::uint64_t width, std::uint64_t height,
                                  std::uint64_t depth) {
+    if (auto const *const row = internal::kLaterFormats.find(format)) {
+        auto const blocks = [row](std::uint64_t size) {
+            return size / row->block + (size % row->block != 0);
+        };
+        return row->blockBytes * blocks(width) * blocks(height) * depth;
+    }
     std::size_t const channels = Channels(format);
     auto const &row = *internal::kInternalFormats.find(format);
     if (row.bytes == 0)
@@ -184,6 +282,11 @@ std::size_t Texture::SizeInBytes(InternalFormat format, std::uint64_t width, std
 
 std::size_t Texture::BytesPerPixel(Format format, Type type) {
     std::size_t const channels = Channels(format);
+    if (auto const *const packed = internal::kLaterTypes.find(type))
+        return packed->bytes;
+    if (internal::kLaterPixelFormats.find(format) &&
+        (type == TYPE_INT || type == TYPE_UNSIGNED_INT))
+        return channels * sizeof(GLint);
     auto const *const row = internal::kTypes.find(type);
     if (!row || row->bytes == 0)
         ORU_THROW_INTERNAL(ComposeText("pixelDataSize: Unknown type ",
@@ -231,16 +334,21 @@ void Texture::PopPixelTransferModes() {
     internal::PopPixelStorage();
 }
 
-ORU_TRANSLATED(Texture, Target, internal::kTargets)
-ORU_TRANSLATED(Texture, TargetBinding, internal::kTargetBindings)
-ORU_TRANSLATED(Texture, InternalFormat, internal::kInternalFormats)
-ORU_TRANSLATED(Texture, Format, internal::kFormats)
-ORU_TRANSLATED(Texture, Type, internal::kTypes)
+ORU_TRANSLATED_IN_TWO(Texture, Target, internal::kTargets, internal::kLaterTargets)
+ORU_TRANSLATED_IN_TWO(Texture, TargetBinding, internal::kTargetBindings,
+                      internal::kLaterTargetBindings)
+ORU_TRANSLATED_IN_TWO(Texture, InternalFormat, internal::kInternalFormats, internal::kLaterFormats)
+ORU_TRANSLATED_IN_TWO(Texture, Format, internal::kFormats, internal::kLaterPixelFormats)
+ORU_TRANSLATED_IN_TWO(Texture, Type, internal::kTypes, internal::kLaterTypes)
 ORU_TRANSLATED(Texture, Filter, internal::kFilters)
 ORU_TRANSLATED(Texture, WrapMode, internal::kWrapModes)
 ORU_TRANSLATED(Texture, PixelStoreMode, internal::kPixelStoreModes)
+ORU_TRANSLATED(Texture, Swizzle, internal::kSwizzles)
+ORU_TRANSLATED(Texture, Compare, internal::kCompares)
 
 std::ostream &operator<<(std::ostream &os, Texture::InternalFormat format) {
+    if (auto const *const later = internal::kLaterFormats.find(format))
+        return os << later->name;
     auto const *const row = internal::kInternalFormats.find(format);
     return os << (row ? row->name : "UNKNOWN FORMAT");
 }

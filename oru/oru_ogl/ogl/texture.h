@@ -10,8 +10,8 @@
 
 namespace ORU::OGL {
 
-/// A texture object with its storage; made as one of the kinds in texture1.h, texture2.h and
-/// texture3.h.
+/// A texture object with its storage; made as one of the kinds in texture1.h, texture2.h,
+/// texture3.h, texturecube.h, buffertexture.h and texture2dmultisample.h.
 ///
 /// A constructor allocates the storage (sampled with FILTER_NEAREST, clamped to its edges) and
 /// leaves what was bound to the target bound. Let no pixel unpack buffer be bound meanwhile:
@@ -25,22 +25,32 @@ class ORU_API Texture : public Object {
 public:
     /// What a texture is bound to.
     enum Target : unsigned int {
-        TARGET_TEXTURE_1D = 0,   ///< GL_TEXTURE_1D
-        TARGET_TEXTURE_2D,       ///< GL_TEXTURE_2D
-        TARGET_TEXTURE_3D,       ///< GL_TEXTURE_3D
-        TARGET_TEXTURE_1D_ARRAY, ///< GL_TEXTURE_1D_ARRAY
-        TARGET_TEXTURE_2D_ARRAY, ///< GL_TEXTURE_2D_ARRAY
-        TARGET_TEXTURE_RECTANGLE ///< GL_TEXTURE_RECTANGLE
+        TARGET_TEXTURE_1D = 0,    ///< GL_TEXTURE_1D
+        TARGET_TEXTURE_2D,        ///< GL_TEXTURE_2D
+        TARGET_TEXTURE_3D,        ///< GL_TEXTURE_3D
+        TARGET_TEXTURE_1D_ARRAY,  ///< GL_TEXTURE_1D_ARRAY
+        TARGET_TEXTURE_2D_ARRAY,  ///< GL_TEXTURE_2D_ARRAY
+        TARGET_TEXTURE_RECTANGLE, ///< GL_TEXTURE_RECTANGLE
+
+        TARGET_TEXTURE_CUBE_MAP = 256, ///< GL_TEXTURE_CUBE_MAP
+        TARGET_TEXTURE_CUBE_MAP_ARRAY, ///< GL_TEXTURE_CUBE_MAP_ARRAY
+        TARGET_TEXTURE_BUFFER,         ///< GL_TEXTURE_BUFFER
+        TARGET_TEXTURE_2D_MULTISAMPLE  ///< GL_TEXTURE_2D_MULTISAMPLE
     };
 
     /// The query for what is bound to the target of the same value.
     enum TargetBinding : unsigned int {
-        TARGETBINDING_TEXTURE_BINDING_1D = 0,   ///< GL_TEXTURE_BINDING_1D
-        TARGETBINDING_TEXTURE_BINDING_2D,       ///< GL_TEXTURE_BINDING_2D
-        TARGETBINDING_TEXTURE_BINDING_3D,       ///< GL_TEXTURE_BINDING_3D
-        TARGETBINDING_TEXTURE_BINDING_1D_ARRAY, ///< GL_TEXTURE_BINDING_1D_ARRAY
-        TARGETBINDING_TEXTURE_BINDING_2D_ARRAY, ///< GL_TEXTURE_BINDING_2D_ARRAY
-        TARGETBINDING_TEXTURE_BINDING_RECTANGLE ///< GL_TEXTURE_BINDING_RECTANGLE
+        TARGETBINDING_TEXTURE_BINDING_1D = 0,    ///< GL_TEXTURE_BINDING_1D
+        TARGETBINDING_TEXTURE_BINDING_2D,        ///< GL_TEXTURE_BINDING_2D
+        TARGETBINDING_TEXTURE_BINDING_3D,        ///< GL_TEXTURE_BINDING_3D
+        TARGETBINDING_TEXTURE_BINDING_1D_ARRAY,  ///< GL_TEXTURE_BINDING_1D_ARRAY
+        TARGETBINDING_TEXTURE_BINDING_2D_ARRAY,  ///< GL_TEXTURE_BINDING_2D_ARRAY
+        TARGETBINDING_TEXTURE_BINDING_RECTANGLE, ///< GL_TEXTURE_BINDING_RECTANGLE
+
+        TARGETBINDING_TEXTURE_BINDING_CUBE_MAP = 256, ///< GL_TEXTURE_BINDING_CUBE_MAP
+        TARGETBINDING_TEXTURE_BINDING_CUBE_MAP_ARRAY, ///< GL_TEXTURE_BINDING_CUBE_MAP_ARRAY
+        TARGETBINDING_TEXTURE_BINDING_BUFFER,         ///< GL_TEXTURE_BINDING_BUFFER
+        TARGETBINDING_TEXTURE_BINDING_2D_MULTISAMPLE  ///< GL_TEXTURE_BINDING_2D_MULTISAMPLE
     };
 
     /// How the implementation keeps the texels.
@@ -102,7 +112,62 @@ public:
         INTERNALFORMAT_ALPHA16F_ARB,           ///< GL_ALPHA16F_ARB
         INTERNALFORMAT_INTENSITY16F_ARB,       ///< GL_INTENSITY16F_ARB
         INTERNALFORMAT_LUMINANCE16F_ARB,       ///< GL_LUMINANCE16F_ARB
-        INTERNALFORMAT_LUMINANCE_ALPHA16F_ARB  ///< GL_LUMINANCE_ALPHA16F_ARB
+        INTERNALFORMAT_LUMINANCE_ALPHA16F_ARB, ///< GL_LUMINANCE_ALPHA16F_ARB
+
+        // What came after them, numbered apart: red and green of 8 bits by their sized names, sRGB,
+        // depth and stencil, integers, and compressed blocks.
+        INTERNALFORMAT_R8 = 256,                            ///< GL_R8
+        INTERNALFORMAT_RG8,                                 ///< GL_RG8
+        INTERNALFORMAT_R11F_G11F_B10F,                      ///< GL_R11F_G11F_B10F
+        INTERNALFORMAT_SRGB8,                               ///< GL_SRGB8
+        INTERNALFORMAT_SRGB8_ALPHA8,                        ///< GL_SRGB8_ALPHA8
+        INTERNALFORMAT_DEPTH_COMPONENT16,                   ///< GL_DEPTH_COMPONENT16
+        INTERNALFORMAT_DEPTH_COMPONENT24,                   ///< GL_DEPTH_COMPONENT24
+        INTERNALFORMAT_DEPTH_COMPONENT32,                   ///< GL_DEPTH_COMPONENT32
+        INTERNALFORMAT_DEPTH_COMPONENT32F,                  ///< GL_DEPTH_COMPONENT32F
+        INTERNALFORMAT_DEPTH24_STENCIL8,                    ///< GL_DEPTH24_STENCIL8
+        INTERNALFORMAT_DEPTH32F_STENCIL8,                   ///< GL_DEPTH32F_STENCIL8
+        INTERNALFORMAT_R8I,                                 ///< GL_R8I
+        INTERNALFORMAT_R8UI,                                ///< GL_R8UI
+        INTERNALFORMAT_R16I,                                ///< GL_R16I
+        INTERNALFORMAT_R16UI,                               ///< GL_R16UI
+        INTERNALFORMAT_R32I,                                ///< GL_R32I
+        INTERNALFORMAT_R32UI,                               ///< GL_R32UI
+        INTERNALFORMAT_RG8I,                                ///< GL_RG8I
+        INTERNALFORMAT_RG8UI,                               ///< GL_RG8UI
+        INTERNALFORMAT_RG16I,                               ///< GL_RG16I
+        INTERNALFORMAT_RG16UI,                              ///< GL_RG16UI
+        INTERNALFORMAT_RG32I,                               ///< GL_RG32I
+        INTERNALFORMAT_RG32UI,                              ///< GL_RG32UI
+        INTERNALFORMAT_RGB8I,                               ///< GL_RGB8I
+        INTERNALFORMAT_RGB8UI,                              ///< GL_RGB8UI
+        INTERNALFORMAT_RGB16I,                              ///< GL_RGB16I
+        INTERNALFORMAT_RGB16UI,                             ///< GL_RGB16UI
+        INTERNALFORMAT_RGB32I,                              ///< GL_RGB32I
+        INTERNALFORMAT_RGB32UI,                             ///< GL_RGB32UI
+        INTERNALFORMAT_RGBA8I,                              ///< GL_RGBA8I
+        INTERNALFORMAT_RGBA8UI,                             ///< GL_RGBA8UI
+        INTERNALFORMAT_RGBA16I,                             ///< GL_RGBA16I
+        INTERNALFORMAT_RGBA16UI,                            ///< GL_RGBA16UI
+        INTERNALFORMAT_RGBA32I,                             ///< GL_RGBA32I
+        INTERNALFORMAT_RGBA32UI,                            ///< GL_RGBA32UI
+        INTERNALFORMAT_RGB10_A2UI,                          ///< GL_RGB10_A2UI
+        INTERNALFORMAT_COMPRESSED_RGB_S3TC_DXT1_EXT,        ///< GL_COMPRESSED_RGB_S3TC_DXT1_EXT
+        INTERNALFORMAT_COMPRESSED_RGBA_S3TC_DXT1_EXT,       ///< GL_COMPRESSED_RGBA_S3TC_DXT1_EXT
+        INTERNALFORMAT_COMPRESSED_RGBA_S3TC_DXT3_EXT,       ///< GL_COMPRESSED_RGBA_S3TC_DXT3_EXT
+        INTERNALFORMAT_COMPRESSED_RGBA_S3TC_DXT5_EXT,       ///< GL_COMPRESSED_RGBA_S3TC_DXT5_EXT
+        INTERNALFORMAT_COMPRESSED_SRGB_S3TC_DXT1_EXT,       ///< GL_COMPRESSED_SRGB_S3TC_DXT1_EXT
+        INTERNALFORMAT_COMPRESSED_SRGB_ALPHA_S3TC_DXT1_EXT, ///< GL_COMPRESSED_SRGB_ALPHA_S3TC_DXT1_EXT
+        INTERNALFORMAT_COMPRESSED_SRGB_ALPHA_S3TC_DXT3_EXT, ///< GL_COMPRESSED_SRGB_ALPHA_S3TC_DXT3_EXT
+        INTERNALFORMAT_COMPRESSED_SRGB_ALPHA_S3TC_DXT5_EXT, ///< GL_COMPRESSED_SRGB_ALPHA_S3TC_DXT5_EXT
+        INTERNALFORMAT_COMPRESSED_RED_RGTC1,                ///< GL_COMPRESSED_RED_RGTC1
+        INTERNALFORMAT_COMPRESSED_SIGNED_RED_RGTC1,         ///< GL_COMPRESSED_SIGNED_RED_RGTC1
+        INTERNALFORMAT_COMPRESSED_RG_RGTC2,                 ///< GL_COMPRESSED_RG_RGTC2
+        INTERNALFORMAT_COMPRESSED_SIGNED_RG_RGTC2,          ///< GL_COMPRESSED_SIGNED_RG_RGTC2
+        INTERNALFORMAT_COMPRESSED_RGBA_BPTC_UNORM,          ///< GL_COMPRESSED_RGBA_BPTC_UNORM
+        INTERNALFORMAT_COMPRESSED_SRGB_ALPHA_BPTC_UNORM,    ///< GL_COMPRESSED_SRGB_ALPHA_BPTC_UNORM
+        INTERNALFORMAT_COMPRESSED_RGB_BPTC_SIGNED_FLOAT,    ///< GL_COMPRESSED_RGB_BPTC_SIGNED_FLOAT
+        INTERNALFORMAT_COMPRESSED_RGB_BPTC_UNSIGNED_FLOAT ///< GL_COMPRESSED_RGB_BPTC_UNSIGNED_FLOAT
     };
 
     /// The components of a pixel in the caller's memory.
@@ -118,7 +183,18 @@ public:
         FORMAT_RGBA,            ///< GL_RGBA
         FORMAT_BGRA,            ///< GL_BGRA
         FORMAT_LUMINANCE,       ///< GL_LUMINANCE
-        FORMAT_LUMINANCE_ALPHA  ///< GL_LUMINANCE_ALPHA
+        FORMAT_LUMINANCE_ALPHA, ///< GL_LUMINANCE_ALPHA
+
+        // For textures of integers, and of depth and stencil.
+        FORMAT_RED_INTEGER = 256, ///< GL_RED_INTEGER
+        FORMAT_RG_INTEGER,        ///< GL_RG_INTEGER
+        FORMAT_RGB_INTEGER,       ///< GL_RGB_INTEGER
+        FORMAT_BGR_INTEGER,       ///< GL_BGR_INTEGER
+        FORMAT_RGBA_INTEGER,      ///< GL_RGBA_INTEGER
+        FORMAT_BGRA_INTEGER,      ///< GL_BGRA_INTEGER
+        FORMAT_DEPTH_COMPONENT,   ///< GL_DEPTH_COMPONENT
+        FORMAT_STENCIL_INDEX,     ///< GL_STENCIL_INDEX
+        FORMAT_DEPTH_STENCIL      ///< GL_DEPTH_STENCIL
     };
 
     /// The component type of a pixel in the caller's memory.
@@ -144,7 +220,13 @@ public:
         TYPE_UNSIGNED_INT_10_10_10_2,     ///< GL_UNSIGNED_INT_10_10_10_2
         TYPE_UNSIGNED_INT_2_10_10_10_REV, ///< GL_UNSIGNED_INT_2_10_10_10_REV
         TYPE_HALF_FLOAT,                  ///< GL_HALF_FLOAT
-        TYPE_NONE = 0xFFFFFFFFu           ///< where a constructor accepts it: no type is given
+
+        // Packed pixels of depth with stencil, and of small floats.
+        TYPE_UNSIGNED_INT_24_8 = 256,        ///< GL_UNSIGNED_INT_24_8
+        TYPE_FLOAT_32_UNSIGNED_INT_24_8_REV, ///< GL_FLOAT_32_UNSIGNED_INT_24_8_REV
+        TYPE_UNSIGNED_INT_10F_11F_11F_REV,   ///< GL_UNSIGNED_INT_10F_11F_11F_REV
+
+        TYPE_NONE = 0xFFFFFFFFu ///< where a constructor accepts it: no type is given
     };
 
     /// How texels are combined for a fragment.
@@ -164,6 +246,30 @@ public:
         WRAPMODE_CLAMP_TO_EDGE,   ///< GL_CLAMP_TO_EDGE
         WRAPMODE_MIRRORED_REPEAT, ///< GL_MIRRORED_REPEAT
         WRAPMODE_REPEAT           ///< GL_REPEAT
+    };
+
+    /// Where a channel that shaders read comes from.
+    enum Swizzle : unsigned int {
+        SWIZZLE_RED = 0, ///< GL_RED
+        SWIZZLE_GREEN,   ///< GL_GREEN
+        SWIZZLE_BLUE,    ///< GL_BLUE
+        SWIZZLE_ALPHA,   ///< GL_ALPHA
+        SWIZZLE_ZERO,    ///< GL_ZERO
+        SWIZZLE_ONE      ///< GL_ONE
+    };
+
+    /// How a shader's reference value is compared with the depth that a texture holds, as the
+    /// sampler of a shadow map does: `reference <= depth` for COMPARE_LEQUAL.
+    enum Compare : unsigned int {
+        COMPARE_NONE = 0, ///< GL_NONE: shaders read the depth itself
+        COMPARE_NEVER,    ///< GL_NEVER
+        COMPARE_LESS,     ///< GL_LESS
+        COMPARE_EQUAL,    ///< GL_EQUAL
+        COMPARE_LEQUAL,   ///< GL_LEQUAL
+        COMPARE_GREATER,  ///< GL_GREATER
+        COMPARE_NOTEQUAL, ///< GL_NOTEQUAL
+        COMPARE_GEQUAL,   ///< GL_GEQUAL
+        COMPARE_ALWAYS    ///< GL_ALWAYS
     };
 
     /// The parameters of glPixelStore.
@@ -213,7 +319,8 @@ public:
     /// Bytes of level 0, found out once. Failures as `SizeInBytes`.
     int sizeInBytes() const;
 
-    /// The GL client format that fits a format best: GL_RED, GL_RG or GL_BGRA.
+    /// The GL client format that fits a format best: GL_RED, GL_RG or GL_BGRA, and of the formats
+    /// from INTERNALFORMAT_R8 on the one of the same channels.
     unsigned int getGLFormat(InternalFormat format) const;
 
     /// @name Parameters of the texture bound to the target
@@ -238,7 +345,49 @@ public:
     /// @note glGenerateMipmap (OpenGL 3.0, GL_ARB_framebuffer_object) or glGenerateMipmapEXT
     ///       (GL_EXT_framebuffer_object)
     void generateMipmap();
+
+    /// What shaders read as red, green, blue and alpha.
+    /// @throws InternalException without OpenGL 3.3 or GL_ARB_texture_swizzle
+    /// @note glTexParameteriv
+    void setSwizzle(Swizzle red, Swizzle green, Swizzle blue, Swizzle alpha);
+
+    /// How many texels across may be taken for a pixel where the texture is seen at a slant.
+    /// @param ratio from 1, which is none, to `MaxAnisotropy()`
+    /// @throws InternalException without GL_EXT_texture_filter_anisotropic, or for another ratio
+    /// @note glTexParameterf
+    void setMaxAnisotropy(float ratio);
+
+    /// Whether and how shaders get a comparison with the depth in the texture.
+    /// @throws InternalException before OpenGL 1.4, or for a number that is no Compare
+    /// @note glTexParameteri
+    void setCompare(Compare compare);
+
+    /// The levels that are sampled and that `generateMipmap` makes.
+    /// @param first, last levels counted from 0
+    /// @throws InternalException for a last one before the first, or beyond what OpenGL counts
+    /// @note glTexParameteri; needs OpenGL 1.2
+    void setLevelRange(unsigned int first, unsigned int last);
     /// @}
+
+    /// @name Compressed formats
+    /// Their texels come in blocks of 4 x 4. Uploads of compressed blocks are the kinds' part.
+    /// @{
+
+    /// Whether a format is one of compressed blocks.
+    static bool IsCompressed(InternalFormat format);
+
+    /// Bytes of a level of this texture, all layers and faces together.
+    std::size_t compressedSize(unsigned int level) const;
+    /// @}
+
+    /// The most that `setMaxAnisotropy` takes; 1 where there is no such filtering.
+    /// @note glGetFloatv
+    static float MaxAnisotropy();
+
+    /// Whether the current context has textures of a format, by its version and extensions; false
+    /// without a context. Of the formats up to INTERNALFORMAT_LUMINANCE_ALPHA16F_ARB it tells only
+    /// whether the profile has them.
+    static bool IsFormatSupported(InternalFormat format);
 
     /// Channels of a format. @throws InternalException for INTERNALFORMAT_RGB4, and for a number
     /// that is no format
@@ -247,7 +396,8 @@ public:
     static std::size_t Channels(Format format);
 
     /// Bytes of an image without gaps: channels x bytes of a channel x width x height x depth.
-    /// @throws InternalException for formats whose channels are not all of 1, 2 or 4 bytes
+    /// Of a compressed format, and of those numbered from INTERNALFORMAT_R8 on, whole blocks.
+    /// @throws InternalException for other formats whose channels are not all of 1, 2 or 4 bytes
     static std::size_t SizeInBytes(InternalFormat format, std::uint64_t width, std::uint64_t height,
                                    std::uint64_t depth);
 
@@ -277,14 +427,18 @@ public:
     static WrapMode GL2WrapMode(unsigned int mode);
     static unsigned int PixelStoreMode2GL(PixelStoreMode mode);
     static PixelStoreMode GL2PixelStoreMode(unsigned int mode);
+    static unsigned int Swizzle2GL(Swizzle swizzle);
+    static Swizzle GL2Swizzle(unsigned int swizzle);
+    static unsigned int Compare2GL(Compare compare);
+    static Compare GL2Compare(unsigned int compare);
     /// @}
 
 protected:
     /// Makes the texture's name; the storage is the derived classes' part.
     /// @param width, height, depth texels of level 0, 1 for what the target has not
-    /// @throws InternalException when there is no name to be had, and in a core context for a
-    /// format
-    ///         of alpha, luminance or intensity
+    /// @throws InternalException when there is no name to be had, in a core context for a format of
+    ///         alpha, luminance or intensity, and for a format from INTERNALFORMAT_R8 on that the
+    ///         context has not
     /// @note glGenTextures
     Texture(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
             std::uint64_t height, std::uint64_t depth);
@@ -303,11 +457,22 @@ protected:
             generateMipmap();
     }
 
+    /// @name Checks of uploads and downloads of compressed blocks
+    /// @throws InternalException unless the format is compressed and the blocks take so many bytes
+    /// @{
+    void checkCompressed(std::uint64_t width, std::uint64_t height, std::uint64_t depth,
+                         std::size_t bytes) const;
+    /// The same for all of a level, of which `depth` images are read. Also for a negative level.
+    void checkCompressedLevel(int level, std::uint64_t depth, std::size_t bytes) const;
+    /// @}
+
     /// Kept for hosts that call it; there is nothing to verify.
     void verifyCurrentTextureObject() const {}
 
     /// Bytes of a pixel in the caller's memory.
-    /// @throws InternalException for types other than bytes, shorts, half floats and floats
+    /// @throws InternalException for types other than bytes, shorts, half floats and floats; with a
+    ///         format from FORMAT_RED_INTEGER on, integers of 32 bits and the packed types of depth
+    ///         have a size, too
     static std::size_t BytesPerPixel(Format format, Type type);
 
     /// @name Client pixel-store state around a transfer

@@ -31,7 +31,7 @@ Texture1::Texture1(Target target, TargetBinding binding, InternalFormat format, 
     internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
     auto const allocate = [&](GLint level, std::array<GLsizei, 1> const &sides) {
         ORU_GL(TexImage1D, this->target(), level, static_cast<GLint>(InternalFormat2GL(format)),
-               sides[0], 0, getGLFormat(format), GL_UNSIGNED_BYTE, nullptr);
+               sides[0], 0, getGLFormat(format), internal::StorageType(format), nullptr);
     };
     internal::ForEachLevel(internal::ToSides(width), 1, mipmapped, allocate);
     setFilter(FILTER_NEAREST, FILTER_NEAREST);
@@ -56,6 +56,7 @@ void Texture1::checkPart(char const *operation, int level, std::uint64_t width) 
 void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Type type,
                         void const *data, PixelUnpackParameters const &params) {
     checkPart("subimage", level, width);
+    internal::RequireSameKind(this->format(), format);
     internal::Upload(Send, Part{target(), level, {x}, internal::ToSides(width)}, format, type, data,
                      params);
     imageChanged(level);
@@ -64,6 +65,7 @@ void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Ty
 void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Type type,
                         Buffer *buffer, std::size_t offset, PixelUnpackParameters const &params) {
     checkPart("subimage", level, width);
+    internal::RequireSameKind(this->format(), format);
     internal::Upload(Send, Part{target(), level, {x}, internal::ToSides(width)}, format, type,
                      buffer, offset, params);
     imageChanged(level);

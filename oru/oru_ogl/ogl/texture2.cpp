@@ -61,11 +61,15 @@ Texture2::~Texture2() = default;
 void Texture2::allocate(bool mipmapped, Type type) {
     auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format()));
     unsigned int const glFormat = getGLFormat(format());
-    unsigned int const glType = type == TYPE_NONE ? GL_UNSIGNED_BYTE : Type2GL(type);
+    unsigned int const glType = type == TYPE_NONE ? internal::StorageType(format()) : Type2GL(type);
     bool const layered = target() == GL_TEXTURE_1D_ARRAY;
     auto const allocateLevel = [&](GLint level, std::array<GLsizei, 2> const &sides) {
-        ORU_GL(TexImage2D, target(), level, glInternalFormat, sides[0], sides[1], 0, glFormat,
-               glType, clientStorage_);
+        if (IsCompressed(format()))
+            ORU_GL(CompressedTexImage2D, target(), level, InternalFormat2GL(format()), sides[0],
+                   sides[1], 0, internal::CompressedBytes(format(), sides[0], sides[1]), nullptr);
+        else
+            ORU_GL(TexImage2D, target(), level, glInternalFormat, sides[0], sides[1], 0, glFormat,
+                   glType, clientStorage_);
     };
     internal::ForEachLevel(internal::ToSides(width(0), height(0)), layered ? 1 : 2, mipmapped,
                            allocateLevel);
@@ -89,6 +93,7 @@ void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint6
                         Format format, Type type, void const *data,
                         PixelUnpackParameters const &params) {
     checkPart("subimage", level, width, height);
+    internal::RequireSameKind(this->format(), format);
     internal::Upload(Send, Part{target(), level, {x, y}, internal::ToSides(width, height)}, format,
                      type, data, params);
     imageChanged(level);
@@ -98,9 +103,27 @@ void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint6
                         Format format, Type type, Buffer *buffer, std::size_t offset,
                         PixelUnpackParameters const &params) {
     checkPart("subimage", level, width, height);
+    internal::RequireSameKind(this->format(), format);
     internal::Upload(Send, Part{target(), level, {x, y}, internal::ToSides(width, height)}, format,
                      type, buffer, offset, params);
     imageChanged(level);
+}
+
+void Texture2::compressedSubImage(int level, int x, int y, std::uint64_t width,
+                                  std::uint64_t height, void const *data, std::size_t bytes) {
+    checkPart("subimage", level, width, height);
+    checkCompressed(width, height, 1, bytes);
+    auto const sides = internal::ToSides(width, height, bytes);
+    ORU_GL(CompressedTexSubImage2D, target(), level, x, y, sides[0], sides[1],
+           InternalFormat2GL(format()), sides[2], data);
+    imageChanged(level);
+}
+
+void Texture2::getCompressedData(void *dst, std::size_t bytes, int level) const {
+    if (!isBound())
+        ORU_THROW_INTERNAL("Texture must be bound");
+    checkCompressedLevel(level, 1, bytes);
+    ORU_GL(GetCompressedTexImage, target(), level, dst);
 }
 
 void Texture2::copyTexSubImage(int level, int xOffset, int yOffset, int x, int y,
@@ -117,6 +140,7 @@ void Texture2::getPixelData(void *dst, int level, Format format, Type type,
         ORU_THROW_INTERNAL("Texture must be bound");
     if (format == FORMAT_COLOR_INDEX)
         ORU_THROW_INTERNAL("COLOR_INDEX not allowed here!");
+    internal::RequireSameKind(this->format(), format);
     internal::PixelLayout const layout = internal::LayoutOf(format, type);
     internal::WithPackAlignment(
         alignment, [&] { ORU_GL(GetTexImage, target(), level, layout.format, layout.type, dst); });
@@ -130,6 +154,7 @@ void Texture2::getPixelData(Buffer *buffer, std::size_t offset, int level, Forma
     if (format == FORMAT_COLOR_INDEX)
         ORU_THROW_INTERNAL("COLOR_INDEX not allowed here!");
     internal::CheckByteAlignment(alignment);
+    internal::RequireSameKind(this->format(), format);
     internal::PixelLayout const layout = internal::LayoutOf(format, type);
     internal::BecomePackBuffer(*buffer);
     internal::WithPackAlignment(alignment, [&] {

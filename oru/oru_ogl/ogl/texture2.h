@@ -46,6 +46,23 @@ public:
                   Type type, Buffer *buffer, std::size_t offset,
                   PixelUnpackParameters const &params);
 
+    /// Uploads compressed blocks.
+    /// @param level, x, y, width, height as `subImage`; x and y at multiples of a block's 4 texels
+    /// @param data `bytes` bytes, or an offset into the pixel unpack buffer while one is bound
+    /// @throws InternalException for a size or level out of range, for a format that is not
+    ///         compressed, and for another number of bytes than the blocks take (see `SizeInBytes`)
+    /// @note glCompressedTexSubImage2D; needs OpenGL 1.3
+    void compressedSubImage(int level, int x, int y, std::uint64_t width, std::uint64_t height,
+                            void const *data, std::size_t bytes);
+
+    /// Reads the compressed blocks of a level.
+    /// @param dst, bytes memory, of `compressedSize(level)` bytes
+    /// @throws InternalException when the texture is not bound, for a format that is not
+    /// compressed,
+    ///         and for another number of bytes
+    /// @note glGetCompressedTexImage; needs OpenGL 1.3
+    void getCompressedData(void *dst, std::size_t bytes, int level) const;
+
     /// Copies a rectangle of the current read framebuffer, beginning at (x, y).
     /// @throws InternalException for a size or level out of range, as `subImage`
     /// @note glCopyTexSubImage2D

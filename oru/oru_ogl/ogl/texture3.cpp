@@ -39,14 +39,20 @@ void Texture3::initialize(Allocate allocate) {
 Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, std::uint64_t width,
                    std::uint64_t height, std::uint64_t depth, bool mipmapped)
     : Texture(target, binding, format, width, height, depth) {
-    std::size_t const halved = target == TARGET_TEXTURE_2D_ARRAY ? 2 : 3;
+    std::size_t const halved = target == TARGET_TEXTURE_3D ? 3 : 2;
     initialize([&](std::array<GLsizei, 3> const &level0) {
         auto const glInternalFormat = static_cast<GLint>(InternalFormat2GL(format));
         unsigned int const glFormat = getGLFormat(format);
         internal::ForEachLevel(
             level0, halved, mipmapped, [&](GLint level, std::array<GLsizei, 3> const &sides) {
-                ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1],
-                       sides[2], 0, glFormat, GL_UNSIGNED_BYTE, nullptr);
+                if (IsCompressed(format))
+                    ORU_GL(CompressedTexImage3D, this->target(), level, InternalFormat2GL(format),
+                           sides[0], sides[1], sides[2], 0,
+                           internal::CompressedBytes(format, sides[0], sides[1], sides[2]),
+                           nullptr);
+                else
+                    ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1],
+                           sides[2], 0, glFormat, internal::StorageType(format), nullptr);
             });
     });
 }
@@ -91,6 +97,7 @@ void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std
                         std::uint64_t depth, Format format, Type type, void const *data,
                         PixelUnpackParameters const &params) {
     checkPart(level, width, height, depth);
+    internal::RequireSameKind(this->format(), format);
     internal::Upload(Send,
                      Part{target(), level, {x, y, z}, internal::ToSides(width, height, depth)},
                      format, type, data, params);
@@ -101,10 +108,29 @@ void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std
                         std::uint64_t depth, Format format, Type type, Buffer *buffer,
                         std::size_t offset, PixelUnpackParameters const &params) {
     checkPart(level, width, height, depth);
+    internal::RequireSameKind(this->format(), format);
     internal::Upload(Send,
                      Part{target(), level, {x, y, z}, internal::ToSides(width, height, depth)},
                      format, type, buffer, offset, params);
     imageChanged(level);
+}
+
+void Texture3::compressedSubImage(int level, int x, int y, int z, std::uint64_t width,
+                                  std::uint64_t height, std::uint64_t depth, void const *data,
+                                  std::size_t bytes) {
+    checkPart(level, width, height, depth);
+    checkCompressed(width, height, depth, bytes);
+    auto const sides = internal::ToSides(width, height, depth, bytes);
+    ORU_GL(CompressedTexSubImage3D, target(), level, x, y, z, sides[0], sides[1], sides[2],
+           InternalFormat2GL(format()), sides[3], data);
+    imageChanged(level);
+}
+
+void Texture3::getCompressedData(void *dst, std::size_t bytes, int level) const {
+    if (!isBound())
+        ORU_THROW_INTERNAL("Texture must be bound");
+    checkCompressedLevel(level, depth(static_cast<unsigned int>(level)), bytes);
+    ORU_GL(GetCompressedTexImage, target(), level, dst);
 }
 
 void Texture3::copyTexSubImage(int level, int xOffset, int yOffset, int zOffset, int x, int y,
@@ -121,6 +147,7 @@ void Texture3::getPixelData(void *dst, int level, Format format, Type type,
                             unsigned int alignment) const {
     if (format == FORMAT_COLOR_INDEX)
         ORU_THROW_INTERNAL("COLOR_INDEX not allowed here!");
+    internal::RequireSameKind(this->format(), format);
     internal::PixelLayout const layout = internal::LayoutOf(format, type);
     internal::WithPackAlignment(
         alignment, [&] { ORU_GL(GetTexImage, target(), level, layout.format, layout.type, dst); });
@@ -130,6 +157,7 @@ void Texture3::getPixelData(Buffer *buffer, int offset, int level, Format format
                             unsigned int alignment) const {
     internal::CheckBuffer(buffer);
     internal::CheckByteAlignment(alignment);
+    internal::RequireSameKind(this->format(), format);
     internal::PixelLayout const layout = internal::LayoutOf(format, type);
     internal::BecomePackBuffer(*buffer);
     internal::WithPackAlignment(alignment, [&] {
@@ -164,6 +192,23 @@ Texture2DArray::Texture2DArray(InternalFormat format, std::uint64_t width, std::
 
 Texture2DArray::Texture2DArray(unsigned int name, ownership_tag ownership)
     : Texture3(TARGET_TEXTURE_2D_ARRAY, TARGETBINDING_TEXTURE_BINDING_2D_ARRAY, name, ownership) {}
+
+TextureCubeArray::TextureCubeArray(InternalFormat format, std::uint64_t side, std::uint64_t cubes,
+                                   bool mipmapped)
+    : Texture3(TARGET_TEXTURE_CUBE_MAP_ARRAY, TARGETBINDING_TEXTURE_BINDING_CUBE_MAP_ARRAY, format,
+               side, side, 6 * cubes, mipmapped) {}
+
+TextureCubeArray::TextureCubeArray(unsigned int name, ownership_tag ownership)
+    : Texture3(TARGET_TEXTURE_CUBE_MAP_ARRAY, TARGETBINDING_TEXTURE_BINDING_CUBE_MAP_ARRAY, name,
+               ownership) {}
+
+std::uint64_t TextureCubeArray::depth(unsigned int /*level*/) const {
+    return Texture::depth(0);
+}
+
+bool TextureCubeArray::IsSupported() {
+    return internal::Supports(GL_ARB_TEXTURE_CUBE_MAP_ARRAY);
+}
 
 std::uint64_t Texture2DArray::depth(unsigned int /*level*/) const {
     return Texture::depth(0);

@@ -40,6 +40,25 @@ public:
                   std::uint64_t depth, Format format, Type type, Buffer *buffer, std::size_t offset,
                   PixelUnpackParameters const &params);
 
+    /// Uploads compressed blocks.
+    /// @param level, x, y, z, width, height, depth as `subImage`; x and y at multiples of a block's
+    /// 4 texels
+    /// @param data `bytes` bytes, or an offset into the pixel unpack buffer while one is bound
+    /// @throws InternalException for a size or level out of range, for a format that is not
+    ///         compressed, and for another number of bytes than the blocks take (see `SizeInBytes`)
+    /// @note glCompressedTexSubImage3D; needs OpenGL 1.3
+    void compressedSubImage(int level, int x, int y, int z, std::uint64_t width,
+                            std::uint64_t height, std::uint64_t depth, void const *data,
+                            std::size_t bytes);
+
+    /// Reads the compressed blocks of a level.
+    /// @param dst, bytes memory, of `compressedSize(level)` bytes
+    /// @throws InternalException when the texture is not bound, for a format that is not
+    /// compressed,
+    ///         and for another number of bytes
+    /// @note glGetCompressedTexImage; needs OpenGL 1.3
+    void getCompressedData(void *dst, std::size_t bytes, int level) const;
+
     /// Copies a rectangle of the current read framebuffer, beginning at (x, y), into one image.
     /// @throws InternalException for a size or level out of range, as `subImage`
     /// @note glCopyTexSubImage3D
@@ -124,6 +143,31 @@ public:
 
     /// The number of layers.
     std::uint64_t depth(unsigned int level) const override;
+};
+
+/// GL_TEXTURE_CUBE_MAP_ARRAY: cubes of six square images each, sampled by a direction and a number.
+/// The images are addressed like layers, six a cube in the order of TextureCube::Face:
+///
+/// ```cpp
+/// rooms.subImage(0, 0, 0, 6 * room + TextureCube::FACE_POSITIVE_Y, side, side, 1, …);
+/// ```
+class ORU_API TextureCubeArray : public Texture3 {
+public:
+    /// Makes the texture and its storage.
+    /// @param side, cubes texels of a side of level 0, and how many cubes
+    /// @param mipmapped whether the levels down to one texel are allocated too
+    /// @throws as Texture3, and ExceptionOGL where the context has no arrays of cube maps
+    TextureCubeArray(InternalFormat format, std::uint64_t side, std::uint64_t cubes,
+                     bool mipmapped);
+
+    /// As Texture2D's.
+    TextureCubeArray(unsigned int name, ownership_tag ownership);
+
+    /// The number of images, six times that of cubes.
+    std::uint64_t depth(unsigned int level) const override;
+
+    /// OpenGL 4.0 or GL_ARB_texture_cube_map_array.
+    static bool IsSupported();
 };
 
 } // namespace ORU::OGL

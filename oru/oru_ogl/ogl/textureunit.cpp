@@ -43,6 +43,10 @@ void TextureUnit::bind(unsigned int target, unsigned int name) const {
     ORU_GL(BindTexture, target, name);
 }
 
+void TextureUnit::bind(Texture const *texture) const {
+    ORU_GL(BindTexture, texture->target(), texture->checkedID());
+}
+
 // One row per target: its name here, its GL target and the class that is bound to it.
 #define ORU_BINDING(Target, gl, Class)                                                             \
     void TextureUnit::bind(Class const *texture) const {                                           \

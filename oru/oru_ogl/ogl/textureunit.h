@@ -5,6 +5,7 @@
 
 namespace ORU::OGL {
 
+class Texture;
 class Texture1D;
 class Texture2D;
 class Texture2DArray;
@@ -41,6 +42,8 @@ public:
     void bind(Texture3D const *texture) const;
     void bind(Texture2DArray const *texture) const;
     void bind(TextureRECT const *texture) const;
+    /// A texture of any kind: cube maps, buffer textures and multisample textures among them.
+    void bind(Texture const *texture) const;
     /// @param target GL enumeration value
     /// @param name GL name of a texture, or 0
     void bind(unsigned int target, unsigned int name) const;

@@ -2,13 +2,17 @@
 #include "tests/support/textof.h"
 #include "tests/support/texturekinds.h"
 
+#include "oru/oru_ogl/ogl/buffertexture.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/fence.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/programogl.h"
 #include "oru/oru_ogl/ogl/query.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
+#include "oru/oru_ogl/ogl/sampler.h"
 #include "oru/oru_ogl/ogl/shader.h"
+#include "oru/oru_ogl/ogl/texture2dmultisample.h"
+#include "oru/oru_ogl/ogl/texturecube.h"
 #include "oru/oru_ogl/ogl/vertexarray.h"
 
 #include <functional>
@@ -51,6 +55,12 @@ struct Handling : TextureHandling {
             return Object(format, 8, false);
         else if constexpr (std::is_same_v<Object, TextureRECT>)
             return Object(format, 8, 4);
+        else if constexpr (std::is_same_v<Object, TextureCube>)
+            return Object(format, 8, true);
+        else if constexpr (std::is_same_v<Object, TextureCubeArray>)
+            return Object(format, 8, 2, true);
+        else if constexpr (std::is_same_v<Object, Texture2DMultisample>)
+            return Object(format, 8, 4, 2);
         else if constexpr (std::is_base_of_v<Texture2, Object>)
             return Object(format, 8, 4, true);
         else
@@ -93,6 +103,25 @@ struct Handling<Framebuffer> {
     static std::string Tell(Framebuffer const &f) { return TextOf(f.target()); }
     static inline std::function<void(Framebuffer &)> const kUses[] = {
         [](Framebuffer &f) { f.bind(); }, [](Framebuffer &f) { f.statusOkay(nullptr); }};
+};
+
+template<>
+struct Handling<BufferTexture> : TextureHandling {
+    static BufferTexture Make() {
+        // OpenGL keeps the store of a deleted buffer while a texture has it.
+        return BufferTexture(
+            Texture::INTERNALFORMAT_RGBA16,
+            Buffer(40, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr));
+    }
+};
+
+template<>
+struct Handling<Sampler> {
+    static Sampler Make() { return Sampler(kNearest, kNearest, Texture::WRAPMODE_REPEAT); }
+    static bool Lives(unsigned int name) { return ORU_GL(IsSampler, name); }
+    static std::string Tell(Sampler const &s) { return TextOf(s.target()); }
+    static inline std::function<void(Sampler &)> const kUses[] = {
+        [](Sampler &s) { s.bind(0); }, [](Sampler &s) { s.setFilter(kNearest, kNearest); }};
 };
 
 template<>
@@ -192,6 +221,7 @@ protected:
 
 using Kinds =
     testing::Types<Texture1D, Texture2D, TextureRECT, Texture1DArray, Texture3D, Texture2DArray,
+                   TextureCube, TextureCubeArray, BufferTexture, Texture2DMultisample, Sampler,
                    Buffer, Fence, Framebuffer, Query, Renderbuffer, Shader, Program, VertexArray>;
 
 } // namespace
@@ -263,16 +293,17 @@ TEST_F(ObjectTest, TakesOverOnlyTexturesThatAFormatStandsFor) {
         {GL_R8, TextOf(Texture::INTERNALFORMAT_RED)},
         {GL_RG8, TextOf(Texture::INTERNALFORMAT_RG)},
         {GL_RGB5_A1, TextOf(Texture::INTERNALFORMAT_RGB5_A1)},
-        {GL_DEPTH_COMPONENT24, "A texture of the format GL_DEPTH_COMPONENT24 cannot be taken over: "
-                               "no InternalFormat stands for it"}};
+        {GL_SRGB8_ALPHA8, TextOf(Texture::INTERNALFORMAT_SRGB8_ALPHA8)},
+        {GL_RGBA8_SNORM, "A texture of the format GL_RGBA8_SNORM cannot be taken over: no "
+                         "InternalFormat stands for it"}};
     for (auto const &[format, expected] : formats) {
         GLuint name = 0;
         ORU_GL(GenTextures, 1, &name);
         ORU_GL(BindTexture, GL_TEXTURE_2D, name);
         EXPECT_FAILURE("The texture " + std::to_string(name) + " has no level 0 yet",
                        Texture2D(name, borrow_name_tag()));
-        ORU_GL(TexImage2D, GL_TEXTURE_2D, 0, static_cast<GLint>(format), 4, 4, 0,
-               format == GL_DEPTH_COMPONENT24 ? GL_DEPTH_COMPONENT : GL_RGBA, GL_FLOAT, nullptr);
+        ORU_GL(TexImage2D, GL_TEXTURE_2D, 0, static_cast<GLint>(format), 4, 4, 0, GL_RGBA, GL_FLOAT,
+               nullptr);
         std::string told;
         told += MessageOf([&] { told = TextOf(Texture2D(name, borrow_name_tag()).format()); });
         EXPECT_EQ(expected, told);

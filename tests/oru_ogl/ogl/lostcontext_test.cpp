@@ -14,6 +14,8 @@
 #include "oru/oru_ogl/ogl/query.h"
 #include "oru/oru_ogl/ogl/queryscope.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
+#include "oru/oru_ogl/ogl/sampler.h"
+#include "oru/oru_ogl/ogl/samplerbindscope.h"
 #include "oru/oru_ogl/ogl/shader.h"
 #include "oru/oru_ogl/ogl/texturebindscope.h"
 #include "oru/oru_ogl/ogl/vertexarray.h"
@@ -28,6 +30,8 @@ struct Everything {
     Buffer buffer{4, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr};
     Framebuffer framebuffer;
     Renderbuffer renderbuffer{GL_RGBA8, 1, 1};
+    Sampler sampler{Texture::FILTER_LINEAR, Texture::FILTER_LINEAR, Texture::WRAPMODE_REPEAT};
+    SamplerBindScope sampled{sampler, 1};
     VertexShader shader;
     Program program;
     VertexBuffer vertices{{VertexBuffer::Field("", VertexBuffer::ATTRIBUTETYPE_FLOAT, {})},

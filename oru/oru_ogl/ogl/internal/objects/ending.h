@@ -28,6 +28,8 @@ public:
         action_();
     }
 
+    Action &action() { return action_; }
+
 private:
     Action action_;
     bool pending_ = true;

@@ -13,16 +13,17 @@ struct TranslationRow {
     unsigned int gl;
 };
 
-/// One row per enumerator, in the enumeration's order, which starts at 0 and has no gaps.
+/// One row per enumerator, in the enumeration's order, which has no gaps.
 template<class Enumeration, std::size_t Count, class Row = TranslationRow<Enumeration>>
 struct Translation {
     char const *failure; ///< text of the failure
     Row rows[Count];
+    std::size_t first = 0; ///< the value of the first enumerator
 
     /// For a static_assert: each row is where the look-up by value expects it.
     constexpr bool isInOrder() const {
         for (std::size_t i = 0; i < Count; ++i) {
-            if (static_cast<std::size_t>(rows[i].value) != i)
+            if (static_cast<std::size_t>(rows[i].value) != first + i)
                 return false;
         }
         return true;
@@ -30,7 +31,7 @@ struct Translation {
 
     /// The row of a value, or null for a number that is no enumerator.
     constexpr Row const *find(Enumeration value) const {
-        auto const index = static_cast<std::size_t>(value);
+        auto const index = static_cast<std::size_t>(value) - first; // wraps around below it
         return index < Count ? &rows[index] : nullptr;
     }
 
@@ -74,4 +75,16 @@ struct Translation {
     }                                                                                              \
     Class::Enumeration Class::GL2##Enumeration(unsigned int gl) {                                  \
         return table.fromGL(gl, __FILE__, __LINE__);                                               \
+    }
+
+/// The same for an enumeration with a second table, of the enumerators that came later.
+#define ORU_TRANSLATED_IN_TWO(Class, Enumeration, table, later)                                    \
+    static_assert(table.isInOrder() && later.isInOrder());                                         \
+    unsigned int Class::Enumeration##2GL(Enumeration value) {                                      \
+        auto const *const row = later.find(value);                                                 \
+        return row ? row->gl : table.toGL(value, __FILE__, __LINE__);                              \
+    }                                                                                              \
+    Class::Enumeration Class::GL2##Enumeration(unsigned int gl) {                                  \
+        auto const *const row = later.findGL(gl);                                                  \
+        return row ? row->value : table.fromGL(gl, __FILE__, __LINE__);                            \
     }

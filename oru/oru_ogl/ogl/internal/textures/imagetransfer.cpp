@@ -4,8 +4,10 @@
 #include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
-#include "oru/oru_ogl/ogl/internal/textures/texturetables.h"
+#include "oru/oru_ogl/ogl/internal/objects/supported.h"
+#include "oru/oru_ogl/ogl/internal/textures/laterformats.h"
 
+#include <algorithm>
 #include <cstring>
 
 namespace ORU::OGL::internal {
@@ -45,14 +47,66 @@ void CheckByteAlignment(unsigned int bytes) {
         ORU_THROW_INTERNAL("Invalid row byte alignment (must be of 1, 2, 4, or 8).");
 }
 
-void RequireFormat(Texture::InternalFormat format) {
+namespace {
+
+/// Of the formats of OpenGL 2, those of core contexts are the ones that begin with red.
+bool IsDeprecated(Texture::InternalFormat format) {
     auto const *const row = kInternalFormats.find(format);
-    // The formats of core contexts are those that begin with red.
-    bool const isDeprecated = row && row->name[std::strlen("INTERNALFORMAT_")] != 'R';
-    if (isDeprecated && IsCoreContext())
-        ORU_THROW_INTERNAL(ComposeText(row->name,
-                                       " needs a compatibility context: in a core one use "
-                                       "a format of red, or of red and green"));
+    return row && row->name[std::strlen("INTERNALFORMAT_")] != 'R';
+}
+
+char const *NameOf(TexelKind kind) {
+    return kind == TexelKind::Integer ? "integers" : kind == TexelKind::Depth ? "depth" : "colours";
+}
+
+} // namespace
+
+bool IsFormatSupported(Texture::InternalFormat format) {
+    if (IsDeprecated(format))
+        return !IsCoreContext();
+    auto const *const row = kLaterFormats.find(format);
+    if (!row)
+        return kInternalFormats.find(format) != nullptr;
+    ExtensionManager const &record = *RecordOfCurrent();
+    if (row->version && record.majorVersion() * 10 + record.minorVersion() >= row->version)
+        return true;
+    auto const &names = record.supportedExtensionNames();
+    return row->extension && std::find(names.begin(), names.end(), row->extension) != names.end();
+}
+
+void RequireFormat(Texture::InternalFormat format) {
+    if (auto const *const row = kLaterFormats.find(format)) {
+        if (RecordOfCurrent() && !IsFormatSupported(format))
+            ORU_THROW_INTERNAL(ComposeText("The current context has no textures of ", row->name,
+                                           ": ask Texture::IsFormatSupported first"));
+        return;
+    }
+    if (IsDeprecated(format) && IsCoreContext())
+        ORU_THROW_INTERNAL(ComposeText(format, " needs a compatibility context: in a core one use "
+                                               "a format of red, or of red and green"));
+}
+
+void RequireAnisotropy(float ratio) {
+    ORU_ASSERT_SUPPORTED(GL_EXT_TEXTURE_FILTER_ANISOTROPIC);
+    float const most = Texture::MaxAnisotropy();
+    if (!(ratio >= 1 && ratio <= most))
+        ORU_THROW_INTERNAL(ComposeText("An anisotropy of ", ratio, " is not from 1 to ", most));
+}
+
+void CheckSameKind(Texture::InternalFormat format, Texture::Format pixels) {
+    auto const *const row = kLaterFormats.find(format);
+    TexelKind const texels = row ? KindOf(row->clientFormat) : TexelKind::Colour;
+    unsigned int const glFormat = Texture::Format2GL(pixels);
+    TexelKind const memory = KindOf(glFormat);
+    if (texels != memory)
+        ORU_THROW_INTERNAL(ComposeText("A texture of ", format, " holds ", NameOf(texels),
+                                       ", and pixels of ", ORUOGLTokenName(glFormat), " are ",
+                                       NameOf(memory), ": transfer it in a format of its kind"));
+}
+
+GLenum StorageType(Texture::InternalFormat format) {
+    auto const *const row = kLaterFormats.find(format);
+    return row ? row->clientType : GL_UNSIGNED_BYTE;
 }
 
 PixelLayout LayoutOf(Texture::Format format, Texture::Type type) {

@@ -78,8 +78,38 @@ struct Part {
 template<std::size_t Sides>
 using SendPart = void (*)(Part<Sides> const &part, GLenum format, GLenum type, void const *pixels);
 
-/// @throws InternalException in a core context for a format that it lacks
+/// Whether the current context, which there is, has textures of a format; see
+/// Texture::IsFormatSupported.
+bool IsFormatSupported(Texture::InternalFormat format);
+
+/// @throws InternalException in a core context for a format that it lacks, and in any for a later
+///         format that it lacks
 void RequireFormat(Texture::InternalFormat format);
+
+/// @throws InternalException unless the current context filters so
+void RequireAnisotropy(float ratio);
+
+/// The slow part of `RequireSameKind`.
+void CheckSameKind(Texture::InternalFormat format, Texture::Format pixels);
+
+/// @throws InternalException when texels and pixels are of different kinds and one of them is of a
+///         later format: integers on one side only, say
+inline void RequireSameKind(Texture::InternalFormat format, Texture::Format pixels) {
+    if (format >= Texture::INTERNALFORMAT_R8 || pixels >= Texture::FORMAT_RED_INTEGER)
+        CheckSameKind(format, pixels);
+}
+
+/// The type of pixels that storage of a format is allocated with.
+GLenum StorageType(Texture::InternalFormat format);
+
+/// Bytes of a level of a compressed format, or 0 for other formats.
+template<class... Sides>
+GLsizei CompressedBytes(Texture::InternalFormat format, Sides... sides) {
+    if (!Texture::IsCompressed(format))
+        return 0;
+    std::uint64_t const texels[] = {static_cast<std::uint64_t>(sides)..., 1};
+    return static_cast<GLsizei>(Texture::SizeInBytes(format, texels[0], texels[1], texels[2]));
+}
 
 /// A format and a type of pixels in memory, as OpenGL takes them.
 struct PixelLayout {
