@@ -31,8 +31,10 @@ public:
     }
     ORU_FOLLOW(Buffers)
     ORU_FOLLOW(FramebuffersEXT)
+    ORU_FOLLOW(ProgramPipelines)
     ORU_FOLLOW(RenderbuffersEXT)
     ORU_FOLLOW(Textures)
+    ORU_FOLLOW(TransformFeedbacks)
     ORU_FOLLOW(VertexArrays)
 #undef ORU_FOLLOW
 
