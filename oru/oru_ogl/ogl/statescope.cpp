@@ -1,11 +1,11 @@
 // State of drawing changed for a scope: viewport, scissor, depth, stencil, culling, colour mask.
 #include "oru/oru_ogl/ogl/statescope.h"
 
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/platformgl.h"
 
-#include <algorithm>
 #include <array>
 #include <cstddef>
 #include <cstring>
@@ -105,51 +105,67 @@ constexpr Piece kPieces[] = {
      [](GLint const *v) { ORU_GL(ColorMask, Flag(v[0]), Flag(v[1]), Flag(v[2]), Flag(v[3])); }},
 };
 
-/// The members of a state, as many as the largest has.
-using Values = std::array<GLint, 15>;
+/// Where the pieces of a kind stand, which follow each other.
+struct Range {
+    std::size_t begin;
+    std::size_t end;
+};
 
-/// Calls `each(piece, first value)` for the pieces of a kind.
-/// @return how many values they have
+constexpr Range RangeOf(StateKind kind) {
+    std::size_t begin = 0;
+    while (kPieces[begin].kind != kind)
+        ++begin;
+    std::size_t end = begin;
+    while (end < std::size(kPieces) && kPieces[end].kind == kind)
+        ++end;
+    return {begin, end};
+}
+
+constexpr Range kRanges[] = {RangeOf(StateKind::Viewport), RangeOf(StateKind::Scissor),
+                             RangeOf(StateKind::Depth),    RangeOf(StateKind::Stencil),
+                             RangeOf(StateKind::Cull),     RangeOf(StateKind::ColorMask)};
+
+/// Calls `each(piece, offset)` for the pieces of a kind.
+/// @param each the offset is that of the piece's values in the state, in bytes
 template<class Each>
-std::size_t ForEachPiece(StateKind kind, Each each) {
-    std::size_t first = 0;
-    for (Piece const &piece : kPieces) {
-        if (piece.kind != kind)
-            continue;
-        each(piece, first);
-        first += piece.count;
+void ForEachPiece(StateKind kind, Each each) {
+    Range const range = kRanges[static_cast<std::size_t>(kind)];
+    std::size_t offset = 0;
+    for (std::size_t i = range.begin; i < range.end; ++i) {
+        each(kPieces[i], offset);
+        offset += kPieces[i].count * sizeof(GLint);
     }
-    return first;
 }
 
-Values ValuesOf(StateKind kind, void const *state) {
-    Values values = {};
-    std::size_t const count = ForEachPiece(kind, [](Piece const &, std::size_t) {});
-    std::memcpy(values.data(), state, count * sizeof(GLint));
-    return values;
-}
+/// As many values as a piece can have.
+using Values = std::array<GLint, 4>;
 
 /// Calls `set(piece, values)` for each piece in which two states differ.
 template<class Set>
 void ForEachDifference(StateKind kind, void const *from, void const *to, Set set) {
-    Values const old = ValuesOf(kind, from), wanted = ValuesOf(kind, to);
-    ForEachPiece(kind, [&](Piece const &piece, std::size_t first) {
-        GLint const *const values = &wanted[first];
-        if (!std::equal(values, values + piece.count, &old[first]))
-            set(piece, values);
+    auto const *const old = static_cast<char const *>(from);
+    auto const *const wanted = static_cast<char const *>(to);
+    ForEachPiece(kind, [&](Piece const &piece, std::size_t offset) {
+        std::size_t const size = piece.count * sizeof(GLint);
+        if (std::memcmp(old + offset, wanted + offset, size) == 0)
+            return;
+        Values values;
+        std::memcpy(values.data(), wanted + offset, size);
+        set(piece, values.data());
     });
 }
 
 } // namespace
 
 void StateAccess::Read(StateKind kind, void *state) {
-    Values values = {};
-    std::size_t const count = ForEachPiece(kind, [&values](Piece const &piece, std::size_t first) {
-        ORU_GL(GetIntegerv, piece.queries[0], &values[first]);
+    ForEachPiece(kind, [state](Piece const &piece, std::size_t offset) {
+        Values values = {};
+        ORU_GL(GetIntegerv, piece.queries[0], values.data());
         for (std::size_t i = 1; i < std::size(piece.queries) && piece.queries[i]; ++i)
-            ORU_GL(GetIntegerv, piece.queries[i], &values[first + i]);
+            ORU_GL(GetIntegerv, piece.queries[i], &values[i]);
+        std::memcpy(static_cast<char *>(state) + offset, values.data(),
+                    piece.count * sizeof(GLint));
     });
-    std::memcpy(state, values.data(), count * sizeof(GLint));
 }
 
 void StateAccess::Set(StateKind kind, void const *from, void const *to) {
@@ -163,8 +179,10 @@ void StateAccess::Set(StateKind kind, void const *from, void const *to) {
 }
 
 void StateAccess::PutBack(StateKind kind, void const *from, void const *to) noexcept {
-    ForEachDifference(kind, from, to, [](Piece const &piece, GLint const *values) {
-        internal::Release([&] { piece.set(values); });
+    internal::Release([&] {
+        ForEachDifference(kind, from, to, [](Piece const &piece, GLint const *values) {
+            DropExceptions([&] { piece.set(values); });
+        });
     });
 }
 
