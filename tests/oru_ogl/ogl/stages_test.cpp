@@ -7,6 +7,7 @@
 #include "oru/oru_ogl/ogl/transformfeedback.h"
 #include "oru/oru_ogl/ogl/transformfeedbackscope.h"
 
+#include <cstdint>
 #include <functional>
 #include <stdexcept>
 #include <utility>
@@ -26,6 +27,11 @@ char const kWholeView[] = "#version 150\n"
 char const kCounts[] = "#version 150\nout float number; out vec2 squares;\n"
                        "void main() { number = float(gl_VertexID); squares = vec2(number * number);"
                        "gl_Position = vec4(0.0); }";
+
+/// Takes the squares up again.
+char const kTakes[] = "#version 150\nin vec2 taken; out float number; out vec2 squares;\n"
+                      "void main() { number = taken.x; squares = taken + vec2(1.0);"
+                      "gl_Position = vec4(0.0); }";
 
 /// Two pictures of 4 x 4 that are drawn into together, with the vertex array that core contexts
 /// want.
@@ -128,9 +134,9 @@ TEST_F(StagesTest, AllStagesDrawIntoTheOutputsThatAreChosen) {
 TEST_F(StagesTest, FeedbackCapturesWhatIsAskedFor) {
     Target const target;
     ORU_GL(Enable, GL_RASTERIZER_DISCARD);
-    auto const link = [](Program::FeedbackMode mode) {
+    auto const link = [](char const *source, Program::FeedbackMode mode) {
         Program program;
-        program.loadVertexShader(kCounts);
+        program.loadVertexShader(source);
         program.setFeedbackVaryings({"squares", "number"}, mode);
         program.link(true);
         program.enable();
@@ -142,7 +148,7 @@ TEST_F(StagesTest, FeedbackCapturesWhatIsAskedFor) {
     Buffer one = Numbers(8), other = Numbers(3);
     TransformFeedback feedback;
     {
-        Program const program = link(Program::FEEDBACKMODE_SEPARATE);
+        Program const program = link(kCounts, Program::FEEDBACKMODE_SEPARATE);
         feedback.setBuffer(0, one, 4, 24);
         feedback.setBuffer(1, other);
         {
@@ -161,7 +167,13 @@ TEST_F(StagesTest, FeedbackCapturesWhatIsAskedFor) {
               Get({GL_TRANSFORM_FEEDBACK_BINDING, GL_TRANSFORM_FEEDBACK_BUFFER_BINDING}));
 
     // As many as were captured are drawn, into the context's own object. Exceptions end a capture.
-    Program const program = link(Program::FEEDBACKMODE_INTERLEAVED);
+    Program program = link(kTakes, Program::FEEDBACKMODE_INTERLEAVED);
+    auto const taken = static_cast<GLuint>(program.getAttributeLocation("taken"));
+    one.bind();
+    ORU_GL(VertexAttribPointer, taken, 2, GL_FLOAT, GL_FALSE, 8,
+           reinterpret_cast<void const *>(std::uintptr_t(4)));
+    ORU_GL(EnableVertexAttribArray, taken);
+    Buffer::BindDefaultArrayBuffer();
     Buffer all = Numbers(12);
     ORU_GL(BindBufferBase, GL_TRANSFORM_FEEDBACK_BUFFER, 0u, all.objectID());
     try {
@@ -170,7 +182,7 @@ TEST_F(StagesTest, FeedbackCapturesWhatIsAskedFor) {
         throw std::runtime_error("ends the capture");
     } catch (std::runtime_error const &) {
     }
-    EXPECT_EQ((Floats{0, 0, 0, 1, 1, 1, 4, 4, 2, -1, -1, -1}), Contents(all));
+    EXPECT_EQ((Floats{2, 2, 1, 10, 10, 9, 17, 17, 16, -1, -1, -1}), Contents(all));
     EXPECT_FAILURE("GL_INVALID_ENUM", TransformFeedbackScope(feedback, GL_TRIANGLE_STRIP));
     EXPECT_FALSE(feedback.isBound());
     ORU_GL(UseProgram, 0u);

@@ -48,7 +48,7 @@ protected:
             auto wanted = Numbers(one);
             wanted[i] = Numbers(other)[i];
             State state;
-            std::memcpy(&state, wanted.data(), sizeof state);
+            std::memcpy(static_cast<void *>(&state), wanted.data(), sizeof state);
             calls_->reset();
             try {
                 TemporaryStateScope<State> const scope(state);
