@@ -94,6 +94,7 @@ public:
     /// The same for a shader of any stage, from a text that need not end with a zero.
     /// @throws InternalException for a stage that the current context does not have
     void loadShader(Shader::ShaderType type, std::string_view source);
+    /// @}
 
     /// @name One text for each stage
     /// As `loadShader`. Tessellation needs GL_ARB_tessellation_shader, geometry OpenGL 3.2.
@@ -113,7 +114,6 @@ public:
     void loadTessellationEvaluationShader(std::string_view source) {
         loadShader(Shader::SHADERTYPE_TESSELLATION_EVALUATION, source);
     }
-    /// @}
     /// @}
 
     /// @name Linking and use
