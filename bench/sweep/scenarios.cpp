@@ -2,6 +2,7 @@
 #include "bench/sweep/scenarios.h"
 
 #include "bench/sweep/faults.h"
+#include "bench/sweep/opengl3.h"
 
 #include "apps/develop/job.h"
 #include "apps/develop/options.h"
@@ -370,6 +371,9 @@ std::vector<Scenario> const &Scenarios() {
         {"later-textures", LaterTextures, Needs::Context, ""},
         {"framebuffer-transfers", FramebufferTransfers, Needs::Context, ""},
         {"programs", Programs, Needs::Context, ""},
+        {"streams", Streams, Needs::Context, ""},
+        // The end of a capture is a destructor, as are those of state.
+        {"stages", Stages, Needs::Context, "glEndTransformFeedback glBindTransformFeedback"},
         // Wrappers do not look at what retaining and releasing lead to.
         {"opencl", OpenCL, Needs::OpenCL, "clRetain clRelease"},
         {"develop", DevelopWithSpots, Needs::Nothing, ""},

@@ -26,7 +26,7 @@ inline ORU::OGL::ExtensionManager::InitOptions RunOptions() {
     return options;
 }
 
-/// Hands shaders of GLSL 1.x on as core contexts know them.
+/// Hands shaders of GLSL 1.10 and 1.20 on as core contexts know them.
 class CoreShaders : public ORU::OGL::OpenGLForwarder {
 public:
     void cgmShaderSource(char const *file, unsigned int line, GLuint shader, GLsizei count,
@@ -36,6 +36,9 @@ public:
             text += lengths && lengths[i] >= 0
                         ? std::string(strings[i], static_cast<std::size_t>(lengths[i]))
                         : std::string(strings[i]);
+        char const kVersion[] = "#version ";
+        if (text.find(kVersion) == 0 && std::stoi(text.substr(sizeof kVersion - 1)) > 120)
+            return OpenGLForwarder::cgmShaderSource(file, line, shader, count, strings, lengths);
         while (text.find('#') == 0) // a version, or an extension that is no longer one
             text.erase(0, text.find('\n') + 1);
         GLint type = 0;

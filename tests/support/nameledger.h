@@ -32,10 +32,12 @@ public:
     }
     ORU_FOLLOW(Buffers)
     ORU_FOLLOW(FramebuffersEXT)
+    ORU_FOLLOW(ProgramPipelines)
     ORU_FOLLOW(Queries)
     ORU_FOLLOW(RenderbuffersEXT)
     ORU_FOLLOW(Samplers)
     ORU_FOLLOW(Textures)
+    ORU_FOLLOW(TransformFeedbacks)
     ORU_FOLLOW(VertexArrays)
 #undef ORU_FOLLOW
 

@@ -4,13 +4,16 @@
 #include "oru/core/utility/export.h"
 #include "oru/core/utility/scopedptr.h"
 #include "oru/oru_ogl/ogl/ownershiptag.h"
+#include "oru/oru_ogl/ogl/shader.h"
 
+#include <cstddef>
 #include <string>
+#include <string_view>
+#include <vector>
 
 namespace ORU::OGL {
 
 class ProgramImpl;
-class Shader;
 
 /// A program object: attach shaders, link, enable, set uniforms, draw.
 ///
@@ -28,6 +31,12 @@ class Shader;
 /// 2.0.
 class ORU_API Program {
 public:
+    /// How transform feedback lays what it captures into buffers.
+    enum FeedbackMode : unsigned int {
+        FEEDBACKMODE_INTERLEAVED = 0, ///< GL_INTERLEAVED_ATTRIBS: vertex after vertex in one buffer
+        FEEDBACKMODE_SEPARATE         ///< GL_SEPARATE_ATTRIBS: each varying in a buffer of its own
+    };
+
     /// Makes a program without shaders.
     /// @throws InternalException when the current context has no programs
     /// @note glCreateProgram
@@ -81,6 +90,30 @@ public:
     void loadVertexShader(unsigned int count, char const *const *strings, int const *lengths);
     /// As `loadVertexShader`.
     void loadFragmentShader(unsigned int count, char const *const *strings, int const *lengths);
+
+    /// The same for a shader of any stage, from a text that need not end with a zero.
+    /// @throws InternalException for a stage that the current context does not have
+    void loadShader(Shader::ShaderType type, std::string_view source);
+    /// @}
+
+    /// @name One text for each stage
+    /// As `loadShader`. Tessellation needs GL_ARB_tessellation_shader, geometry OpenGL 3.2.
+    /// @{
+    void loadVertexShader(std::string_view source) {
+        loadShader(Shader::SHADERTYPE_VERTEX, source);
+    }
+    void loadFragmentShader(std::string_view source) {
+        loadShader(Shader::SHADERTYPE_FRAGMENT, source);
+    }
+    void loadGeometryShader(std::string_view source) {
+        loadShader(Shader::SHADERTYPE_GEOMETRY, source);
+    }
+    void loadTessellationControlShader(std::string_view source) {
+        loadShader(Shader::SHADERTYPE_TESSELLATION_CONTROL, source);
+    }
+    void loadTessellationEvaluationShader(std::string_view source) {
+        loadShader(Shader::SHADERTYPE_TESSELLATION_EVALUATION, source);
+    }
     /// @}
 
     /// @name Linking and use
@@ -139,6 +172,78 @@ public:
     /// @return -1 when the linked program does not use the attribute
     /// @note glGetAttribLocation
     int getAttributeLocation(char const *name);
+    /// @}
+
+    /// @name What comes out, besides the window's colour
+    /// @{
+
+    /// Which colour buffer an output of the fragment shader goes to. Takes effect when the program
+    /// is linked next.
+    /// @param color index of the draw buffer
+    /// @throws InternalException before OpenGL 3.0
+    /// @note glBindFragDataLocation
+    void setFragmentOutputLocation(unsigned int color, char const *name);
+
+    /// Where an output of the linked program goes.
+    /// @return -1 when the program has no such output
+    /// @throws InternalException before OpenGL 3.0
+    /// @note glGetFragDataLocation
+    int getFragmentOutputLocation(char const *name) const;
+
+    /// What transform feedback captures of each vertex, outputs of the last stage before the
+    /// fragments. Takes effect when the program is linked next.
+    /// @throws InternalException before OpenGL 3.0
+    /// @note glTransformFeedbackVaryings
+    void setFeedbackVaryings(std::vector<std::string> const &names, FeedbackMode mode);
+    /// @}
+
+    /// @name Binaries
+    /// A linked program as bytes, so that the next start need not compile it. They are good for the
+    /// driver that made them, in its version; a host keeps its sources for all others.
+    ///
+    /// ```cpp
+    /// if (!program.loadBinary(bytes.data(), bytes.size())) {
+    ///     … load the shaders, setBinaryRetrievable(true), link(true) …
+    ///     bytes = program.saveBinary();
+    /// }
+    /// ```
+    /// @{
+
+    /// Whether the current context has binaries: OpenGL 4.1 or GL_ARB_get_program_binary, and a
+    /// driver that makes some. @note glGetIntegerv
+    static bool SupportsBinaries();
+
+    /// Whether a binary is going to be asked for. Takes effect when the program is linked next.
+    /// @throws InternalException without `SupportsBinaries()`
+    /// @note glProgramParameteri
+    void setBinaryRetrievable(bool on);
+
+    /// The linked program, with what tells whose it is and whether it is whole.
+    /// @throws InternalException without `SupportsBinaries()`, and when the program is not linked
+    /// @note glGetProgramiv, glGetProgramBinary
+    std::vector<unsigned char> saveBinary() const;
+
+    /// Makes this the program that was saved, linked, its uniforms as after a link.
+    /// @param bytes what `saveBinary` returned
+    /// @param size how many there are
+    /// @return false for what another driver or version made, for what is cut off or was changed,
+    ///         and without `SupportsBinaries()`: then nothing has happened; also when the driver
+    ///         does not take its own binary back, after which the program is not linked
+    /// @note glProgramBinary, glGetProgramiv
+    [[nodiscard]] bool loadBinary(void const *bytes, std::size_t size);
+    /// @}
+
+    /// @name Parts of a ProgramPipeline
+    /// @{
+
+    /// Whether the program can be a pipeline's. Takes effect when the program is linked next.
+    /// @throws InternalException without `ProgramPipeline::IsSupported()`
+    /// @note glProgramParameteri
+    void setSeparable(bool on);
+
+    /// A linked program of one stage for pipelines.
+    /// @throws InternalException without `ProgramPipeline::IsSupported()`, and as `link`
+    static Program Separable(Shader::ShaderType type, std::string_view source);
     /// @}
 
     /// @name Uniform queries

@@ -53,6 +53,12 @@ void Shader::load(std::string const &source) {
     body().load(source);
 }
 
+void Shader::loadSource(std::string_view source) {
+    char const *const text = source.empty() ? "" : source.data();
+    int const length = static_cast<int>(source.size());
+    load(1, &text, &length);
+}
+
 bool Shader::isLoaded() const {
     return body().isLoaded();
 }

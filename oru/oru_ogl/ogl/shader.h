@@ -6,6 +6,7 @@
 #include "oru/oru_ogl/ogl/ownershiptag.h"
 
 #include <string>
+#include <string_view>
 
 namespace ORU::OGL {
 
@@ -63,6 +64,10 @@ public:
     /// Replaces the source.
     /// @note glShaderSource
     void load(std::string const &source);
+
+    /// Replaces the source by a text that need not end with a zero.
+    /// @note glShaderSource
+    void loadSource(std::string_view source);
 
     /// Whether there is a source that is not empty. @note glGetShaderiv
     bool isLoaded() const;

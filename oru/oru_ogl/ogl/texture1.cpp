@@ -6,6 +6,7 @@
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
+#include "oru/oru_ogl/ogl/internal/textures/viewtransfer.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {
@@ -71,6 +72,17 @@ void Texture1::subImage(int level, int x, std::uint64_t width, Format format, Ty
     imageChanged(level);
 }
 
+void Texture1::subImage(int level, int x, PixelView const &pixels) {
+    upload(level, x, pixels.shape(), pixels.data());
+}
+
+void Texture1::upload(int level, int x, PixelShape const &shape, void const *pixels) {
+    checkPart("subimage", level, shape.width);
+    internal::Upload(Send, Part{target(), level, {x}, internal::ToSides(shape.width)}, shape,
+                     pixels);
+    imageChanged(level);
+}
+
 void Texture1::copyTexSubImage(int level, int xOffset, int x, int y, std::uint64_t width) {
     checkPart("copySubimage", level, width);
     ORU_GL(CopyTexSubImage1D, target(), level, xOffset, x, y, static_cast<GLsizei>(width));
@@ -88,6 +100,15 @@ void Texture1::getPixelData(Buffer *buffer, int offset, int level, unsigned int 
     internal::BecomePackBuffer(*buffer);
     internal::ReadInto(*buffer, static_cast<std::uint64_t>(offset),
                        [&](void *pixels) { getPixelData(pixels, level, format, type); });
+}
+
+void Texture1::getPixelData(MutablePixelView const &pixels, int level) const {
+    readLevel(level, pixels.shape(), pixels.data());
+}
+
+void Texture1::readLevel(int level, PixelShape const &shape, void *pixels) const {
+    internal::CheckLevel(*this, shape, level, width(static_cast<unsigned>(level)), 1, 1);
+    internal::ReadLevel(target(), level, shape, pixels);
 }
 
 std::size_t Texture1::pixelDataSize(int /*level*/, Format format, Type type) const {

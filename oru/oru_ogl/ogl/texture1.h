@@ -6,6 +6,11 @@
 namespace ORU::OGL {
 
 class Buffer;
+class MutablePixelView;
+class PixelReadStream;
+class PixelUploadStream;
+class PixelView;
+struct PixelShape;
 
 /// A texture of one row of texels. The transfers act on the texture bound to the target.
 class ORU_API Texture1 : public Texture {
@@ -37,6 +42,12 @@ public:
     void subImage(int level, int x, std::uint64_t width, Format format, Type type, Buffer *buffer,
                   std::size_t offset, PixelUnpackParameters const &params);
 
+    /// Uploads pixels whose memory is long enough for them. Pixel storage is as it was afterwards,
+    /// also after a failure.
+    /// @throws InternalException for pixels of more sides than the texture's, also as above
+    /// @note glTexSubImage1D, with glPixelStorei and what saves its state around it
+    void subImage(int level, int x, PixelView const &pixels);
+
     /// Copies pixels of the current read framebuffer, beginning at (x, y).
     /// @throws InternalException for a size or level out of range, as `subImage`
     /// @note glCopyTexSubImage1D
@@ -55,6 +66,14 @@ public:
     void getPixelData(Buffer *buffer, int offset, int level, unsigned int format,
                       unsigned int type) const;
 
+    /// Reads a level into memory that is long enough for it. Pixel storage is as it was afterwards,
+    /// also after a failure.
+    /// @param pixels as many as the level has texels
+    /// @throws InternalException when the texture is not bound, and for pixels of other sides than
+    ///         the level's
+    /// @note glGetTexImage, with glPixelStorei and what saves its state around it
+    void getPixelData(MutablePixelView const &pixels, int level) const;
+
     /// Bytes that level 0 takes in memory when its rows have no gaps, whatever the level.
     /// @throws InternalException for types other than bytes, shorts, half floats and floats
     std::size_t pixelDataSize(int level, Format format, Type type) const;
@@ -71,6 +90,14 @@ protected:
     Texture1(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership);
 
 private:
+    friend class PixelReadStream;
+    friend class PixelUploadStream;
+
+    /// Transfers without a word about memory.
+    /// @param pixels an address, or an offset into the buffer that is bound for such transfers
+    void upload(int level, int x, PixelShape const &shape, void const *pixels);
+    void readLevel(int level, PixelShape const &shape, void *pixels) const;
+
     void checkPart(char const *operation, int level, std::uint64_t width) const;
 };
 

@@ -6,6 +6,7 @@
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
+#include "oru/oru_ogl/ogl/internal/textures/viewtransfer.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {
@@ -109,6 +110,18 @@ void Texture2::subImage(int level, int x, int y, std::uint64_t width, std::uint6
     imageChanged(level);
 }
 
+void Texture2::subImage(int level, int x, int y, PixelView const &pixels) {
+    upload(level, x, y, pixels.shape(), pixels.data());
+}
+
+void Texture2::upload(int level, int x, int y, PixelShape const &shape, void const *pixels) {
+    checkPart("subimage", level, shape.width, shape.height);
+    internal::Upload(Send,
+                     Part{target(), level, {x, y}, internal::ToSides(shape.width, shape.height)},
+                     shape, pixels);
+    imageChanged(level);
+}
+
 void Texture2::compressedSubImage(int level, int x, int y, std::uint64_t width,
                                   std::uint64_t height, void const *data, std::size_t bytes) {
     checkPart("subimage", level, width, height);
@@ -162,6 +175,17 @@ void Texture2::getPixelData(Buffer *buffer, std::size_t offset, int level, Forma
             ORU_GL(GetTexImage, target(), level, layout.format, layout.type, pixels);
         });
     });
+}
+
+void Texture2::getPixelData(MutablePixelView const &pixels, int level) const {
+    readLevel(level, pixels.shape(), pixels.data());
+}
+
+void Texture2::readLevel(int level, PixelShape const &shape, void *pixels) const {
+    auto const halvings = static_cast<unsigned>(level);
+    unsigned const ofRows = target() == GL_TEXTURE_1D_ARRAY ? 0 : halvings; // layers stay as many
+    internal::CheckLevel(*this, shape, level, width(halvings), height(ofRows), 1);
+    internal::ReadLevel(target(), level, shape, pixels);
 }
 
 std::size_t Texture2::pixelDataSize(int /*level*/, Format format, Type type) const {

@@ -6,6 +6,11 @@
 namespace ORU::OGL {
 
 class Buffer;
+class MutablePixelView;
+class PixelReadStream;
+class PixelUploadStream;
+class PixelView;
+struct PixelShape;
 
 /// A texture of rows of texels; the layers of a 1-D array count as rows. The transfers act on the
 /// texture bound to the target.
@@ -46,6 +51,12 @@ public:
                   Type type, Buffer *buffer, std::size_t offset,
                   PixelUnpackParameters const &params);
 
+    /// Uploads pixels whose memory is long enough for them. Pixel storage is as it was afterwards,
+    /// also after a failure.
+    /// @throws InternalException for pixels of more sides than the texture's, also as above
+    /// @note glTexSubImage2D, with glPixelStorei and what saves its state around it
+    void subImage(int level, int x, int y, PixelView const &pixels);
+
     /// Uploads compressed blocks.
     /// @param level, x, y, width, height as `subImage`; x and y at multiples of a block's 4 texels
     /// @param data `bytes` bytes, or an offset into the pixel unpack buffer while one is bound
@@ -57,9 +68,8 @@ public:
 
     /// Reads the compressed blocks of a level.
     /// @param dst, bytes memory, of `compressedSize(level)` bytes
-    /// @throws InternalException when the texture is not bound, for a format that is not
-    /// compressed,
-    ///         and for another number of bytes
+    /// @throws InternalException when the texture is not bound, for a format that is
+    ///         not compressed, and for another number of bytes
     /// @note glGetCompressedTexImage; needs OpenGL 1.3
     void getCompressedData(void *dst, std::size_t bytes, int level) const;
 
@@ -84,6 +94,14 @@ public:
     void getPixelData(Buffer *buffer, std::size_t offset, int level, Format format, Type type,
                       unsigned int alignment) const;
 
+    /// Reads a level into memory that is long enough for it. Pixel storage is as it was afterwards,
+    /// also after a failure.
+    /// @param pixels as many as the level has texels
+    /// @throws InternalException when the texture is not bound, and for pixels of other sides than
+    ///         the level's
+    /// @note glGetTexImage, with glPixelStorei and what saves its state around it
+    void getPixelData(MutablePixelView const &pixels, int level) const;
+
     /// Bytes that level 0 takes in memory when its rows have no gaps, whatever the level.
     /// @throws InternalException for types other than bytes, shorts, half floats and floats
     std::size_t pixelDataSize(int level, Format format, Type type) const;
@@ -103,6 +121,14 @@ protected:
     Texture2(Target target, TargetBinding binding, unsigned int name, ownership_tag ownership);
 
 private:
+    friend class PixelReadStream;
+    friend class PixelUploadStream;
+
+    /// Transfers without a word about memory.
+    /// @param pixels an address, or an offset into the buffer that is bound for such transfers
+    void upload(int level, int x, int y, PixelShape const &shape, void const *pixels);
+    void readLevel(int level, PixelShape const &shape, void *pixels) const;
+
     void checkPart(char const *operation, int level, std::uint64_t width,
                    std::uint64_t height) const;
     void allocate(bool mipmapped, Type type);

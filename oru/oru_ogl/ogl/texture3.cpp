@@ -6,6 +6,7 @@
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
+#include "oru/oru_ogl/ogl/internal/textures/viewtransfer.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {
@@ -115,6 +116,17 @@ void Texture3::subImage(int level, int x, int y, int z, std::uint64_t width, std
     imageChanged(level);
 }
 
+void Texture3::subImage(int level, int x, int y, int z, PixelView const &pixels) {
+    upload(level, x, y, z, pixels.shape(), pixels.data());
+}
+
+void Texture3::upload(int level, int x, int y, int z, PixelShape const &shape, void const *pixels) {
+    checkPart(level, shape.width, shape.height, shape.depth);
+    auto const sides = internal::ToSides(shape.width, shape.height, shape.depth);
+    internal::Upload(Send, Part{target(), level, {x, y, z}, sides}, shape, pixels);
+    imageChanged(level);
+}
+
 void Texture3::compressedSubImage(int level, int x, int y, int z, std::uint64_t width,
                                   std::uint64_t height, std::uint64_t depth, void const *data,
                                   std::size_t bytes) {
@@ -165,6 +177,16 @@ void Texture3::getPixelData(Buffer *buffer, int offset, int level, Format format
             ORU_GL(GetTexImage, target(), level, layout.format, layout.type, pixels);
         });
     });
+}
+
+void Texture3::getPixelData(MutablePixelView const &pixels, int level) const {
+    readLevel(level, pixels.shape(), pixels.data());
+}
+
+void Texture3::readLevel(int level, PixelShape const &shape, void *pixels) const {
+    auto const halvings = static_cast<unsigned>(level);
+    internal::CheckLevel(*this, shape, level, width(halvings), height(halvings), depth(halvings));
+    internal::ReadLevel(target(), level, shape, pixels);
 }
 
 std::size_t Texture3::pixelDataSize(int /*level*/, Format format, Type type) const {

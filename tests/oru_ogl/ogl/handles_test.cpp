@@ -7,12 +7,14 @@
 #include "oru/oru_ogl/ogl/fence.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/programogl.h"
+#include "oru/oru_ogl/ogl/programpipeline.h"
 #include "oru/oru_ogl/ogl/query.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/sampler.h"
 #include "oru/oru_ogl/ogl/shader.h"
 #include "oru/oru_ogl/ogl/texture2dmultisample.h"
 #include "oru/oru_ogl/ogl/texturecube.h"
+#include "oru/oru_ogl/ogl/transformfeedback.h"
 #include "oru/oru_ogl/ogl/vertexarray.h"
 
 #include <functional>
@@ -202,6 +204,37 @@ struct Handling<Program> {
         [](Program &p) { p.enable(); }, [](Program &p) { p.programID(); }};
 };
 
+template<>
+struct Handling<ProgramPipeline> {
+    static ProgramPipeline Make() {
+        ProgramPipeline pipeline;
+        pipeline.bind(); // until then its name stands for none yet
+        ProgramPipeline::BindDefault();
+        return pipeline;
+    }
+    static bool Lives(unsigned int name) { return ORU_GL(IsProgramPipeline, name); }
+    static std::string Tell(ProgramPipeline const &p) { return TextOf(p.infoLog()); }
+    static inline std::function<void(ProgramPipeline &)> const kUses[] = {
+        [](ProgramPipeline &p) { p.bind(); }, [](ProgramPipeline &p) { p.validate(); },
+        [](ProgramPipeline &p) { p.useStages(ProgramPipeline::STAGE_ALL, Program()); },
+        [](ProgramPipeline &p) { p.clearStages(ProgramPipeline::STAGE_ALL); }};
+};
+
+template<>
+struct Handling<TransformFeedback> {
+    static TransformFeedback Make() {
+        TransformFeedback feedback;
+        feedback.bind();
+        TransformFeedback::BindDefault();
+        return feedback;
+    }
+    static bool Lives(unsigned int name) { return ORU_GL(IsTransformFeedback, name); }
+    static std::string Tell(TransformFeedback const &f) { return TextOf(f.target()); }
+    static inline std::function<void(TransformFeedback &)> const kUses[] = {
+        [](TransformFeedback &f) { f.bind(); }, [](TransformFeedback &f) { f.draw(GL_POINTS); },
+        [](TransformFeedback &f) { f.setBuffer(0, Handling<Buffer>::Make()); }};
+};
+
 template<class Object>
 class Handles : public ObjectTest {
 protected:
@@ -222,7 +255,8 @@ protected:
 using Kinds =
     testing::Types<Texture1D, Texture2D, TextureRECT, Texture1DArray, Texture3D, Texture2DArray,
                    TextureCube, TextureCubeArray, BufferTexture, Texture2DMultisample, Sampler,
-                   Buffer, Fence, Framebuffer, Query, Renderbuffer, Shader, Program, VertexArray>;
+                   Buffer, Fence, Framebuffer, Query, Renderbuffer, Shader, Program, ProgramPipeline,
+                   TransformFeedback, VertexArray>;
 
 } // namespace
 

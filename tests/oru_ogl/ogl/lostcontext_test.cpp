@@ -9,15 +9,21 @@
 #include "oru/oru_ogl/ogl/linescope.h"
 #include "oru/oru_ogl/ogl/mappedrange.h"
 #include "oru/oru_ogl/ogl/oruopengl.h"
+#include "oru/oru_ogl/ogl/pixelreadstream.h"
+#include "oru/oru_ogl/ogl/pixeluploadstream.h"
 #include "oru/oru_ogl/ogl/programenabledscope.h"
 #include "oru/oru_ogl/ogl/programogl.h"
+#include "oru/oru_ogl/ogl/programpipeline.h"
 #include "oru/oru_ogl/ogl/query.h"
 #include "oru/oru_ogl/ogl/queryscope.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/sampler.h"
 #include "oru/oru_ogl/ogl/samplerbindscope.h"
 #include "oru/oru_ogl/ogl/shader.h"
+#include "oru/oru_ogl/ogl/statescope.h"
 #include "oru/oru_ogl/ogl/texturebindscope.h"
+#include "oru/oru_ogl/ogl/transformfeedback.h"
+#include "oru/oru_ogl/ogl/transformfeedbackscope.h"
 #include "oru/oru_ogl/ogl/vertexarray.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 
@@ -50,6 +56,12 @@ struct Everything {
     std::optional<TemporaryLineStippleScope> stipple;
     Texture2DBindScope bound{&texture, 0, true};
     ProgramEnabledScope enabled;
+    TemporaryDepthScope depth{{1, 0, GL_ALWAYS}};
+    ProgramPipeline pipeline;
+    PixelUploadStream uploads{PixelShape(), 2};
+    PixelReadStream reads{PixelShape(), 2};
+    TransformFeedback feedback;
+    std::optional<TransformFeedbackScope> capture;
 
     Everything() {
         if (!IsCoreRun())
@@ -60,9 +72,14 @@ struct Everything {
         conditional.emplace(samples, ConditionalRenderScope::MODE_NO_WAIT);
         char const *const source = "void main() { gl_Position = vec4(0); }";
         program.loadVertexShader(1, &source, nullptr);
+        program.setFeedbackVaryings({"gl_Position"}, Program::FEEDBACKMODE_INTERLEAVED);
         program.link(true);
         enabled.enable(&program);
         EXPECT_NE("", MessageOf([&] { vertices.setupWithProgram(&program); })) << "but has names";
+        uploads.begin();
+        reads.read(0, 0);
+        feedback.setBuffer(0, buffer);
+        capture.emplace(feedback, GL_POINTS);
     }
 };
 

@@ -1,0 +1,61 @@
+// Transfers of pixels that know how much memory they have.
+#pragma once
+
+#include "oru/oru_ogl/ogl/internal/objects/ending.h"
+#include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
+#include "oru/oru_ogl/ogl/pixelview.h"
+
+namespace ORU::OGL::internal {
+
+/// @throws InternalException for pixels of more sides than a texture has
+void CheckSides(PixelShape const &pixels, std::size_t sides);
+
+/// Checks pixels that receive a whole level of a texture.
+/// @param width, height, depth texels of the level, 0 standing for 1
+/// @throws InternalException unless the pixels have the level's sides; also for a texture that is
+///         not bound and for a negative level
+void CheckLevel(Texture const &texture, PixelShape const &pixels, int level, std::uint64_t width,
+                std::uint64_t height, std::uint64_t depth);
+
+/// Runs a read-back into rows and images that lie as the shape says, and puts the state back, also
+/// after a failure.
+template<class Read>
+void WithPackState(PixelShape const &pixels, Read read) {
+    PixelStorageScope saved(kPackStorage);
+    Ending restore([&saved] { saved.restore(); });
+    auto const set = [](GLenum parameter, std::uint64_t value) {
+        ORU_GL(PixelStorei, parameter, static_cast<GLint>(value));
+    };
+    set(GL_PACK_SWAP_BYTES, 0);
+    set(GL_PACK_LSB_FIRST, 0);
+    set(GL_PACK_ROW_LENGTH, pixels.rowLength);
+    set(GL_PACK_SKIP_PIXELS, 0);
+    set(GL_PACK_SKIP_ROWS, 0);
+    if (pixels.depth > 1) {
+        set(GL_PACK_IMAGE_HEIGHT, pixels.imageHeight);
+        set(GL_PACK_SKIP_IMAGES, 0);
+    }
+    set(GL_PACK_ALIGNMENT, pixels.alignment);
+    read();
+    restore.now();
+}
+
+/// Uploads pixels, and puts the state back, also after a failure. `CheckPart` comes before it.
+/// @param pixels an address, or an offset into the pixel unpack buffer
+template<std::size_t Sides>
+void Upload(SendPart<Sides> send, Part<Sides> const &part, PixelShape const &shape,
+            void const *pixels) {
+    CheckSides(shape, Sides);
+    PixelLayout const layout = LayoutOf(shape.format, shape.type);
+    PixelStorageScope saved(kUnpackStorage);
+    Ending restore([&saved] { saved.restore(); });
+    shape.unpackParameters().apply();
+    send(part, layout.format, layout.type, pixels);
+    restore.now();
+}
+
+/// Reads a level of the texture bound to a target, which `CheckLevel` has seen.
+/// @param pixels an address, or an offset into the pixel pack buffer
+void ReadLevel(GLenum target, int level, PixelShape const &shape, void *pixels);
+
+} // namespace ORU::OGL::internal
