@@ -12,6 +12,7 @@
 namespace ORU::OGL {
 
 class Buffer;
+class MutablePixelView;
 class Renderbuffer;
 class Texture2;
 class Texture2DArray;
@@ -250,6 +251,11 @@ public:
     static void Read(Framebuffer const *framebuffer, IntegerRect const &part,
                      Texture::Format format, Texture::Type type, Buffer *buffer, std::size_t offset,
                      unsigned int alignment);
+
+    /// Reads the rectangle that begins at (x, y) and has the pixels' sides, into memory that is
+    /// long enough for it. Pixel storage is as it was afterwards, also after a failure.
+    /// @throws InternalException also for pixels of three sides
+    static void Read(Framebuffer const *framebuffer, int x, int y, MutablePixelView const &pixels);
 
     /// Whether the framebuffer is complete, so that it can be drawn into.
     /// @param status receives the GL status, unless null

@@ -8,6 +8,7 @@
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
+#include "oru/oru_ogl/ogl/internal/textures/viewtransfer.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <array>
@@ -311,6 +312,20 @@ void Framebuffer::Read(Framebuffer const *framebuffer, IntegerRect const &part,
             ORU_GL(ReadPixels, edges.x0, edges.y0, edges.width, edges.height, layout.format,
                    layout.type, pixels);
         });
+    });
+    bound.restore();
+}
+
+void Framebuffer::Read(Framebuffer const *framebuffer, int x, int y,
+                       MutablePixelView const &pixels) {
+    PixelShape const &shape = pixels.shape();
+    internal::CheckSides(shape, 2);
+    Edges const edges(IntegerRect({x, y}, {shape.width, shape.height}));
+    internal::PixelLayout const layout = internal::LayoutOf(shape.format, shape.type);
+    TargetScope bound(GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING, framebuffer);
+    internal::WithPackState(shape, [&] {
+        ORU_GL(ReadPixels, edges.x0, edges.y0, edges.width, edges.height, layout.format,
+               layout.type, pixels.data());
     });
     bound.restore();
 }

@@ -31,7 +31,7 @@ void PixelReadStream::ask(Read read) {
                     !isFull());
     internal::Frame &frame = ring()[first_ + count_];
     internal::ReadInto(frame.buffer, 0, read);
-    frame.fence.set();
+    frame.fence.emplace();
     ++count_;
 }
 
@@ -64,7 +64,7 @@ bool PixelReadStream::isFull() const {
 }
 
 bool PixelReadStream::isReady() const {
-    return count_ > 0 && ring()[first_].fence.isDone(0);
+    return count_ > 0 && ring()[first_].isFree();
 }
 
 PixelView PixelReadStream::begin() {

@@ -26,14 +26,14 @@ internal::PixelRing &PixelUploadStream::ring() const {
 }
 
 bool PixelUploadStream::isFree() const {
-    return ring()[next_].fence.isDone(0);
+    return ring()[next_].isFree();
 }
 
 MutablePixelView PixelUploadStream::begin() {
     internal::Frame &frame = ring()[next_];
     GLbitfield access = GL_MAP_WRITE_BIT | GL_MAP_INVALIDATE_BUFFER_BIT;
     // A fence tells that OpenGL does not read the buffer any more: it need not look for itself.
-    if (frame.fence.isSet())
+    if (frame.fence)
         access |= GL_MAP_UNSYNCHRONIZED_BIT;
     return ring().map(frame, access);
 }
@@ -46,7 +46,7 @@ void PixelUploadStream::send(AnyTexture &texture, int level, Place... place) {
     ring().unmap(frame);
     internal::Ending mark([&] {
         ++next_;
-        frame.fence.set();
+        frame.fence.emplace();
     });
     internal::BoundObjectScope bound(frame.buffer, ORU_BINDER(BindBuffer));
     texture.upload(level, place..., ring().shape(), nullptr);

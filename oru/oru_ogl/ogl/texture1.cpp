@@ -78,8 +78,8 @@ void Texture1::subImage(int level, int x, PixelView const &pixels) {
 
 void Texture1::upload(int level, int x, PixelShape const &shape, void const *pixels) {
     checkPart("subimage", level, shape.width);
-    internal::Upload(Send, Part{target(), level, {x}, internal::ToSides(shape.width)}, shape,
-                     pixels);
+    internal::Upload(Send, Part{target(), level, {x}, internal::ToSides(shape.width)}, format(),
+                     shape, pixels);
     imageChanged(level);
 }
 

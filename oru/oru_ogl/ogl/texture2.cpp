@@ -118,7 +118,7 @@ void Texture2::upload(int level, int x, int y, PixelShape const &shape, void con
     checkPart("subimage", level, shape.width, shape.height);
     internal::Upload(Send,
                      Part{target(), level, {x, y}, internal::ToSides(shape.width, shape.height)},
-                     shape, pixels);
+                     format(), shape, pixels);
     imageChanged(level);
 }
 

@@ -123,7 +123,7 @@ void Texture3::subImage(int level, int x, int y, int z, PixelView const &pixels)
 void Texture3::upload(int level, int x, int y, int z, PixelShape const &shape, void const *pixels) {
     checkPart(level, shape.width, shape.height, shape.depth);
     auto const sides = internal::ToSides(shape.width, shape.height, shape.depth);
-    internal::Upload(Send, Part{target(), level, {x, y, z}, sides}, shape, pixels);
+    internal::Upload(Send, Part{target(), level, {x, y, z}, sides}, format(), shape, pixels);
     imageChanged(level);
 }
 

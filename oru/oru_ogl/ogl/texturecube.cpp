@@ -7,6 +7,7 @@
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
+#include "oru/oru_ogl/ogl/internal/textures/viewtransfer.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <iterator>
@@ -105,6 +106,15 @@ void TextureCube::subImage(Face face, int level, int x, int y, std::uint64_t wid
     imageChanged(level);
 }
 
+void TextureCube::subImage(Face face, int level, int x, int y, PixelView const &pixels) {
+    PixelShape const &shape = pixels.shape();
+    checkPart("subimage", level, shape.width, shape.height);
+    auto const sides = internal::ToSides(shape.width, shape.height);
+    internal::Upload(Send, Part{Face2GL(face), level, {x, y}, sides}, format(), shape,
+                     pixels.data());
+    imageChanged(level);
+}
+
 void TextureCube::compressedSubImage(Face face, int level, int x, int y, std::uint64_t width,
                                      std::uint64_t height, void const *data, std::size_t bytes) {
     checkPart("subimage", level, width, height);
@@ -147,6 +157,12 @@ void TextureCube::getPixelData(Face face, Buffer *buffer, std::size_t offset, in
             ORU_GL(GetTexImage, image, level, layout.format, layout.type, pixels);
         });
     });
+}
+
+void TextureCube::getPixelData(Face face, MutablePixelView const &pixels, int level) const {
+    std::uint64_t const side = width(static_cast<unsigned int>(level));
+    internal::CheckLevel(*this, pixels.shape(), level, side, side, 1);
+    internal::ReadLevel(Face2GL(face), level, pixels.shape(), pixels.data());
 }
 
 void TextureCube::getCompressedData(Face face, void *dst, std::size_t bytes, int level) const {

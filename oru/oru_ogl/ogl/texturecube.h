@@ -6,6 +6,8 @@
 namespace ORU::OGL {
 
 class Buffer;
+class MutablePixelView;
+class PixelView;
 
 /// GL_TEXTURE_CUBE_MAP: six square images, sampled by a direction. The transfers act on the texture
 /// bound to the target.
@@ -14,8 +16,7 @@ class Buffer;
 /// TextureCube sky(Texture::INTERNALFORMAT_SRGB8_ALPHA8, 256, true);
 /// TextureUnit::Unit(0)->bind(&sky);
 /// for (TextureCube::Face face : kCubeFaces)
-///     sky.subImage(face, 0, 0, 0, 256, 256, Texture::FORMAT_RGBA, Texture::TYPE_UNSIGNED_BYTE,
-///                  pixels[face], PixelUnpackParameters());
+///     sky.subImage(face, 0, 0, 0, pixels[face]);
 /// sky.generateMipmap();
 /// ```
 class ORU_API TextureCube : public Texture {
@@ -67,6 +68,12 @@ public:
                   Format format, Type type, Buffer *buffer, std::size_t offset,
                   PixelUnpackParameters const &params);
 
+    /// Uploads pixels whose memory is long enough for them. Pixel storage is as it was afterwards,
+    /// also after a failure.
+    /// @throws InternalException for pixels of more than two sides, also as above
+    /// @note glTexSubImage2D, with glPixelStorei and what saves its state around it
+    void subImage(Face face, int level, int x, int y, PixelView const &pixels);
+
     /// Uploads compressed blocks of a face, as Texture2::compressedSubImage.
     /// @note glCompressedTexSubImage2D
     void compressedSubImage(Face face, int level, int x, int y, std::uint64_t width,
@@ -88,6 +95,13 @@ public:
     /// @param offset bytes from the buffer's beginning
     void getPixelData(Face face, Buffer *buffer, std::size_t offset, int level, Format format,
                       Type type, unsigned int alignment) const;
+
+    /// Reads a level of a face into memory that is long enough for it. Pixel storage is as it was
+    /// afterwards, also after a failure.
+    /// @throws InternalException when the texture is not bound, and for pixels of other sides than
+    ///         the level's
+    /// @note glGetTexImage, with glPixelStorei and what saves its state around it
+    void getPixelData(Face face, MutablePixelView const &pixels, int level) const;
 
     /// Reads the compressed blocks of a level of a face.
     /// @param dst, bytes memory, of a sixth of `compressedSize(level)` bytes

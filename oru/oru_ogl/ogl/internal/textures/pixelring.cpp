@@ -5,40 +5,15 @@
 #include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
-#include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
-
-#include <utility>
 
 namespace ORU::OGL::internal {
 
-FrameFence::FrameFence(FrameFence &&other) noexcept : sync_(std::exchange(other.sync_, nullptr)) {}
+namespace {
 
-void FrameFence::drop() noexcept {
-    if (sync_)
-        Release([this] { ORU_GL(DeleteSync, sync_); });
-    sync_ = nullptr;
-}
+constexpr std::chrono::seconds kHalfAMinute(30);
 
-void FrameFence::set() {
-    drop();
-    sync_ = ORU_GL(FenceSync, GL_SYNC_GPU_COMMANDS_COMPLETE, 0u);
-}
-
-bool FrameFence::isDone(GLuint64 nanoseconds) const {
-    if (!sync_)
-        return true;
-    GLenum const outcome = ORU_GL(ClientWaitSync, sync_, GL_SYNC_FLUSH_COMMANDS_BIT, nanoseconds);
-    return outcome != GL_TIMEOUT_EXPIRED;
-}
-
-void FrameFence::wait() {
-    constexpr GLuint64 kHalfAMinute = 30'000'000'000;
-    ORU_ASSERT_TEXT("OpenGL is not done with a frame of a stream after half a minute: the device "
-                    "hangs, or the context is lost",
-                    isDone(kHalfAMinute));
-    drop();
-}
+} // namespace
 
 PixelRing::PixelRing(PixelShape const &shape, unsigned int frames, Buffer::Type type,
                      Buffer::Usage usage)
@@ -57,7 +32,10 @@ PixelRing::PixelRing(PixelShape const &shape, unsigned int frames, Buffer::Type 
 MutablePixelView PixelRing::map(Frame &frame, GLbitfield access) {
     auto const bytes = static_cast<std::size_t>(frame.buffer.size());
     if (!frame.memory) {
-        frame.fence.wait();
+        ORU_ASSERT_TEXT("OpenGL is not done with a frame of a stream after half a minute: the "
+                        "device hangs, or the context is lost",
+                        !frame.fence || frame.fence->clientWait(kHalfAMinute));
+        frame.fence.reset();
         BoundObjectScope bound(frame.buffer, ORU_BINDER(BindBuffer));
         frame.memory = ORU_GL(MapBufferRange, frame.buffer.target(), 0,
                               static_cast<GLsizeiptr>(bytes), access);

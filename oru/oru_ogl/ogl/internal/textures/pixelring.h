@@ -2,45 +2,24 @@
 #pragma once
 
 #include "oru/oru_ogl/ogl/bufferogl.h"
+#include "oru/oru_ogl/ogl/fence.h"
 #include "oru/oru_ogl/ogl/pixelview.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <chrono>
+#include <optional>
 #include <vector>
 
 namespace ORU::OGL::internal {
 
-/// A mark behind what OpenGL does with a frame.
-class FrameFence {
-public:
-    FrameFence() = default;
-    FrameFence(FrameFence &&other) noexcept;
-    FrameFence &operator=(FrameFence &&) = delete;
-    ~FrameFence() { drop(); }
-
-    bool isSet() const { return sync_ != nullptr; }
-
-    /// Marks what was asked of OpenGL so far. @note glFenceSync
-    void set();
-
-    /// Whether all before the mark is done, or there is none; waits for no more than some
-    /// nanoseconds. What was asked is sent on its way first. @note glClientWaitSync
-    bool isDone(GLuint64 nanoseconds) const;
-
-    /// Waits until then, and drops the mark.
-    /// @throws InternalException after half a minute
-    void wait();
-
-private:
-    void drop() noexcept;
-
-    GLsync sync_ = nullptr;
-};
-
 /// One of the buffers.
 struct Frame {
     Buffer buffer;
-    FrameFence fence;
-    void *memory = nullptr; ///< while it is mapped
+    std::optional<Fence> fence; ///< behind what OpenGL does with the buffer
+    void *memory = nullptr;     ///< while it is mapped
+
+    /// Whether OpenGL is done with the buffer; what it was asked for is sent on its way first.
+    bool isFree() const { return !fence || fence->clientWait(std::chrono::nanoseconds(0)); }
 };
 
 /// Buffers for images of one shape. All of them are made at the beginning: nothing is allocated

@@ -20,6 +20,7 @@ void CheckLevel(Texture const &texture, PixelShape const &pixels, int level, std
         ORU_THROW_INTERNAL("Texture must be bound");
     if (level < 0)
         ORU_THROW_INTERNAL("a negative texture image mip-map level supplied");
+    RequireSameKind(texture.format(), pixels.format);
     std::uint64_t const one = 1;
     width = std::max(width, one);
     height = std::max(height, one);
@@ -31,10 +32,10 @@ void CheckLevel(Texture const &texture, PixelShape const &pixels, int level, std
                                        pixels.width, " x ", pixels.height, " x ", pixels.depth));
 }
 
-void ReadLevel(GLenum target, int level, PixelShape const &shape, void *pixels) {
+void ReadLevel(GLenum image, int level, PixelShape const &shape, void *pixels) {
     PixelLayout const layout = LayoutOf(shape.format, shape.type);
     WithPackState(shape,
-                  [&] { ORU_GL(GetTexImage, target, level, layout.format, layout.type, pixels); });
+                  [&] { ORU_GL(GetTexImage, image, level, layout.format, layout.type, pixels); });
 }
 
 } // namespace ORU::OGL::internal

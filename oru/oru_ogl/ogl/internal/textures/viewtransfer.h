@@ -12,8 +12,8 @@ void CheckSides(PixelShape const &pixels, std::size_t sides);
 
 /// Checks pixels that receive a whole level of a texture.
 /// @param width, height, depth texels of the level, 0 standing for 1
-/// @throws InternalException unless the pixels have the level's sides; also for a texture that is
-///         not bound and for a negative level
+/// @throws InternalException unless the pixels have the level's sides and kind; also for a texture
+///         that is not bound and for a negative level
 void CheckLevel(Texture const &texture, PixelShape const &pixels, int level, std::uint64_t width,
                 std::uint64_t height, std::uint64_t depth);
 
@@ -41,11 +41,13 @@ void WithPackState(PixelShape const &pixels, Read read) {
 }
 
 /// Uploads pixels, and puts the state back, also after a failure. `CheckPart` comes before it.
+/// @param format of the texture
 /// @param pixels an address, or an offset into the pixel unpack buffer
 template<std::size_t Sides>
-void Upload(SendPart<Sides> send, Part<Sides> const &part, PixelShape const &shape,
-            void const *pixels) {
+void Upload(SendPart<Sides> send, Part<Sides> const &part, Texture::InternalFormat format,
+            PixelShape const &shape, void const *pixels) {
     CheckSides(shape, Sides);
+    RequireSameKind(format, shape.format);
     PixelLayout const layout = LayoutOf(shape.format, shape.type);
     PixelStorageScope saved(kUnpackStorage);
     Ending restore([&saved] { saved.restore(); });
@@ -55,7 +57,8 @@ void Upload(SendPart<Sides> send, Part<Sides> const &part, PixelShape const &sha
 }
 
 /// Reads a level of the texture bound to a target, which `CheckLevel` has seen.
+/// @param image the target, or the face of a cube map
 /// @param pixels an address, or an offset into the pixel pack buffer
-void ReadLevel(GLenum target, int level, PixelShape const &shape, void *pixels);
+void ReadLevel(GLenum image, int level, PixelShape const &shape, void *pixels);
 
 } // namespace ORU::OGL::internal
