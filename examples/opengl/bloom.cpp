@@ -76,7 +76,7 @@ public:
     /// Draws the whole viewport.
     void draw() { draw(kCorners, 4); }
 
-    void draw(float const *corners, std::size_t count) {
+    void draw(float const *corners, unsigned int count) {
         VertexBuffer figure({{"corner", VertexBuffer::ATTRIBUTETYPE_FLOAT2,
                               VertexBuffer::EXPECTEDUSAGE_STREAM_DRAW}},
                             count, VertexBuffer::PRIMITIVETYPE_TRIANGLE_STRIP);

@@ -12,6 +12,7 @@
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/internal/textures/laterformats.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturetables.h"
+#include "oru/oru_ogl/ogl/pixelview.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <algorithm>
@@ -282,11 +283,8 @@ std::size_t Texture::SizeInBytes(InternalFormat format, std::uint64_t width, std
 
 std::size_t Texture::BytesPerPixel(Format format, Type type) {
     std::size_t const channels = Channels(format);
-    if (auto const *const packed = internal::kLaterTypes.find(type))
-        return packed->bytes;
-    if (internal::kLaterPixelFormats.find(format) &&
-        (type == TYPE_INT || type == TYPE_UNSIGNED_INT))
-        return channels * sizeof(GLint);
+    if (internal::kLaterTypes.find(type) || internal::kLaterPixelFormats.find(format))
+        return static_cast<std::size_t>(PixelShape{format, type}.bytesPerPixel());
     auto const *const row = internal::kTypes.find(type);
     if (!row || row->bytes == 0)
         ORU_THROW_INTERNAL(ComposeText("pixelDataSize: Unknown type ",

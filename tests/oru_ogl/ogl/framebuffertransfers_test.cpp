@@ -6,6 +6,7 @@
 #include "oru/core/utility/composetext.h"
 #include "oru/oru_ogl/ogl/buffertexture.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
+#include "oru/oru_ogl/ogl/pixelview.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/sampler.h"
 #include "oru/oru_ogl/ogl/samplerbindscope.h"
@@ -156,6 +157,14 @@ TEST_F(FramebufferTransfersTest, RectanglesAreClearedReadAndCopied) {
     EXPECT_EQ(expected.texels, ReadAll(&source, 8, 6));
     Buffer buffer(8 * 6 * 4 + 4, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STREAM_READ, nullptr);
     F::Read(&source, Rect(0, 0, 8, 6), kBytes.format, kBytes.type, &buffer, 4, 1);
+    PixelShape shape = {kBytes.format, kBytes.type, 3, 4};
+    shape.rowLength = 8;
+    Bytes view({8, 6, 1}, 4), blue({8, 6, 1}, 4);
+    std::size_t const first = view.index(2, 1, 0);
+    F::Read(&source, 2, 1,
+            MutablePixelView(&view.texels[first], view.texels.size() - first, shape));
+    blue.paste(Plain({3, 4, 1}, kBlue), {{2, 1, 0}, {3, 4, 1}});
+    EXPECT_EQ(blue.texels, view.texels);
     EXPECT_EQ(before, State());
     std::vector<unsigned char> back(8 * 6 * 4);
     buffer.bind();
@@ -283,11 +292,13 @@ TEST_F(FramebufferTransfersTest, FailingCallsLeaveNothingBehind) {
     unsigned int const names[] = {sampler.objectID(), cube.objectID()};
     IntegerRect const part = Rect(1, 1, 2, 2);
     std::vector<unsigned char> pixels(64);
+    MutablePixelView const view(pixels.data(), pixels.size(), {kBytes.format, kBytes.type, 4, 4});
     std::function<void()> const operations[] = {
         [&] { F::ClearColor(&framebuffer, 0, kRed.data(), &part); },
         [&] { F::Blit(&framebuffer, part, nullptr, part, F::CONTENTS_COLOR, T::FILTER_NEAREST); },
         [&] { F::Read(&framebuffer, part, kBytes.format, kBytes.type, pixels.data(), 1); },
         [&] { F::Read(&framebuffer, part, kBytes.format, kBytes.type, &buffer, 0, 1); },
+        [&] { F::Read(&framebuffer, 0, 0, view); },
         [&] { TextureCube(kRGBA8, 4, true); },
         [&] { TextureCube(names[1], borrow_name_tag()); },
         [&] { TextureCubeArray(kRGBA8, 4, 2, true); },

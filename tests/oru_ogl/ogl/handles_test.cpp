@@ -255,8 +255,8 @@ protected:
 using Kinds =
     testing::Types<Texture1D, Texture2D, TextureRECT, Texture1DArray, Texture3D, Texture2DArray,
                    TextureCube, TextureCubeArray, BufferTexture, Texture2DMultisample, Sampler,
-                   Buffer, Fence, Framebuffer, Query, Renderbuffer, Shader, Program, ProgramPipeline,
-                   TransformFeedback, VertexArray>;
+                   Buffer, Fence, Framebuffer, Query, Renderbuffer, Shader, Program,
+                   ProgramPipeline, TransformFeedback, VertexArray>;
 
 } // namespace
 

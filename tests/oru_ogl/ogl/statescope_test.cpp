@@ -2,6 +2,8 @@
 // calls a difference takes, and what is left after failures.
 #include "tests/support/objecttest.h"
 
+#include "oru/oru_ogl/ogl/framebuffer.h"
+#include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/statescope.h"
 
 #include <cstring>
@@ -26,7 +28,7 @@ class StateScopeTest : public ObjectTest {
 protected:
     /// Changes each value of a state by itself, from `one` to `other` and back.
     /// @param names of the queries that tell the values, four of one query once
-    /// @param calls that each value takes
+    /// @param calls that each value takes; back from `other` switches take the opposite
     template<class State>
     void expectEach(State const &one, State const &other, std::vector<GLenum> const &names,
                     std::vector<std::string> const &calls) {
@@ -58,7 +60,10 @@ protected:
                 throw std::runtime_error("ends the scope");
             } catch (std::runtime_error const &) {
             }
-            EXPECT_EQ(calls[i], calls_->takeChanges());
+            EXPECT_EQ(calls[i] == "Enable "    ? "Disable "
+                      : calls[i] == "Disable " ? "Enable "
+                                               : calls[i],
+                      calls_->takeChanges());
             EXPECT_EQ(Numbers(one), read());
             {
                 TemporaryStateScope<State> const same([](State &) {});
@@ -86,6 +91,12 @@ TEST_F(StateScopeTest, EachValueComesAndGoesByItself) {
                                {mask, mask, mask, mask});
     StencilFace const zero = {GL_LESS, 1, 0x0F, GL_ZERO, GL_INCR, GL_DECR, 0x33};
     StencilFace const other = {GL_GEQUAL, 2, 0xF0, GL_KEEP, GL_REPLACE, GL_INVERT, 0xCC};
+    Renderbuffer colours(GL_RGBA8, 8, 8), stencils(GL_DEPTH24_STENCIL8, 8, 8);
+    Framebuffer framebuffer; // references are told as what the stencil buffer has bits for
+    framebuffer.bind();
+    framebuffer.attach(&colours, 0);
+    framebuffer.attachRenderbuffer(stencils, Framebuffer::ATTACHMENT_DEPTH_AND_STENCIL);
+    ASSERT_EQ("", framebuffer.incompleteness());
     std::string const function = "StencilFuncSeparate ", operation = "StencilOpSeparate ",
                       writes = "StencilMaskSeparate ";
     expectEach<StencilState>(
