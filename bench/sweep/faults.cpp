@@ -79,10 +79,6 @@ void CountNames(std::string const &name, std::uintptr_t const *arguments) {
         ++gHoldings.names;
     } else if (name == "glDeleteShader" || name == "glDeleteProgram" || name == "glDeleteSync") {
         gHoldings.names -= arguments[0] != 0;
-    } else if (name == "glFenceSync") {
-        ++gHoldings.names;
-    } else if (name == "glDeleteSync") {
-        gHoldings.names -= arguments[0] != 0;
     } else if (Begins(name, "wglCreateContext")) {
         ++gHoldings.contexts;
     } else if (name == "wglDeleteContext") {

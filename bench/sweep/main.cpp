@@ -10,7 +10,9 @@
 #include "bench/sweep/scenarios.h"
 
 #include "oru/core/exceptions/logicalexception.h"
+#include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ocl/ocllibrary.h"
+#include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -152,7 +154,8 @@ private:
         }
         if (outcome.how != (kind_ == Kind::Call ? Outcome::OfTheLibrary : Outcome::OutOfMemory))
             finding("another exception");
-        else if (name.rfind("gl", 0) == 0 && !std::strstr(outcome.text, "GL_OUT_OF_MEMORY"))
+        else if (name.rfind("gl", 0) == 0 && !mayGoUnnoticed(name) &&
+                 !std::strstr(outcome.text, "GL_OUT_OF_MEMORY"))
             finding("the exception does not tell the error");
     }
 
@@ -177,11 +180,20 @@ private:
         }
         Disarm();
         std::fflush(stderr);
-        if (outcome.how != Outcome::Nothing && context_) {
-            ::glPopClientAttrib(); // where an upload that failed leaves pixel storage
-            static_cast<void>(::glGetError());
-        }
+        if (failing > 0 && context_)
+            putRight();
         return outcome;
+    }
+
+    /// Ends what a call that failed was to end; where nothing is left, these are errors.
+    static void putRight() {
+        using ORU::DropExceptions;
+        DropExceptions([] { ORU_GL0(PopClientAttrib); }); // where a transfer left pixel storage
+        DropExceptions([] { ORU_GL0(EndConditionalRender); });
+        DropExceptions([] { ORU_GL0(EndTransformFeedback); });
+        // What was bound inside a transfer is part of the storage.
+        DropExceptions([] { ORU_GL(BindBuffer, GL_PIXEL_PACK_BUFFER, 0); });
+        DropExceptions([] { ORU_GL(BindBuffer, GL_PIXEL_UNPACK_BUFFER, 0); });
     }
 
     static void note(Outcome &outcome, Outcome::How how, char const *what, char const *more = "") {

@@ -17,7 +17,6 @@
 #include "oru/oru_ogl/platformgl.h"
 
 #include <cstring>
-#include <stdexcept>
 #include <vector>
 
 namespace sweep {
@@ -61,7 +60,7 @@ void Stages() {
     program.link(true);
     auto const binary = program.saveBinary();
     if (!program.loadBinary(binary.data(), binary.size()))
-        throw std::logic_error("the driver does not take its own binary");
+        program.link(true); // as a host does
     static_cast<void>(program.getFragmentOutputLocation("colour"));
 
     Buffer const buffer(64, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_DYNAMIC_COPY, nullptr);

@@ -15,8 +15,8 @@
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/blendscope.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
-#include "oru/oru_ogl/ogl/conditionalrenderscope.h"
 #include "oru/oru_ogl/ogl/buffertexture.h"
+#include "oru/oru_ogl/ogl/conditionalrenderscope.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
@@ -372,8 +372,10 @@ std::vector<Scenario> const &Scenarios() {
         {"framebuffer-transfers", FramebufferTransfers, Needs::Context, ""},
         {"programs", Programs, Needs::Context, ""},
         {"streams", Streams, Needs::Context, ""},
-        // The end of a capture is a destructor, as are those of state.
-        {"stages", Stages, Needs::Context, "glEndTransformFeedback glBindTransformFeedback"},
+        // The end of a capture is a destructor, as are those of state; a program whose driver is
+        // not known is compiled.
+        {"stages", Stages, Needs::Context,
+         "glEndTransformFeedback glBindTransformFeedback glGetString"},
         // Wrappers do not look at what retaining and releasing lead to.
         {"opencl", OpenCL, Needs::OpenCL, "clRetain clRelease"},
         {"develop", DevelopWithSpots, Needs::Nothing, ""},
