@@ -3,7 +3,13 @@
 
 namespace sweep {
 
+void Queries();
+void VertexArrays();
+void LaterTextures();
+void FramebufferTransfers();
+void FramebufferImages();
 void Streams();
 void Stages();
+void Adopted();
 
 } // namespace sweep

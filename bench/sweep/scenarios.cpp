@@ -15,35 +15,23 @@
 #include "oru/oru_ogl/libraryogl.h"
 #include "oru/oru_ogl/ogl/blendscope.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
-#include "oru/oru_ogl/ogl/buffertexture.h"
-#include "oru/oru_ogl/ogl/conditionalrenderscope.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwindowed_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
-#include "oru/oru_ogl/ogl/fence.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
-#include "oru/oru_ogl/ogl/gputimer.h"
 #include "oru/oru_ogl/ogl/linescope.h"
 #include "oru/oru_ogl/ogl/mappedrange.h"
 #include "oru/oru_ogl/ogl/programenabledscope.h"
 #include "oru/oru_ogl/ogl/programogl.h"
-#include "oru/oru_ogl/ogl/query.h"
-#include "oru/oru_ogl/ogl/queryscope.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
-#include "oru/oru_ogl/ogl/sampler.h"
-#include "oru/oru_ogl/ogl/samplerbindscope.h"
 #include "oru/oru_ogl/ogl/scopedcontextwrapper_win.h"
 #include "oru/oru_ogl/ogl/shader.h"
 #include "oru/oru_ogl/ogl/texture1.h"
 #include "oru/oru_ogl/ogl/texture2.h"
-#include "oru/oru_ogl/ogl/texture2dmultisample.h"
 #include "oru/oru_ogl/ogl/texture3.h"
 #include "oru/oru_ogl/ogl/texturebindscope.h"
-#include "oru/oru_ogl/ogl/texturecube.h"
 #include "oru/oru_ogl/ogl/texturestate.h"
 #include "oru/oru_ogl/ogl/textureunit.h"
-#include "oru/oru_ogl/ogl/uniformblockwriter.h"
-#include "oru/oru_ogl/ogl/vertexarray.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 #include "oru/oru_ogl/platformgl.h"
 #include "tests/support/testwindow.h"
@@ -150,64 +138,6 @@ void Buffers() {
     BeginEnd();
 }
 
-void Queries() {
-    Fence const fence = Fence::ForOtherContexts();
-    static_cast<void>(fence.isSignalled());
-    static_cast<void>(fence.clientWait(std::chrono::seconds(1)));
-    fence.wait();
-    Query samples(Query::TYPE_SAMPLES), stamp(Query::TYPE_TIMESTAMP);
-    samples.begin();
-    samples.end();
-    static_cast<void>(samples.available());
-    static_cast<void>(samples.result());
-    stamp.record();
-    Query const borrowed(samples.objectID(), Query::TYPE_SAMPLES, borrow_name_tag());
-    GpuTimer timer(1);
-    for (int frame = 0; frame < 2; ++frame) {
-        timer.begin();
-        timer.end();
-        ORU_GL0(Finish);
-    }
-    static_cast<void>(timer.take());
-    ConditionalRenderScope const conditional(samples, ConditionalRenderScope::MODE_WAIT);
-    Query time(Query::TYPE_TIME_ELAPSED);
-    QueryScope const timing(time);
-    BeginEnd();
-}
-
-void VertexArrays() {
-    char const *const vertex = "#version 140\nin vec4 place; uniform Look { vec4 shift[2]; };"
-                               "void main() { gl_Position = place + shift[1]; }";
-    Program program;
-    program.loadVertexShader(1, &vertex, nullptr);
-    program.link(true);
-    program.enable();
-    UniformBlock const block(program, "Look");
-    block.setBinding(1);
-    static_cast<void>(block.binding());
-    UniformBlockWriter writer(block);
-    writer.set("shift", {1.f, 2.f, 3.f, 4.f}, 1);
-    Buffer look(block.size(), Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr);
-    writer.upload(look);
-    look.bindBase(GL_UNIFORM_BUFFER, 1);
-    std::array<unsigned int, 8> const numbers = {1, 1, 0, 0, 0, 1, 1, 0};
-    Buffer const buffer(sizeof numbers, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW,
-                        numbers.data());
-    VertexArray array;
-    array.setAttribute(0, buffer, VertexArray::Attribute(4, GL_UNSIGNED_BYTE).normalised());
-    array.setAttribute(1, buffer, VertexArray::Attribute(1, GL_INT).integer().divisor(1));
-    array.disableAttribute(1);
-    array.setIndices(buffer, GL_UNSIGNED_INT);
-    array.drawArrays(GL_POINTS, 0, 1);
-    array.drawElementsInstanced(GL_POINTS, 1, 2);
-    array.drawArraysIndirect(GL_POINTS, buffer);
-    array.bind();
-    array.drawRangeElements(GL_POINTS, 0, 1, 2, 0, 1);
-    VertexArray::BindDefault();
-    program.disable();
-    BeginEnd();
-}
-
 void Framebuffers() {
     Texture2D picture(kRGBA8, 8, 8, false);
     Renderbuffer depth(GL_DEPTH_COMPONENT24, 8, 8);
@@ -227,56 +157,6 @@ void Framebuffers() {
     TemporaryLineSmoothScope const smooth;
     TemporaryLineStippleScope const stipple(1, 1, 0x5555);
     TemporaryLineWidthScope const width(2);
-    BeginEnd();
-}
-
-void LaterTextures() {
-    std::vector<unsigned char> pixels(8 * 8 * 4 * 4);
-    PixelUnpackParameters const plain;
-    TextureCube sky(kRGBA8, 8, true);
-    TextureUnit::Unit(0)->bind(&sky);
-    auto const face = TextureCube::FACE_NEGATIVE_Z;
-    sky.subImage(face, 0, 0, 0, 8, 8, kRGBA, kBytes, pixels.data(), plain);
-    sky.generateMipmap();
-    sky.getPixelData(face, pixels.data(), 0, kRGBA, kBytes, 1);
-    sky.setLevelRange(0, 2);
-    sky.setSwizzle(Texture::SWIZZLE_RED, Texture::SWIZZLE_RED, Texture::SWIZZLE_RED,
-                   Texture::SWIZZLE_ONE);
-    sky.setCompare(Texture::COMPARE_NONE);
-    TextureCubeArray const rooms(kRGBA8, 4, 2, false);
-    Texture2D blocks(Texture::INTERNALFORMAT_COMPRESSED_RED_RGTC1, 8, 8, false);
-    TextureUnit::Unit(0)->bind(&blocks);
-    blocks.compressedSubImage(0, 0, 0, 8, 8, pixels.data(), 32);
-    blocks.getCompressedData(pixels.data(), 32, 0);
-    Buffer buffer(256, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW, nullptr);
-    BufferTexture const row(kRGBA8, buffer);
-    ORU::OGL::Sampler smooth(Texture::FILTER_LINEAR, Texture::FILTER_LINEAR,
-                             Texture::WRAPMODE_REPEAT);
-    SamplerBindScope const scope(smooth, 1);
-    BeginEnd();
-}
-
-void FramebufferTransfers() {
-    ORU::IntegerRect const all({0, 0}, ORU::size2(8, 8));
-    std::array<unsigned char, 256> pixels = {};
-    float const colour[4] = {};
-    Texture2D picture(kRGBA8, 8, 8, false);
-    Texture2DMultisample const samples(kRGBA8, 8, 8, 4);
-    Renderbuffer const depth(GL_DEPTH24_STENCIL8, 8, 8, 4);
-    Framebuffer several;
-    several.bind();
-    several.attachTexture(samples, 0, Framebuffer::ATTACHMENT_COLOR0);
-    several.attachRenderbuffer(depth, Framebuffer::ATTACHMENT_DEPTH_AND_STENCIL);
-    several.setDrawBuffers({Framebuffer::ATTACHMENT_COLOR0});
-    Framebuffer one;
-    one.bind();
-    one.attachTexture(picture, 0, Framebuffer::ATTACHMENT_COLOR0);
-    if (!one.incompleteness().empty())
-        throw std::logic_error("the framebuffer is not complete");
-    Framebuffer::BindDefault();
-    Framebuffer::ClearColor(&several, 0, colour, &all);
-    Framebuffer::Resolve(&several, &one, all.size());
-    Framebuffer::Read(&one, all, kRGBA, kBytes, pixels.data(), 1);
     BeginEnd();
 }
 
@@ -370,12 +250,14 @@ std::vector<Scenario> const &Scenarios() {
         {"framebuffers", Framebuffers, Needs::Context, ""},
         {"later-textures", LaterTextures, Needs::Context, ""},
         {"framebuffer-transfers", FramebufferTransfers, Needs::Context, ""},
+        {"framebuffer-images", FramebufferImages, Needs::Context, ""},
         {"programs", Programs, Needs::Context, ""},
         {"streams", Streams, Needs::Context, ""},
         // The end of a capture is a destructor, as are those of state; a program whose driver is
         // not known is compiled.
         {"stages", Stages, Needs::Context,
          "glEndTransformFeedback glBindTransformFeedback glGetString"},
+        {"adopted", Adopted, Needs::Context, ""},
         // Wrappers do not look at what retaining and releasing lead to.
         {"opencl", OpenCL, Needs::OpenCL, "clRetain clRelease"},
         {"develop", DevelopWithSpots, Needs::Nothing, ""},
