@@ -253,10 +253,8 @@ std::vector<Scenario> const &Scenarios() {
         {"framebuffer-images", FramebufferImages, Needs::Context, ""},
         {"programs", Programs, Needs::Context, ""},
         {"streams", Streams, Needs::Context, ""},
-        // The end of a capture is a destructor, as are those of state; a program whose driver is
-        // not known is compiled.
-        {"stages", Stages, Needs::Context,
-         "glEndTransformFeedback glBindTransformFeedback glGetString"},
+        // The end of a capture is a destructor, as are those of state.
+        {"stages", Stages, Needs::Context, "glEndTransformFeedback glBindTransformFeedback"},
         {"adopted", Adopted, Needs::Context, ""},
         // Wrappers do not look at what retaining and releasing lead to.
         {"opencl", OpenCL, Needs::OpenCL, "clRetain clRelease"},

@@ -156,6 +156,7 @@ void MapRange(benchmark::State &state) {
             void *const data = glMapBufferRange(GL_ARRAY_BUFFER, 0, size, access);
             benchmark::DoNotOptimize(::glGetError());
             std::memcpy(data, bytes.data(), bytes.size());
+            ORU_PLAIN(glBindBuffer(GL_ARRAY_BUFFER, name)); // whatever was bound meanwhile
             ORU_PLAIN(glUnmapBuffer(GL_ARRAY_BUFFER));
             ORU_PLAIN(glBindBuffer(GL_ARRAY_BUFFER, static_cast<GLuint>(previous)));
         },
@@ -231,9 +232,11 @@ void BindAndDraw(benchmark::State &state) {
     Compare(
         state, 2000,
         [=] {
+            GLint previous = 0;
+            ORU_PLAIN(::glGetIntegerv(GL_VERTEX_ARRAY_BINDING, &previous));
             ORU_PLAIN(glBindVertexArray(name));
             ORU_PLAIN(::glDrawElements(GL_TRIANGLES, 3, GL_UNSIGNED_SHORT, nullptr));
-            ORU_PLAIN(glBindVertexArray(0));
+            ORU_PLAIN(glBindVertexArray(static_cast<GLuint>(previous)));
         },
         [&] { scene.array.drawElements(GL_TRIANGLES, 3); });
 }

@@ -136,7 +136,7 @@ void ReadStream(benchmark::State &state) {
             Picture::Copy(picture.frame.data(), picture.memory.data(), picture.frame.size());
         },
         [&] {
-            if (stream.isFull()) {
+            if (stream.isFull() || stream.isReady()) {
                 PixelView const frame = stream.begin();
                 Picture::Copy(picture.frame.data(), frame.data(), frame.bytes());
                 stream.end();

@@ -155,13 +155,19 @@ void ExtensionManager::readVersions() {
                           release, rest);
 }
 
+void ExtensionManager::noteSupported(OpenGLExtension e) {
+    static_assert(UNKNOWN_OPENGL_EXTENSION <= kMostCapabilities);
+    supported_.insert(e);
+    isSupported_.set(e);
+}
+
 void ExtensionManager::climbVersionLadder() {
     bool reached = false;
     for (Rung const &rung : kLadder) {
         reached = reached || (majorVersion_ == rung.major && minorVersion_ == rung.minor);
         if (!reached || !initializeGL(rung.version))
             continue;
-        supported_.insert(rung.version);
+        noteSupported(rung.version);
         for (OpenGLExtension const e : rung.extensions)
             initialize(e);
     }
@@ -172,7 +178,7 @@ void ExtensionManager::readExtensions() {
     for (std::string const &name : supportedNames_) {
         OpenGLExtension const e = nameToEnumGL(name.c_str());
         if (e != UNKNOWN_OPENGL_EXTENSION && initializeGL(e))
-            supported_.insert(e);
+            noteSupported(e);
     }
 }
 
@@ -182,7 +188,7 @@ void ExtensionManager::readWGLExtensions() {
         OpenGLExtension const e = FindExtension(kWGLExtensions, name.c_str());
         if (!InitializeWGLExtension(e))
             continue;
-        supported_.insert(e);
+        noteSupported(e);
         supportedNames_.push_back(name);
     }
 
@@ -290,7 +296,7 @@ bool ExtensionManager::initialize(OpenGLExtension e) {
         return true;
     if (!initializeGL(e) && !InitializeWGLExtension(e))
         return false;
-    supported_.insert(e);
+    noteSupported(e);
     return true;
 }
 

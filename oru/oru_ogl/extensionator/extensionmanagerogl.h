@@ -9,6 +9,7 @@
 #include "oru/oru_ogl/extensionator/functiontable.h"
 #include "oru/oru_ogl/extensionator/openglextension.h"
 
+#include <bitset>
 #include <cstddef>
 #include <iosfwd>
 #include <memory>
@@ -198,7 +199,7 @@ public:
     /// @{
 
     /// Whether a capability is there with all its entry points.
-    bool isSupported(OpenGLExtension e) const { return supported_.count(e) != 0; }
+    bool isSupported(OpenGLExtension e) const { return e < kMostCapabilities && isSupported_[e]; }
     /// All capabilities that `isSupported` affirms.
     std::set<OpenGLExtension> const &supportedExtensions() const { return supported_; }
 
@@ -291,6 +292,8 @@ private:
         bool value = false;
     };
 
+    static constexpr std::size_t kMostCapabilities = 1024;
+
     explicit ExtensionManager(HGLRC rc);
     explicit ExtensionManager(Context *context);
 
@@ -308,6 +311,7 @@ private:
     void readWGLExtensions();
     bool testFloatFiltering();
     bool testHalfFiltering();
+    void noteSupported(OpenGLExtension e);
     bool loadGroup(std::size_t first, std::size_t count);
     std::string getExtensionsString() const;
     static void TokenizeExtensionString(std::string const &text, std::vector<std::string> &out);
@@ -337,6 +341,7 @@ private:
     InitOptions initOptions_;
     unsigned int glslMajorVersion_ = 0;
     unsigned int glslMinorVersion_ = 0;
+    std::bitset<kMostCapabilities> isSupported_; ///< what is in `supported_`, found at once
 };
 
 /// Prints the versions and the names of the supported extensions, one a line.

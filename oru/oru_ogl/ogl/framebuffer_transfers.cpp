@@ -46,7 +46,6 @@ private:
     };
 
     static GLuint Name(Framebuffer const *framebuffer) {
-        ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
         return framebuffer ? framebuffer->checkedID() : 0;
     }
 
@@ -238,6 +237,7 @@ void Framebuffer::Blit(Framebuffer const *source, IntegerRect const &from,
     GLbitfield const mask = (contents & CONTENTS_COLOR ? GL_COLOR_BUFFER_BIT : 0u) |
                             (contents & CONTENTS_DEPTH ? GL_DEPTH_BUFFER_BIT : 0u) |
                             (contents & CONTENTS_STENCIL ? GL_STENCIL_BUFFER_BIT : 0u);
+    ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
     TargetScope read(GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING, source);
     TargetScope drawn(GL_DRAW_FRAMEBUFFER, GL_DRAW_FRAMEBUFFER_BINDING, destination);
     ORU_GL(BlitFramebuffer, a.x0, a.y0, a.x1, a.y1, b.x0, b.y0, b.x1, b.y1, mask,
@@ -290,6 +290,7 @@ void Framebuffer::Read(Framebuffer const *framebuffer, IntegerRect const &part,
                        unsigned int alignment) {
     Edges const edges(part);
     internal::PixelLayout const layout = internal::LayoutOf(format, type);
+    ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
     TargetScope bound(GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING, framebuffer);
     internal::WithPackAlignment(alignment, [&] {
         ORU_GL(ReadPixels, edges.x0, edges.y0, edges.width, edges.height, layout.format,
@@ -305,6 +306,7 @@ void Framebuffer::Read(Framebuffer const *framebuffer, IntegerRect const &part,
     internal::CheckBuffer(buffer);
     internal::CheckByteAlignment(alignment);
     internal::PixelLayout const layout = internal::LayoutOf(format, type);
+    ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
     internal::BecomePackBuffer(*buffer);
     TargetScope bound(GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING, framebuffer);
     internal::WithPackAlignment(alignment, [&] {
@@ -322,6 +324,7 @@ void Framebuffer::Read(Framebuffer const *framebuffer, int x, int y,
     internal::CheckSides(shape, 2);
     Edges const edges(IntegerRect({x, y}, {shape.width, shape.height}));
     internal::PixelLayout const layout = internal::LayoutOf(shape.format, shape.type);
+    ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
     TargetScope bound(GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING, framebuffer);
     internal::WithPackState(shape, [&] {
         ORU_GL(ReadPixels, edges.x0, edges.y0, edges.width, edges.height, layout.format,

@@ -2,6 +2,7 @@
 #include "oru/oru_ogl/ogl/pixelreadstream.h"
 
 #include "oru/core/exceptions/checks.h"
+#include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/textures/pixelring.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
 #include "oru/oru_ogl/ogl/internal/textures/viewtransfer.h"
@@ -29,7 +30,7 @@ template<class Read>
 void PixelReadStream::ask(Read read) {
     ORU_ASSERT_TEXT("All frames of the stream wait to be taken: begin() and end() the oldest first",
                     !isFull());
-    internal::Frame &frame = ring()[first_ + count_];
+    internal::Frame &frame = ring()[count_];
     internal::ReadInto(frame.buffer, 0, read);
     frame.fence.emplace();
     ++count_;
@@ -64,21 +65,26 @@ bool PixelReadStream::isFull() const {
 }
 
 bool PixelReadStream::isReady() const {
-    return count_ > 0 && ring()[first_].isFree();
+    return count_ > 0 && ring()[0].isFree();
 }
 
 PixelView PixelReadStream::begin() {
     internal::PixelRing &frames = ring();
     ORU_ASSERT_TEXT("No frame of the stream was asked for: call read() before begin()", count_ > 0);
-    return frames.map(frames[first_], GL_MAP_READ_BIT);
+    if (!frames[0].memory)
+        internal::PixelRing::Wait(frames[0]);
+    return frames.map(frames[0], GL_MAP_READ_BIT);
 }
 
 void PixelReadStream::end() {
-    internal::Frame &frame = ring()[first_];
-    ORU_ASSERT_TEXT("The host has no frame of the stream: call begin() before end()", frame.memory);
-    ring().unmap(frame);
-    ++first_;
-    --count_;
+    internal::PixelRing &frames = ring();
+    internal::Frame &frame = frames[0];
+    ORU_ASSERT_TEXT("The host has no frame of the stream: call begin() before end()",
+                    count_ > 0 && frame.memory);
+    internal::BoundObjectScope bound(frame.buffer, ORU_BINDER(BindBuffer));
+    internal::PixelRing::Unmap(frame);
+    frames.move(0, --count_);
+    bound.restore();
 }
 
 bool PixelReadStream::IsSupported() {

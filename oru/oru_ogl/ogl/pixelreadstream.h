@@ -98,8 +98,7 @@ private:
     void ask(Read read);
 
     ScopedPtr<internal::PixelRing> ring_;
-    std::size_t first_ = 0; ///< the oldest frame
-    std::size_t count_ = 0;
+    std::size_t count_ = 0; ///< the first ones of the ring, the oldest at their head
 };
 
 } // namespace ORU::OGL

@@ -9,6 +9,8 @@
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texture3.h"
 
+#include <algorithm>
+
 namespace ORU::OGL {
 
 PixelUploadStream::PixelUploadStream(PixelShape const &shape, unsigned int frames)
@@ -25,30 +27,46 @@ internal::PixelRing &PixelUploadStream::ring() const {
     return *ring_;
 }
 
+/// The place of a frame with which OpenGL is known to be done, or the number of frames. Nothing is
+/// sent on its way for it: that would be once for each frame.
+std::size_t PixelUploadStream::firstFree() const {
+    internal::PixelRing &frames = ring();
+    std::size_t i = 0;
+    while (i < frames.size() && frames[i].fence && !frames[i].fence->isSignalled())
+        ++i;
+    return i;
+}
+
 bool PixelUploadStream::isFree() const {
-    return ring()[next_].isFree();
+    internal::PixelRing &frames = ring();
+    return frames[0].memory || firstFree() < frames.size() || frames[frames.size() - 1].isFree();
 }
 
 MutablePixelView PixelUploadStream::begin() {
-    internal::Frame &frame = ring()[next_];
+    internal::PixelRing &frames = ring();
+    if (!frames[0].memory) {
+        std::size_t const free = firstFree(), last = frames.size() - 1;
+        if (free > last)
+            internal::PixelRing::Wait(frames[last]);
+        frames.move(std::min(free, last), 0);
+    }
+    internal::Frame &frame = frames[0];
     GLbitfield access = GL_MAP_WRITE_BIT | GL_MAP_INVALIDATE_BUFFER_BIT;
     // A fence tells that OpenGL does not read the buffer any more: it need not look for itself.
     if (frame.fence)
         access |= GL_MAP_UNSYNCHRONIZED_BIT;
-    return ring().map(frame, access);
+    return frames.map(frame, access);
 }
 
 template<class AnyTexture, class... Place>
 void PixelUploadStream::send(AnyTexture &texture, int level, Place... place) {
-    internal::Frame &frame = ring()[next_];
+    internal::Frame &frame = ring()[0];
     ORU_ASSERT_TEXT("There is no frame to upload: call begin() and write what it returns",
                     frame.memory);
-    ring().unmap(frame);
-    internal::Ending mark([&] {
-        ++next_;
-        frame.fence.emplace();
-    });
     internal::BoundObjectScope bound(frame.buffer, ORU_BINDER(BindBuffer));
+    internal::PixelRing::Unmap(frame);
+    frame.fence.reset();
+    internal::Ending mark([&] { frame.fence.emplace(); });
     texture.upload(level, place..., ring().shape(), nullptr);
     bound.restore();
     mark.now();

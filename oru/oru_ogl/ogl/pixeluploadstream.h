@@ -47,14 +47,14 @@ public:
     /// Deletes the buffers. @note glDeleteBuffers, glDeleteSync
     ~PixelUploadStream();
 
-    /// Whether `begin()` would not wait. @note glClientWaitSync
+    /// Whether `begin()` would not wait. @note glGetSynciv, glClientWaitSync
     bool isFree() const;
 
     /// Memory for the next frame, the host's until `upload`. Waits while OpenGL uses all buffers.
     /// Called again before `upload`, it gives the same frame.
     /// @return what the buffer holds from earlier or not, to be written only
     /// @throws InternalException when OpenGL is not done with the oldest frame after half a minute
-    /// @note glClientWaitSync, glMapBufferRange
+    /// @note glGetSynciv, glClientWaitSync, glMapBufferRange
     MutablePixelView begin();
 
     /// @name Send the frame on its way
@@ -74,11 +74,11 @@ public:
 
 private:
     internal::PixelRing &ring() const;
+    std::size_t firstFree() const;
     template<class AnyTexture, class... Place>
     void send(AnyTexture &texture, int level, Place... place);
 
     ScopedPtr<internal::PixelRing> ring_;
-    std::size_t next_ = 0;
 };
 
 } // namespace ORU::OGL

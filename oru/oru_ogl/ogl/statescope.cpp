@@ -6,10 +6,12 @@
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
-#include <cstring>
 #include <iterator>
+#include <type_traits>
+#include <utility>
 
 namespace ORU::OGL {
 
@@ -121,69 +123,106 @@ constexpr Range RangeOf(StateKind kind) {
     return {begin, end};
 }
 
-constexpr Range kRanges[] = {RangeOf(StateKind::Viewport), RangeOf(StateKind::Scissor),
-                             RangeOf(StateKind::Depth),    RangeOf(StateKind::Stencil),
-                             RangeOf(StateKind::Cull),     RangeOf(StateKind::ColorMask)};
-
-/// Calls `each(piece, offset)` for the pieces of a kind.
-/// @param each the offset is that of the piece's values in the state, in bytes
-template<class Each>
-void ForEachPiece(StateKind kind, Each each) {
-    Range const range = kRanges[static_cast<std::size_t>(kind)];
-    std::size_t offset = 0;
-    for (std::size_t i = range.begin; i < range.end; ++i) {
-        each(kPieces[i], offset);
-        offset += kPieces[i].count * sizeof(GLint);
-    }
+/// Where the values of a piece begin among those of its state.
+constexpr std::size_t PlaceOf(std::size_t piece) {
+    std::size_t place = 0;
+    for (std::size_t i = RangeOf(kPieces[piece].kind).begin; i < piece; ++i)
+        place += kPieces[i].count;
+    return place;
 }
 
-/// As many values as a piece can have.
-using Values = std::array<GLint, 4>;
+/// What is done with the states of a kind. All about the pieces is known when this is compiled.
+template<StateKind Kind>
+class Access {
+public:
+    static void Read(GLint *values) {
+        ForEachPiece([values](auto piece) {
+            for (std::size_t i = 0; i < std::size(kPieces[piece].queries); ++i)
+                if (GLenum const query = kPieces[piece].queries[i])
+                    ORU_GL(GetIntegerv, query, values + PlaceOf(piece) + i);
+        });
+    }
 
-/// Calls `set(piece, values)` for each piece in which two states differ.
-template<class Set>
-void ForEachDifference(StateKind kind, void const *from, void const *to, Set set) {
-    auto const *const old = static_cast<char const *>(from);
-    auto const *const wanted = static_cast<char const *>(to);
-    ForEachPiece(kind, [&](Piece const &piece, std::size_t offset) {
-        std::size_t const size = piece.count * sizeof(GLint);
-        if (std::memcmp(old + offset, wanted + offset, size) == 0)
-            return;
-        Values values;
-        std::memcpy(values.data(), wanted + offset, size);
-        set(piece, values.data());
-    });
+    static void Set(GLint const *from, GLint const *to) {
+        try {
+            ForEachDifference(from, to, [to](auto piece) { SetPiece(piece, to); });
+        } catch (...) {
+            PutBack(to, from);
+            throw;
+        }
+    }
+
+    static void PutBack(GLint const *from, GLint const *to) noexcept {
+        internal::Release([&] {
+            ForEachDifference(from, to,
+                              [to](auto piece) { DropExceptions([&] { SetPiece(piece, to); }); });
+        });
+    }
+
+private:
+    static constexpr Range kRange = RangeOf(Kind);
+
+    /// Calls `each(piece)` with the index of each piece as a std::integral_constant.
+    template<class Each>
+    static void ForEachPiece(Each each) {
+        ForEachOf(each, std::make_index_sequence<kRange.end - kRange.begin>());
+    }
+    template<class Each, std::size_t... Index>
+    static void ForEachOf(Each each, std::index_sequence<Index...>) {
+        (each(std::integral_constant<std::size_t, kRange.begin + Index>()), ...);
+    }
+
+    template<class Set>
+    static void ForEachDifference(GLint const *from, GLint const *to, Set set) {
+        ForEachPiece([&](auto piece) {
+            constexpr std::size_t kPlace = PlaceOf(piece), kEnd = kPlace + kPieces[piece].count;
+            if (!std::equal(from + kPlace, from + kEnd, to + kPlace))
+                set(piece);
+        });
+    }
+
+    template<class Index>
+    static void SetPiece(Index piece, GLint const *values) {
+        kPieces[piece].set(values + PlaceOf(piece));
+    }
+};
+
+/// The functions of a kind.
+struct Functions {
+    void (*read)(GLint *values);
+    void (*set)(GLint const *from, GLint const *to);
+    void (*putBack)(GLint const *from, GLint const *to) noexcept;
+};
+
+template<StateKind... Kinds>
+constexpr std::array<Functions, sizeof...(Kinds)> FunctionsOf() {
+    return {Functions{Access<Kinds>::Read, Access<Kinds>::Set, Access<Kinds>::PutBack}...};
+}
+
+constexpr auto kFunctions =
+    FunctionsOf<StateKind::Viewport, StateKind::Scissor, StateKind::Depth, StateKind::Stencil,
+                StateKind::Cull, StateKind::ColorMask>();
+
+Functions const &FunctionsFor(StateKind kind) {
+    return kFunctions[static_cast<std::size_t>(kind)];
+}
+
+GLint const *Values(void const *state) {
+    return static_cast<GLint const *>(state);
 }
 
 } // namespace
 
 void StateAccess::Read(StateKind kind, void *state) {
-    ForEachPiece(kind, [state](Piece const &piece, std::size_t offset) {
-        Values values = {};
-        ORU_GL(GetIntegerv, piece.queries[0], values.data());
-        for (std::size_t i = 1; i < std::size(piece.queries) && piece.queries[i]; ++i)
-            ORU_GL(GetIntegerv, piece.queries[i], &values[i]);
-        std::memcpy(static_cast<char *>(state) + offset, values.data(),
-                    piece.count * sizeof(GLint));
-    });
+    FunctionsFor(kind).read(static_cast<GLint *>(state));
 }
 
 void StateAccess::Set(StateKind kind, void const *from, void const *to) {
-    try {
-        ForEachDifference(kind, from, to,
-                          [](Piece const &piece, GLint const *values) { piece.set(values); });
-    } catch (...) {
-        PutBack(kind, to, from);
-        throw;
-    }
+    FunctionsFor(kind).set(Values(from), Values(to));
 }
 
 void StateAccess::PutBack(StateKind kind, void const *from, void const *to) noexcept {
-    internal::Release([&] {
-        ForEachDifference(kind, from, to, [](Piece const &piece, GLint const *values) {
-            DropExceptions([&] { piece.set(values); });
-        });
-    });
+    FunctionsFor(kind).putBack(Values(from), Values(to));
 }
 
 } // namespace ORU::OGL

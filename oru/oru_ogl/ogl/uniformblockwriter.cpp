@@ -37,9 +37,9 @@ struct TypeRow {
         {GL_##Type##_MAT3x4, GL_##Type, 3, 4}, {GL_##Type##_MAT4x2, GL_##Type, 4, 2}, {            \
         GL_##Type##_MAT4x3, GL_##Type, 4, 3                                                        \
     }
-constexpr TypeRow kTypes[] = {ORU_VECTORS(FLOAT),        ORU_VECTORS(DOUBLE), ORU_VECTORS(INT),
-                              ORU_VECTORS(UNSIGNED_INT), ORU_VECTORS(BOOL),   ORU_MATRICES(FLOAT),
-                              ORU_MATRICES(DOUBLE)};
+constexpr TypeRow kTypes[] = {ORU_VECTORS(FLOAT),  ORU_MATRICES(FLOAT), // found first
+                              ORU_VECTORS(INT),    ORU_VECTORS(UNSIGNED_INT), ORU_VECTORS(BOOL),
+                              ORU_VECTORS(DOUBLE), ORU_MATRICES(DOUBLE)};
 #undef ORU_VECTORS
 #undef ORU_MATRICES
 
@@ -59,6 +59,15 @@ constexpr GLenum kComponents[] = {GL_FLOAT, GL_DOUBLE, GL_INT, GL_UNSIGNED_INT};
 bool Takes(GLenum component, GLenum kind) {
     return component == kind ||
            (component == GL_BOOL && (kind == GL_INT || kind == GL_UNSIGNED_INT));
+}
+
+/// Puts the columns of a matrix where its rows are `stride` bytes apart.
+void PutRows(unsigned char *to, unsigned char const *from, TypeRow const &matrix,
+             std::size_t number, std::size_t stride) {
+    for (unsigned int column = 0; column < matrix.columns; ++column) {
+        for (unsigned int row = 0; row < matrix.rows; ++row, from += number)
+            std::memcpy(to + row * stride + column * number, from, number);
+    }
 }
 
 } // namespace
@@ -86,18 +95,19 @@ void UniformBlockWriter::put(UniformBlock::Member const &member, Kind kind, void
     if (first > member.count || count > member.count - first)
         ORU_THROW_INTERNAL(ComposeText("The uniform \"", member.name, "\" has ", member.count,
                                        " elements, and was given ", count, " from ", first, " on"));
-    // A row-major matrix has its rows a stride apart, any other its columns.
-    std::size_t const number = kind == DOUBLE ? sizeof(GLdouble) : sizeof(GLfloat);
-    std::size_t const columnStep = member.isRowMajor ? number : member.matrixStride;
-    std::size_t const rowStep = member.isRowMajor ? member.matrixStride : number;
     auto const *from = static_cast<unsigned char const *>(values);
     unsigned char *element =
         bytes_.data() + member.offset + std::size_t{first} * member.arrayStride;
-    for (; count > 0; --count, element += member.arrayStride) {
-        for (unsigned int column = 0; column < row.columns; ++column) {
-            for (unsigned int i = 0; i < row.rows; ++i, from += number)
-                std::memcpy(element + column * columnStep + i * rowStep, from, number);
-        }
+    std::size_t const number = kind == DOUBLE ? sizeof(GLdouble) : sizeof(GLfloat);
+    std::size_t const column = number * row.rows;
+    for (; count > 0; --count, element += member.arrayStride, from += column * row.columns) {
+        if (member.isRowMajor)
+            PutRows(element, from, row, number, member.matrixStride);
+        else if (row.columns == 1 || member.matrixStride == column)
+            std::memcpy(element, from, column * row.columns);
+        else
+            for (unsigned int i = 0; i < row.columns; ++i)
+                std::memcpy(element + i * member.matrixStride, from + i * column, column);
     }
 }
 

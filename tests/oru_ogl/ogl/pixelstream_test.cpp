@@ -3,12 +3,15 @@
 #include "tests/support/allocationcount.h"
 #include "tests/support/texturekinds.h"
 
+#include "oru/oru_ogl/extensionator/interceptorscope.h"
+#include "oru/oru_ogl/extensionator/openglforwarder.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/pixelreadstream.h"
 #include "oru/oru_ogl/ogl/pixeluploadstream.h"
 
 #include <cstring>
 #include <deque>
+#include <set>
 
 using namespace oru_test;
 
@@ -44,6 +47,25 @@ Texels Taken(PixelReadStream &stream) {
     stream.end();
     return texels;
 }
+
+/// A driver that may be busy with all that it was given, and the buffers that were mapped.
+class BusyDriver : public OpenGLForwarder {
+public:
+    bool isBusy = false;
+    std::vector<GLint> mapped;
+
+    void cgmGetSynciv(char const *file, unsigned int line, GLsync sync, GLenum name, GLsizei size,
+                      GLsizei *length, GLint *values) override {
+        OpenGLForwarder::cgmGetSynciv(file, line, sync, name, size, length, values);
+        if (isBusy)
+            *values = GL_UNSIGNALED;
+    }
+    void *cgmMapBufferRange(char const *file, unsigned int line, GLenum target, GLintptr offset,
+                            GLsizeiptr size, GLbitfield access) override {
+        mapped.push_back(Get(GL_PIXEL_UNPACK_BUFFER_BINDING));
+        return OpenGLForwarder::cgmMapBufferRange(file, line, target, offset, size, access);
+    }
+};
 
 } // namespace
 
@@ -104,6 +126,23 @@ TEST_F(PixelStreamTest, FramesArriveInTheirOrder) {
               Get({GL_PIXEL_PACK_BUFFER_BINDING, GL_PIXEL_UNPACK_BUFFER_BINDING, GL_PACK_ALIGNMENT,
                    GL_UNPACK_ALIGNMENT, GL_UNPACK_ROW_LENGTH}));
     framebuffer.unbind();
+}
+
+// One buffer while OpenGL keeps up, which the caches have; all of them in turns while it does not.
+TEST_F(PixelStreamTest, TheHostWritesWhereOpenGLIsDone) {
+    InterceptorScope<BusyDriver> driver;
+    PixelUploadStream uploads(kWhole, 3);
+    for (int i = 0; i < 9; ++i) {
+        driver->isBusy = i >= 3;
+        uploads.begin();
+        uploads.upload(texture(), 0, 0, 0);
+    }
+    std::vector<GLint> const &order = driver->mapped;
+    ASSERT_EQ(9u, order.size());
+    EXPECT_EQ((std::vector<GLint>{order[0], order[0]}), (std::vector<GLint>{order[1], order[2]}));
+    EXPECT_EQ(3u, (std::set<GLint>{order[2], order[3], order[4]}).size());
+    EXPECT_EQ((std::vector<GLint>{order[2], order[3], order[4], order[2]}),
+              (std::vector<GLint>{order[5], order[6], order[7], order[8]}));
 }
 
 TEST_F(PixelStreamTest, FramesCostNoMemory) {

@@ -1,9 +1,10 @@
 // A program's binary with what tells whose it is and whether it is whole.
 #include "oru/oru_ogl/ogl/internal/programs/programbinary.h"
 
-#include "oru/oru_ogl/ogl/oruopengl.h"
+#include "oru/oru_ogl/extensionator/glcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <cstring>
 #include <string_view>
@@ -29,19 +30,30 @@ std::string_view Checked(unsigned char const *bytes, std::size_t size) {
     return {reinterpret_cast<char const *>(bytes) + from, size - from};
 }
 
-/// FNV-1a of 64 bits.
+/// FNV-1a of 64 bits, of words of 8 bytes instead of single ones; zeros follow the last.
 std::uint64_t Checksum(std::string_view bytes) {
     std::uint64_t sum = 14695981039346656037u;
-    for (char const byte : bytes)
-        sum = (sum ^ static_cast<unsigned char>(byte)) * 1099511628211u;
+    while (!bytes.empty()) {
+        std::uint64_t word = 0;
+        std::size_t const size = std::min(bytes.size(), sizeof word);
+        std::memcpy(&word, bytes.data(), size);
+        sum = (sum ^ word) * 1099511628211u;
+        bytes.remove_prefix(size);
+    }
     return sum;
 }
 
 } // namespace
 
 std::string DriverText() {
-    return GetGLString(GL_VENDOR) + '\n' + GetGLString(GL_RENDERER) + '\n' +
-           GetGLString(GL_VERSION);
+    std::string text;
+    text.reserve(256); // allocated once
+    constexpr GLenum kNames[] = {GL_VENDOR, GL_RENDERER, GL_VERSION};
+    for (GLenum const name : kNames) {
+        auto const *const part = reinterpret_cast<char const *>(ORU_GL(GetString, name));
+        text.append(part ? part : "").append(1, '\n');
+    }
+    return text;
 }
 
 std::vector<unsigned char> PackProgram(ProgramCode const &code, std::string const &driver) {

@@ -7,6 +7,8 @@
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 
+#include <algorithm>
+
 namespace ORU::OGL::internal {
 
 namespace {
@@ -29,13 +31,25 @@ PixelRing::PixelRing(PixelShape const &shape, unsigned int frames, Buffer::Type 
         frames_.push_back(Frame{Buffer(bytes, type, usage, nullptr), {}, nullptr});
 }
 
+void PixelRing::move(std::size_t from, std::size_t to) {
+    auto const at = [this](std::size_t place) {
+        return frames_.begin() + static_cast<std::ptrdiff_t>(place);
+    };
+    if (from < to)
+        std::rotate(at(from), at(from + 1), at(to + 1));
+    else
+        std::rotate(at(to), at(from), at(from + 1));
+}
+
+void PixelRing::Wait(Frame &frame) {
+    ORU_ASSERT_TEXT("OpenGL is not done with a frame of a stream after half a minute: the device "
+                    "hangs, or the context is lost",
+                    !frame.fence || frame.fence->clientWait(kHalfAMinute));
+}
+
 MutablePixelView PixelRing::map(Frame &frame, GLbitfield access) {
     auto const bytes = static_cast<std::size_t>(frame.buffer.size());
     if (!frame.memory) {
-        ORU_ASSERT_TEXT("OpenGL is not done with a frame of a stream after half a minute: the "
-                        "device hangs, or the context is lost",
-                        !frame.fence || frame.fence->clientWait(kHalfAMinute));
-        frame.fence.reset();
         BoundObjectScope bound(frame.buffer, ORU_BINDER(BindBuffer));
         frame.memory = ORU_GL(MapBufferRange, frame.buffer.target(), 0,
                               static_cast<GLsizeiptr>(bytes), access);
@@ -44,8 +58,7 @@ MutablePixelView PixelRing::map(Frame &frame, GLbitfield access) {
     return {frame.memory, bytes, shape_};
 }
 
-void PixelRing::unmap(Frame &frame) {
-    BoundObjectScope bound(frame.buffer, ORU_BINDER(BindBuffer));
+void PixelRing::Unmap(Frame &frame) {
     GLenum const target = frame.buffer.target();
     bool isIntact = false;
     try {
@@ -57,7 +70,6 @@ void PixelRing::unmap(Frame &frame) {
         throw;
     }
     frame.memory = nullptr;
-    bound.restore();
     ORU_ASSERT_TEXT("A frame of a stream was lost while the host had it: begin it again", isIntact);
 }
 

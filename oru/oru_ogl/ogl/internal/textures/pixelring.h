@@ -22,8 +22,9 @@ struct Frame {
     bool isFree() const { return !fence || fence->clientWait(std::chrono::nanoseconds(0)); }
 };
 
-/// Buffers for images of one shape. All of them are made at the beginning: nothing is allocated
-/// while they are used.
+/// Buffers for images of one shape, those that were used last first among the free ones: where
+/// OpenGL is done with a frame at once, the same memory goes round, which the caches still have.
+/// All buffers are made at the beginning: nothing is allocated while they are used.
 class PixelRing {
 public:
     /// @throws InternalException where streams are not supported, for a shape without pixels, and
@@ -32,15 +33,22 @@ public:
 
     PixelShape const &shape() const { return shape_; }
     std::size_t size() const { return frames_.size(); }
-    Frame &operator[](std::size_t index) { return frames_[index % frames_.size()]; }
+    Frame &operator[](std::size_t index) { return frames_[index]; }
+
+    /// Takes a frame out of its place and puts it in before or behind another.
+    void move(std::size_t from, std::size_t to);
+
+    /// Waits until OpenGL is done with a frame.
+    /// @throws InternalException after half a minute
+    static void Wait(Frame &frame);
 
     /// The memory of a frame with which OpenGL is done; mapped already or mapped now.
     /// @param access as glMapBufferRange takes it
     MutablePixelView map(Frame &frame, GLbitfield access);
 
-    /// Gives the memory back.
+    /// Gives the memory of a frame back whose buffer is bound.
     /// @throws InternalException when the system has lost what was in it
-    void unmap(Frame &frame);
+    static void Unmap(Frame &frame);
 
     /// OpenGL 3.2, or pixel buffers with GL_ARB_map_buffer_range and GL_ARB_sync.
     static bool IsSupported();
