@@ -10,8 +10,8 @@ class TransformFeedback;
 /// Captures what is drawn for a scope; see TransformFeedback.
 class ORU_API TransformFeedbackScope {
 public:
-    /// Begins to capture by what is bound, which OpenGL 3.0 has without an object: there the
-    /// buffers are bound by glBindBufferBase to GL_TRANSFORM_FEEDBACK_BUFFER.
+    /// Begins to capture by what is bound, which OpenGL 3.0 has without an object: there
+    /// Buffer::bindBase binds the buffers to GL_TRANSFORM_FEEDBACK_BUFFER.
     /// @param primitive what is captured: GL_POINTS, GL_LINES or GL_TRIANGLES
     /// @throws InternalException before OpenGL 3.0; ExceptionOGL without a buffer, or when the
     ///         current program captures nothing
