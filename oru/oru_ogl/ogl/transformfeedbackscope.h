@@ -15,12 +15,12 @@ public:
     /// @param primitive what is captured: GL_POINTS, GL_LINES or GL_TRIANGLES
     /// @throws InternalException before OpenGL 3.0; ExceptionOGL without a buffer, or when the
     ///         current program captures nothing
-    /// @note glBeginTransformFeedback
+    /// @note glGetIntegerv, glBeginTransformFeedback
     explicit TransformFeedbackScope(unsigned int primitive);
 
     /// Binds an object, which outlives the scope, and begins to capture.
     /// @throws as the other
-    /// @note glBindTransformFeedback, glBeginTransformFeedback
+    /// @note glGetIntegerv, glBindTransformFeedback, glBeginTransformFeedback
     TransformFeedbackScope(TransformFeedback &feedback, unsigned int primitive);
 
     TransformFeedbackScope(TransformFeedbackScope const &) = delete;
