@@ -17,6 +17,7 @@
 #include "oru/oru_ogl/ogl/queryscope.h"
 #include "oru/oru_ogl/ogl/sampler.h"
 #include "oru/oru_ogl/ogl/statescope.h"
+#include "oru/oru_ogl/ogl/switchscope.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/textureunit.h"
 #include "oru/oru_ogl/ogl/transformfeedback.h"
@@ -150,6 +151,7 @@ void Stages() {
     TemporaryScissorScope const scissor({1, 0, 0, 2, 2});
     TemporaryCullScope const cull({1, GL_FRONT, GL_CW});
     TemporaryColorMaskScope const mask({1, 0, 1, 1});
+    TemporarySwitchScope const switched(GL_DITHER, false);
 
     char const vertex[] = "#version 150\n#extension GL_ARB_separate_shader_objects : enable\n"
                           "out gl_PerVertex { vec4 gl_Position; }; out float number;"

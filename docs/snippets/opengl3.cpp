@@ -10,6 +10,7 @@
 #include "oru/oru_ogl/ogl/programogl.h"
 #include "oru/oru_ogl/ogl/programpipeline.h"
 #include "oru/oru_ogl/ogl/statescope.h"
+#include "oru/oru_ogl/ogl/switchscope.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/transformfeedback.h"
 #include "oru/oru_ogl/ogl/transformfeedbackscope.h"
@@ -169,12 +170,11 @@ TEST_F(OpenGL3Guide, FeedbackBinariesAndPipelines) {
     feedback.setBuffer(0, lower);
 
     fall.enable();
-    ORU_GL(Enable, GL_RASTERIZER_DISCARD); // nothing to be seen
     {
+        TemporarySwitchScope const unseen(GL_RASTERIZER_DISCARD, true);
         TransformFeedbackScope const capture(feedback, GL_POINTS);
         points.drawPrimitives();
     }
-    ORU_GL(Disable, GL_RASTERIZER_DISCARD);
     fall.disable();
     // [feedback]
     std::vector<float> captured(3);

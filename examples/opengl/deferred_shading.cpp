@@ -11,6 +11,8 @@
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/statescope.h"
 #include "oru/oru_ogl/ogl/texture2.h"
+#include "oru/oru_ogl/ogl/texturestate.h"
+#include "oru/oru_ogl/ogl/textureunit.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 
 using namespace ORU::OGL;
@@ -99,13 +101,13 @@ VertexBuffer::Field Floats(char const *name, VertexBuffer::AttributeType type) {
 VertexBuffer Balls(Program &program) {
     std::vector<float> balls, paints;
     for (unsigned int i = 0; i < kColumns * kRows; ++i) {
-        auto const column = static_cast<float>(i % kColumns),
-                   row = static_cast<float>(i / kColumns);
+        unsigned int const line = i / kColumns;
+        auto const column = static_cast<float>(i % kColumns), row = static_cast<float>(line);
         balls.insert(balls.end(),
                      {30 * column + 15.3f, 30 * row + 15.2f, static_cast<float>(i * 7 % 10),
                       14.5f + static_cast<float>(i % 5)});
         for (unsigned int component = 0; component < 3; ++component)
-            paints.push_back((i % kColumns + i / kColumns) % 3 == component ? 1.f : 0.4f);
+            paints.push_back((i % kColumns + line) % 3 == component ? 1.f : 0.4f);
     }
     VertexBuffer points({Floats("ball", VertexBuffer::ATTRIBUTETYPE_FLOAT4),
                          Floats("paint", VertexBuffer::ATTRIBUTETYPE_FLOAT3)},
@@ -141,8 +143,8 @@ void DrawBalls(Seen &seen) {
     framebuffer.attach(&seen.normal, 0, 1);
     framebuffer.attach(&seen.colour, 0, 2);
     framebuffer.attach(&depth, 0);
-    GLenum const outputs[] = {GL_COLOR_ATTACHMENT0, GL_COLOR_ATTACHMENT1, GL_COLOR_ATTACHMENT2};
-    ORU_GL(DrawBuffers, 3, outputs);
+    framebuffer.setDrawBuffers(
+        {Framebuffer::Color(0), Framebuffer::Color(1), Framebuffer::Color(2)});
 
     TemporaryViewportScope const whole({0, 0, kWidth, kHeight});
     TemporaryDepthScope const nearest([](DepthState &state) { state.enabled = 1; });
@@ -170,8 +172,9 @@ void LightPixels(Seen &seen) {
     Texture2D *const textures[] = {&seen.place, &seen.normal, &seen.colour};
     char const *const samplers[] = {"places", "normals", "colours"};
     for (int unit = 0; unit < 3; ++unit) {
-        ORU_GL(ActiveTexture, GL_TEXTURE0 + static_cast<GLenum>(unit));
-        ORU_GL(BindTexture, GL_TEXTURE_2D, textures[unit]->objectID());
+        auto const index = static_cast<unsigned int>(unit);
+        TextureState::SetActiveTextureUnit(index);
+        TextureUnit::Unit(index)->bind(textures[unit]);
         program.setUniformSampler2D(samplers[unit], unit);
     }
     for (int band = 0; band < 3; ++band) {

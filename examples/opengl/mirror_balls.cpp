@@ -8,6 +8,7 @@
 #include "oru/oru_ogl/ogl/programogl.h"
 #include "oru/oru_ogl/ogl/sampler.h"
 #include "oru/oru_ogl/ogl/samplerbindscope.h"
+#include "oru/oru_ogl/ogl/switchscope.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/texturecube.h"
 #include "oru/oru_ogl/ogl/textureunit.h"
@@ -71,7 +72,6 @@ void Mirror(std::filesystem::path const &file) {
         room.subImage(face, 0, 0, 0, kSide, kSide, Texture::FORMAT_RGB, Texture::TYPE_UNSIGNED_BYTE,
                       Wall(face).data(), PixelUnpackParameters());
     room.generateMipmap();
-    ORU_GL(Enable, GL_TEXTURE_CUBE_MAP_SEAMLESS); // filters across the edges of the walls
     Sampler const smooth(Texture::FILTER_LINEAR_MIPMAP_LINEAR, Texture::FILTER_LINEAR,
                          Texture::WRAPMODE_CLAMP_TO_EDGE);
 
@@ -93,6 +93,8 @@ void Mirror(std::filesystem::path const &file) {
     everything.marshallData();
     ProgramEnabledScope const enabled(&program);
     SamplerBindScope const sampled(smooth, 0);
+    // Filters across the edges of the walls.
+    TemporarySwitchScope const seamless(GL_TEXTURE_CUBE_MAP_SEAMLESS, true);
     everything.drawPrimitives();
     example::SavePicture(file, kWidth, kHeight);
 }

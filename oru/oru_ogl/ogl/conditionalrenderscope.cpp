@@ -2,6 +2,7 @@
 #include "oru/oru_ogl/ogl/conditionalrenderscope.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/ogl/internal/objects/pendingerror.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
@@ -26,6 +27,7 @@ ConditionalRenderScope::ConditionalRenderScope(Query const &query, Mode mode) {
     if (query.type() != Query::TYPE_SAMPLES && query.type() != Query::TYPE_ANY_SAMPLES)
         ORU_THROW_INTERNAL("Drawing can depend on a query of samples only: make it of "
                            "Query::TYPE_SAMPLES or TYPE_ANY_SAMPLES");
+    internal::ReportPendingError();
     ORU_GL(BeginConditionalRender, query.objectID(), Mode2GL(mode));
 }
 

@@ -99,7 +99,8 @@ public:
     void attach(Texture2 *texture, unsigned int level, unsigned int colorIndex);
 
     /// Attaches to the point that the renderbuffer's format asks for; one with depth and stencil
-    /// to both.
+    /// to both. Of the later formats (GL_DEPTH24_STENCIL8, GL_DEPTH_COMPONENT32F and the like) all
+    /// count as colours here: see `attachRenderbuffer`.
     /// @param colorIndex 0 for a renderbuffer that holds no colours
     /// @note glFramebufferRenderbufferEXT
     void attach(Renderbuffer *renderbuffer, unsigned int colorIndex);
@@ -187,6 +188,7 @@ public:
 
     /// Copies a rectangle of a framebuffer into a rectangle of another, scaled to its size. Copying
     /// from several samples to one averages them; the rectangles must be of the same size then.
+    /// Outside the scissor rectangle nothing changes while the scissor test is on.
     /// @param source, destination null for the window's own
     /// @param contents Contents, joined by `|`
     /// @param filter FILTER_NEAREST, or FILTER_LINEAR for colours alone

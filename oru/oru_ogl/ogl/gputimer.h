@@ -72,7 +72,9 @@ private:
     enum State : unsigned char { IDLE, RUNNING, UNMEASURED };
 
     unsigned int frames() const { return static_cast<unsigned int>(names_.size() / 2); }
-    unsigned int *stamps(unsigned int frame) { return &names_[2 * (frame % frames())]; }
+    unsigned int *stamps(unsigned int frame) {
+        return &names_[std::size_t{2} * (frame % frames())];
+    }
     void requireRing() const;
     bool isOldestThere();
     void dropOldest();

@@ -10,17 +10,17 @@ class TransformFeedback;
 /// Captures what is drawn for a scope; see TransformFeedback.
 class ORU_API TransformFeedbackScope {
 public:
-    /// Begins to capture by what is bound, which OpenGL 3.0 has without an object: there the
-    /// buffers are bound by glBindBufferBase to GL_TRANSFORM_FEEDBACK_BUFFER.
+    /// Begins to capture by what is bound, which OpenGL 3.0 has without an object: there
+    /// Buffer::bindBase binds the buffers to GL_TRANSFORM_FEEDBACK_BUFFER.
     /// @param primitive what is captured: GL_POINTS, GL_LINES or GL_TRIANGLES
     /// @throws InternalException before OpenGL 3.0; ExceptionOGL without a buffer, or when the
     ///         current program captures nothing
-    /// @note glBeginTransformFeedback
+    /// @note glGetIntegerv, glBeginTransformFeedback
     explicit TransformFeedbackScope(unsigned int primitive);
 
     /// Binds an object, which outlives the scope, and begins to capture.
     /// @throws as the other
-    /// @note glBindTransformFeedback, glBeginTransformFeedback
+    /// @note glGetIntegerv, glBindTransformFeedback, glBeginTransformFeedback
     TransformFeedbackScope(TransformFeedback &feedback, unsigned int primitive);
 
     TransformFeedbackScope(TransformFeedbackScope const &) = delete;

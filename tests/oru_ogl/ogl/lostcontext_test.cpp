@@ -21,6 +21,7 @@
 #include "oru/oru_ogl/ogl/samplerbindscope.h"
 #include "oru/oru_ogl/ogl/shader.h"
 #include "oru/oru_ogl/ogl/statescope.h"
+#include "oru/oru_ogl/ogl/switchscope.h"
 #include "oru/oru_ogl/ogl/texturebindscope.h"
 #include "oru/oru_ogl/ogl/transformfeedback.h"
 #include "oru/oru_ogl/ogl/transformfeedbackscope.h"
@@ -57,6 +58,7 @@ struct Everything {
     Texture2DBindScope bound{&texture, 0, true};
     ProgramEnabledScope enabled;
     TemporaryDepthScope depth{{1, 0, GL_ALWAYS}};
+    TemporarySwitchScope dither{GL_DITHER, false};
     ProgramPipeline pipeline;
     PixelUploadStream uploads{PixelShape(), 2};
     PixelReadStream reads{PixelShape(), 2};

@@ -147,6 +147,14 @@ TEST_F(QueryTest, RefusesWhatHasNoSense) {
     expect("GL_INVALID_ENUM", [&] { other.end(); });
     EXPECT_FALSE(other.isRunning());
     EXPECT_EQ(0u, other.result());
+    // What nobody would end does not begin, or is ended.
+    ::glEnable(GL_NONE);
+    expect("GL_INVALID_ENUM", [&] { QueryScope{other}; });
+    EXPECT_FALSE(other.isRunning());
+    ::glEnable(GL_NONE);
+    expect("GL_INVALID_ENUM",
+           [&] { ConditionalRenderScope(other, ConditionalRenderScope::MODE_WAIT); });
+    EXPECT_NO_THROW(ConditionalRenderScope(other, ConditionalRenderScope::MODE_WAIT));
 
     ExpectTranslation("Query type", Query::Type2GL, Query::GL2Type, 6, GL_TIMESTAMP);
     ExpectTranslation("Conditional rendering mode", ConditionalRenderScope::Mode2GL,

@@ -176,6 +176,8 @@ TEST_F(StagesTest, FeedbackCapturesWhatIsAskedFor) {
     Buffer::BindDefaultArrayBuffer();
     Buffer all = Numbers(12);
     ORU_GL(BindBufferBase, GL_TRANSFORM_FEEDBACK_BUFFER, 0u, all.objectID());
+    ::glEnable(GL_NONE); // an error that the host left must not begin a capture without an end
+    EXPECT_FAILURE("GL_INVALID_ENUM", TransformFeedbackScope(GL_POINTS));
     try {
         TransformFeedbackScope const capture(GL_POINTS);
         feedback.draw(GL_POINTS);

@@ -5,6 +5,7 @@
 #include "oru/oru_ogl/ogl/framebuffer.h"
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/statescope.h"
+#include "oru/oru_ogl/ogl/switchscope.h"
 
 #include <cstring>
 #include <stdexcept>
@@ -128,4 +129,27 @@ TEST_F(StateScopeTest, AFailureLeavesWhatWasThere) {
         ::glEnable(0x1234); // the first call of the end finds it and is made all the same
     }
     expectBefore();
+}
+
+TEST_F(StateScopeTest, SwitchesComeAndGo) {
+    for (bool const before : {false, true}) {
+        TemporarySwitchScope const outer(GL_DITHER, before);
+        for (bool const on : {false, true}) {
+            auto const callTo = [&](bool state) -> std::string {
+                return before == on ? "" : state ? "Enable " : "Disable ";
+            };
+            calls_->reset();
+            {
+                TemporarySwitchScope const scope(GL_DITHER, on);
+                EXPECT_EQ(before, scope.found());
+                EXPECT_EQ(callTo(on) + "IsEnabled ", calls_->takeChanges());
+                EXPECT_EQ(on, ::glIsEnabled(GL_DITHER) == GL_TRUE);
+                ::glEnable(0x1234); // the call of the end finds it and is made all the same
+            }
+            ::glGetError(); // where the scope has nothing to do at its end
+            EXPECT_EQ(callTo(before), calls_->takeChanges());
+            EXPECT_EQ(before, ::glIsEnabled(GL_DITHER) == GL_TRUE);
+        }
+    }
+    EXPECT_FAILURE("GL_INVALID_ENUM", TemporarySwitchScope(0x1234, true));
 }
