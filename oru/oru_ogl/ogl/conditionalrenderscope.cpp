@@ -2,8 +2,7 @@
 #include "oru/oru_ogl/ogl/conditionalrenderscope.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/objects/pendingerror.h"
-#include "oru/oru_ogl/ogl/internal/objects/release.h"
+#include "oru/oru_ogl/ogl/internal/objects/beginning.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
 #include "oru/oru_ogl/ogl/query.h"
@@ -12,6 +11,10 @@
 namespace ORU::OGL {
 
 namespace {
+
+void End() {
+    ORU_GL0(EndConditionalRender);
+}
 
 #define ORU_MODE(Name)                                                                             \
     { ConditionalRenderScope::MODE_##Name, GL_QUERY_##Name }
@@ -27,12 +30,12 @@ ConditionalRenderScope::ConditionalRenderScope(Query const &query, Mode mode) {
     if (query.type() != Query::TYPE_SAMPLES && query.type() != Query::TYPE_ANY_SAMPLES)
         ORU_THROW_INTERNAL("Drawing can depend on a query of samples only: make it of "
                            "Query::TYPE_SAMPLES or TYPE_ANY_SAMPLES");
-    internal::ReportPendingError();
-    ORU_GL(BeginConditionalRender, query.objectID(), Mode2GL(mode));
+    auto const glMode = Mode2GL(mode);
+    internal::BeginScope([&] { ORU_GL(BeginConditionalRender, query.objectID(), glMode); }, End);
 }
 
 ConditionalRenderScope::~ConditionalRenderScope() {
-    internal::Release([] { ORU_GL0(EndConditionalRender); });
+    internal::Release(End);
 }
 
 ORU_TRANSLATED(ConditionalRenderScope, Mode, kModes)

@@ -32,7 +32,7 @@ public:
     /// @param query of TYPE_SAMPLES or TYPE_ANY_SAMPLES, ended; outlives the scope
     /// @throws InternalException for another query and a number that is no Mode, and without OpenGL
     ///         3.0; ExceptionOGL for a scope in another one, and a query that has measured nothing
-    /// @note glGetIntegerv, glBeginConditionalRender
+    /// @note glBeginConditionalRender
     ConditionalRenderScope(Query const &query, Mode mode);
 
     /// Draws everything again; a failure is dropped.

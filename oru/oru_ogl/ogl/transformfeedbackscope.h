@@ -15,7 +15,7 @@ public:
     /// @param primitive what is captured: GL_POINTS, GL_LINES or GL_TRIANGLES
     /// @throws InternalException before OpenGL 3.0; ExceptionOGL without a buffer, or when the
     ///         current program captures nothing
-    /// @note glGetIntegerv, glBeginTransformFeedback
+    /// @note glBeginTransformFeedback
     explicit TransformFeedbackScope(unsigned int primitive);
 
     /// Binds an object, which outlives the scope, and begins to capture.
