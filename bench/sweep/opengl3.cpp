@@ -24,6 +24,7 @@
 #include "oru/oru_ogl/ogl/transformfeedbackscope.h"
 #include "oru/oru_ogl/ogl/uniformblockwriter.h"
 #include "oru/oru_ogl/ogl/vertexarray.h"
+#include "oru/oru_ogl/ogl/vertexarraybindscope.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <array>
@@ -97,6 +98,10 @@ void VertexArrays() {
     array.setIndices(buffer, GL_UNSIGNED_INT);
     array.setAttribute(2, buffer, VertexArray::Attribute(1, GL_DOUBLE).asDouble());
     array.drawArrays(GL_POINTS, 0, 1);
+    {
+        VertexArrayBindScope const scope(array);
+        array.drawArrays(GL_POINTS, 0, 1);
+    }
     array.bind();
     int const first = 0, count = 1;
     array.drawArraysInstanced(GL_POINTS, 0, 1, 2);

@@ -246,7 +246,7 @@ std::vector<Scenario> const &Scenarios() {
         {"textures", Textures, Needs::Context, ""},
         {"buffers", Buffers, Needs::Context, ""},
         {"queries", Queries, Needs::Context, ""},
-        {"arrays", VertexArrays, Needs::Context, ""},
+        {"arrays", VertexArrays, Needs::Context, "glBindVertexArray"},
         {"framebuffers", Framebuffers, Needs::Context, ""},
         {"later-textures", LaterTextures, Needs::Context, ""},
         {"framebuffer-transfers", FramebufferTransfers, Needs::Context, ""},

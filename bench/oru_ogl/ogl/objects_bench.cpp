@@ -15,6 +15,7 @@
 #include "oru/oru_ogl/ogl/renderbuffer.h"
 #include "oru/oru_ogl/ogl/uniformblockwriter.h"
 #include "oru/oru_ogl/ogl/vertexarray.h"
+#include "oru/oru_ogl/ogl/vertexarraybindscope.h"
 
 #include <cstring>
 #include <vector>
@@ -74,28 +75,6 @@ void CountSamples(benchmark::State &state) {
         });
 }
 BENCHMARK(CountSamples)->UseManualTime()->Iterations(300);
-
-void DrawConditionally(benchmark::State &state) {
-    ThreadContext const context;
-    ORU_ENTRY(glBeginConditionalRender, BEGINCONDITIONALRENDER);
-    ORU_ENTRY(glEndConditionalRender, ENDCONDITIONALRENDER);
-    Query query(Query::TYPE_SAMPLES);
-    query.begin();
-    query.end();
-    GLuint const name = query.objectID();
-    Compare(
-        state, 200,
-        [=] {
-            ORU_PLAIN(glBeginConditionalRender(name, GL_QUERY_NO_WAIT));
-            ORU_PLAIN(::glClear(GL_COLOR_BUFFER_BIT));
-            ORU_PLAIN(glEndConditionalRender());
-        },
-        [&] {
-            ConditionalRenderScope const scope(query, ConditionalRenderScope::MODE_NO_WAIT);
-            ORU_PLAIN(::glClear(GL_COLOR_BUFFER_BIT));
-        });
-}
-BENCHMARK(DrawConditionally)->UseManualTime()->Iterations(300);
 
 /// A ring of stamps as a host keeps it.
 void TimeFrames(benchmark::State &state) {
@@ -245,13 +224,43 @@ BENCHMARK(BindAndDraw)->UseManualTime()->Iterations(50);
 /// One draw of many with the same vertex array.
 void DrawBound(benchmark::State &state) {
     Scene scene;
-    scene.array.bind();
+    VertexArrayBindScope const bound(scene.array);
     Compare(
         state, 2000,
         [=] { ORU_PLAIN(::glDrawElements(GL_TRIANGLES, 3, GL_UNSIGNED_SHORT, nullptr)); },
         [&] { scene.array.drawElements(GL_TRIANGLES, 3); });
 }
 BENCHMARK(DrawBound)->UseManualTime()->Iterations(50);
+
+/// A draw that depends on a query.
+void DrawConditionally(benchmark::State &state) {
+    Scene scene;
+    VertexArrayBindScope const bound(scene.array);
+    ORU_ENTRY(glBeginConditionalRender, BEGINCONDITIONALRENDER);
+    ORU_ENTRY(glEndConditionalRender, ENDCONDITIONALRENDER);
+    Query query(Query::TYPE_SAMPLES);
+    { // of what is seen: the draws are made
+        scene.program.disable();
+        QueryScope const scope(query);
+        ::glRectf(-1, -1, 1, 1);
+    }
+    scene.program.enable();
+    if (query.result() == 0)
+        state.SkipWithError("nothing was drawn");
+    GLuint const name = query.objectID();
+    Compare(
+        state, 1000,
+        [=] {
+            ORU_PLAIN(glBeginConditionalRender(name, GL_QUERY_NO_WAIT));
+            ORU_PLAIN(::glDrawElements(GL_TRIANGLES, 3, GL_UNSIGNED_SHORT, nullptr));
+            ORU_PLAIN(glEndConditionalRender());
+        },
+        [&] {
+            ConditionalRenderScope const scope(query, ConditionalRenderScope::MODE_NO_WAIT);
+            scene.array.drawElements(GL_TRIANGLES, 3);
+        });
+}
+BENCHMARK(DrawConditionally)->UseManualTime()->Iterations(50);
 
 /// A block filled, written and bound, as a host does that keeps offsets of std140 by hand.
 void UploadBlock(benchmark::State &state) {

@@ -51,11 +51,10 @@ MutablePixelView PixelUploadStream::begin() {
         frames.move(std::min(free, last), 0);
     }
     internal::Frame &frame = frames[0];
-    GLbitfield access = GL_MAP_WRITE_BIT | GL_MAP_INVALIDATE_BUFFER_BIT;
-    // A fence tells that OpenGL does not read the buffer any more: it need not look for itself.
-    if (frame.fence)
-        access |= GL_MAP_UNSYNCHRONIZED_BIT;
-    return frames.map(frame, access);
+    // A fence tells that OpenGL does not read the buffer any more: it need not look for itself, nor
+    // take other memory.
+    return frames.map(frame, GL_MAP_WRITE_BIT | (frame.fence ? GL_MAP_UNSYNCHRONIZED_BIT
+                                                             : GL_MAP_INVALIDATE_BUFFER_BIT));
 }
 
 template<class AnyTexture, class... Place>

@@ -130,6 +130,8 @@ void VertexArray::BindDefault() {
 
 template<class Step>
 void VertexArray::whileBound(Step step) const {
+    if (isHeld_)
+        return step();
     unsigned int const previous = getBoundID();
     if (previous == objectID_)
         return step();

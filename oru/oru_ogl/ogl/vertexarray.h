@@ -24,8 +24,8 @@ class Buffer;
 /// The vertex array holds the buffers' names only: keep them alive while it is drawn. What a
 /// primitive is, GL_TRIANGLES say or VertexBuffer::PrimitiveType, is OpenGL's to judge.
 ///
-/// A draw binds the vertex array and then again what was bound before; a bound one costs no binding
-/// at all, so `bind()` it before many draws. Contexts that share objects do not share vertex
+/// A draw binds the vertex array and then again what was bound before; of a bound one it only asks
+/// whether it is, and within a VertexArrayBindScope not even that. Contexts that share objects do not share vertex
 /// arrays: one is made, used and destroyed in the same context. OpenGL 3.0, or
 /// GL_ARB_vertex_array_object with OpenGL 2.0.
 class ORU_API VertexArray : public Object {
@@ -200,6 +200,8 @@ public:
     static bool IsSupported();
 
 private:
+    friend class VertexArrayBindScope;
+
     template<class Step>
     void whileBound(Step step) const;
     void deleteObject() noexcept;
@@ -208,6 +210,7 @@ private:
 
     unsigned int indexType_ = 0;  ///< GL type, 0 until indices are set
     std::int64_t indexCount_ = 0; ///< how many the buffer has
+    mutable bool isHeld_ = false; ///< bound by a scope
 };
 
 } // namespace ORU::OGL

@@ -26,6 +26,7 @@
 #include "oru/oru_ogl/ogl/transformfeedback.h"
 #include "oru/oru_ogl/ogl/transformfeedbackscope.h"
 #include "oru/oru_ogl/ogl/vertexarray.h"
+#include "oru/oru_ogl/ogl/vertexarraybindscope.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 
 using namespace oru_test;
@@ -45,6 +46,7 @@ struct Everything {
                           1,
                           VertexBuffer::PRIMITIVETYPE_POINTS};
     VertexArray array;
+    VertexArrayBindScope held{array};
     Fence fence;
     GpuTimer timer;
     Query samples{Query::TYPE_SAMPLES}, time{Query::TYPE_TIME_ELAPSED};

@@ -3,6 +3,7 @@
 
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/vertexarray.h"
+#include "oru/oru_ogl/ogl/vertexarraybindscope.h"
 
 #include <cstring>
 #include <functional>
@@ -163,6 +164,22 @@ TEST_F(VertexArrayTest, DrawsByEveryWay) {
              [&](auto const &a) { a.drawElementsInstanced(points, 1, kCount, 1, 2); }})
         EXPECT_EQ(expected, DrawnInto(kCount, [&] { draw(array); }));
     EXPECT_TRUE(array.isBound()) << "as before the draws";
+    // Within scopes there is nothing but the draw, and each puts back what it found.
+    VertexArray other;
+    {
+        VertexArrayBindScope const scope(other);
+        {
+            VertexArrayBindScope const inner(array);
+            { VertexArrayBindScope const again(array); }
+            InterceptorScope<CountingForwarder> calls;
+            draws[0].second(array);
+            EXPECT_EQ(calls->count("DrawArrays"), calls->total());
+        }
+        EXPECT_TRUE(other.isBound());
+        array.drawArrays(points, 0, 1);
+        EXPECT_TRUE(other.isBound());
+    }
+    EXPECT_TRUE(array.isBound());
     VertexArray::BindDefault();
     array.setAttribute(0, places, {1, GL_FLOAT}); // for each vertex again
     array.disableAttribute(1);
