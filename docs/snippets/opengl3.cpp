@@ -14,11 +14,15 @@
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/transformfeedback.h"
 #include "oru/oru_ogl/ogl/transformfeedbackscope.h"
+#include "oru/oru_ogl/ogl/uniformblockwriter.h"
+#include "oru/oru_ogl/ogl/vertexarray.h"
 #include "oru/oru_ogl/ogl/vertexbufferogl.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <gtest/gtest.h>
 
+#include <array>
+#include <cstddef>
 #include <cstring>
 #include <string>
 #include <string_view>
@@ -54,6 +58,22 @@ constexpr std::string_view kFragment = R"(#version 150
         normal = vec4(0.0, 0.0, 1.0, 1.0);
     })";
 // [outputs]
+
+// [blockshader]
+constexpr std::string_view kBlocks = R"(#version 150
+    in vec2 place;
+    in vec4 weight;
+    uniform Look {
+        mat4 view;
+        vec3 tint;
+        float gains[4];
+    };
+    out vec4 shade;
+    void main() {
+        shade = vec4(tint, 1.0) * weight * gains[0];
+        gl_Position = view * vec4(place, 0.0, 1.0);
+    })";
+// [blockshader]
 
 /// A few heights as points.
 VertexBuffer Points(Program &program) {
@@ -156,6 +176,64 @@ TEST_F(OpenGL3Guide, ScopesPutStateBack) {
     } // as before, also when an exception ended the block
     // [state]
     EXPECT_EQ(1, CurrentState<DepthState>().writes);
+}
+
+TEST_F(OpenGL3Guide, BlocksAndArrays) {
+    Texture2D texture(Texture::INTERNALFORMAT_RGBA8, 8, 8, false);
+    Framebuffer framebuffer;
+    framebuffer.bind();
+    framebuffer.attachTexture(texture, 0, Framebuffer::ATTACHMENT_COLOR0);
+    TemporaryViewportScope const viewport({0, 0, 8, 8});
+    float const identity[] = {1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};
+    Program program;
+    program.loadVertexShader(kBlocks);
+    program.loadFragmentShader("#version 150\nin vec4 shade; out vec4 colour;"
+                               "void main() { colour = shade; }");
+    program.link(true);
+    // [block]
+    UniformBlock const look(program, "Look");
+    look.setBinding(2);
+    UniformBlockWriter values(look);
+    values.set("view", identity, 1);
+    values.set("tint", {1.f, 0.5f, 0.25f});
+    values.set("gains", 0.5f); // the first of four
+    Buffer buffer(look.size(), Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_DYNAMIC_DRAW, nullptr);
+    values.upload(buffer);
+    buffer.bindBase(GL_UNIFORM_BUFFER, 2);
+    // [block]
+
+    // [array]
+    struct Corner {
+        float place[2];
+        std::uint8_t shade[4];
+    };
+    Corner const corners[] = {{{-1, -1}, {255, 255, 255, 255}},
+                              {{3, -1}, {255, 255, 255, 255}},
+                              {{-1, 3}, {255, 255, 255, 255}}};
+    std::uint16_t const indices[] = {0, 1, 2};
+    Buffer const vertices(sizeof corners, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW,
+                          corners);
+    Buffer const order(sizeof indices, Buffer::TYPE_ELEMENT_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW,
+                       indices);
+    VertexArray triangle;
+    triangle.setAttribute(program.getAttributeLocation("place"), vertices,
+                          VertexArray::Attribute(2, GL_FLOAT).stride(sizeof(Corner)));
+    triangle.setAttribute(program.getAttributeLocation("weight"), vertices,
+                          VertexArray::Attribute(4, GL_UNSIGNED_BYTE)
+                              .normalised()
+                              .stride(sizeof(Corner))
+                              .offset(offsetof(Corner, shade)));
+    triangle.setIndices(order, GL_UNSIGNED_SHORT);
+
+    program.enable();
+    triangle.drawElements(GL_TRIANGLES, 3);
+    program.disable();
+    // [array]
+    std::array<unsigned char, 4> texel = {};
+    Framebuffer::Read(&framebuffer, 4, 4,
+                      MutablePixelView(texel.data(), texel.size(), PixelShape()));
+    EXPECT_EQ((std::array<unsigned char, 4>{128, 64, 32, 128}), texel);
+    Framebuffer::BindDefault();
 }
 
 TEST_F(OpenGL3Guide, FeedbackBinariesAndPipelines) {

@@ -9,6 +9,7 @@
 #include "oru/oru_ogl/ogl/mappedrange.h"
 #include "oru/oru_ogl/ogl/query.h"
 #include "oru/oru_ogl/ogl/queryscope.h"
+#include "oru/oru_ogl/ogl/statescope.h"
 #include "oru/oru_ogl/ogl/texture2.h"
 #include "oru/oru_ogl/ogl/textureunit.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -109,12 +110,11 @@ TEST_F(TimingGuide, CountsSamples) {
     auto const drawModel = [&] { ++drawn; };
     // [samples]
     Query visible(Query::TYPE_ANY_SAMPLES);
-    ORU_GL(ColorMask, GL_FALSE, GL_FALSE, GL_FALSE, GL_FALSE);
     {
+        TemporaryColorMaskScope const unseen({0, 0, 0, 0});
         QueryScope const scope(visible);
         drawBox(); // around the model: cheap
     }
-    ORU_GL(ColorMask, GL_TRUE, GL_TRUE, GL_TRUE, GL_TRUE);
     // [samples]
 
     // [conditional]
