@@ -11,7 +11,8 @@ HAND_CHECKED = {"glBegin", "glEnd", "glGetError"}
 
 # Functions that make a name, and what deletes it when the check after the call throws: the caller never
 # gets the name then.
-UNDONE_BY = {"glCreateProgram": "glDeleteProgram", "glCreateShader": "glDeleteShader"}
+UNDONE_BY = {"glCreateProgram": "glDeleteProgram", "glCreateShader": "glDeleteShader",
+             "glFenceSync": "glDeleteSync"}
 
 # Names that the generated bodies use themselves; a parameter of that name would hide them.
 RESERVED_NAMES = {"file", "line", "insideBeginEnd_", "function_", "value_"}

@@ -92,7 +92,7 @@ void VertexArrays() {
     Buffer const buffer(sizeof numbers, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STATIC_DRAW,
                         numbers.data());
     VertexArray array;
-    array.setAttribute(0, buffer, VertexArray::Attribute(4, GL_UNSIGNED_BYTE).normalised());
+    array.setAttribute(0, buffer, VertexArray::Attribute(4, GL_UNSIGNED_BYTE).normalized());
     array.setAttribute(1, buffer, VertexArray::Attribute(1, GL_INT).integer().divisor(1));
     array.disableAttribute(1);
     array.setIndices(buffer, GL_UNSIGNED_INT);

@@ -220,7 +220,7 @@ TEST_F(OpenGL3Guide, BlocksAndArrays) {
                           VertexArray::Attribute(2, GL_FLOAT).stride(sizeof(Corner)));
     triangle.setAttribute(program.getAttributeLocation("weight"), vertices,
                           VertexArray::Attribute(4, GL_UNSIGNED_BYTE)
-                              .normalised()
+                              .normalized()
                               .stride(sizeof(Corner))
                               .offset(offsetof(Corner, shade)));
     triangle.setIndices(order, GL_UNSIGNED_SHORT);

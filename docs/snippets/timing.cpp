@@ -148,7 +148,7 @@ TEST_F(TimingGuide, FillsPartsThatAreFree) {
         done[now].clientWait(1s); // what drew from this part three frames ago
         {
             MappedRange range(ring, static_cast<std::int64_t>(now) * part, part,
-                              MappedRange::ACCESS_WRITE | MappedRange::ACCESS_UNSYNCHRONISED);
+                              MappedRange::ACCESS_WRITE | MappedRange::ACCESS_UNSYNCHRONIZED);
             std::memcpy(range.data(), vertices.data(), vertices.size());
         } // unmapped; what was bound to the target is bound again
         draw(static_cast<std::int64_t>(now) * part);

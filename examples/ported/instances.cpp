@@ -119,7 +119,7 @@ Picture DrawPorted(Framebuffer &target) {
     star.setAttribute(2, instances, each({1, GL_FLOAT}, offsetof(Star, angle)));
     star.setAttribute(
         3, instances,
-        each(VertexArray::Attribute(4, GL_UNSIGNED_BYTE).normalised(), offsetof(Star, paint)));
+        each(VertexArray::Attribute(4, GL_UNSIGNED_BYTE).normalized(), offsetof(Star, paint)));
     star.setIndices(triangles, GL_UNSIGNED_SHORT);
 
     Program program = ported::MakeProgram(kVertexShader, kFragmentShader);

@@ -265,6 +265,7 @@ void Buffer::orphan() {
 
 void Buffer::copySubData(Buffer const &source, std::int64_t sourceOffset, std::int64_t offset,
                          std::int64_t size) {
+    ORU_ASSERT_SUPPORTED(GL_ARB_COPY_BUFFER);
     requireUnmapped("copySubData");
     source.requireUnmapped("copySubData");
     source.requireRange("copySubData", sourceOffset, size);

@@ -9,8 +9,9 @@ namespace ORU::OGL {
 
 /// One OpenGL buffer object, used as pixel unpack, pixel pack, array or element array buffer.
 ///
-/// `map`, `mapRange`, `unmap`, `subData`, `getSubData` and `orphan` act on what is bound to the
-/// buffer's target and do not bind: call `bind()` first. A MappedRange binds by itself.
+/// `map`, `mapRange`, `flushMappedRange`, `unmap`, `subData`, `getSubData` and `orphan` act on what
+/// is bound to the buffer's target and do not bind: call `bind()` first. A MappedRange binds by
+/// itself.
 ///
 /// ```cpp
 /// Buffer pixels(width * height * 4, Buffer::TYPE_PIXEL_UNPACK_BUFFER,
@@ -158,8 +159,7 @@ public:
     /// @name Numbered binding points
     /// Where a program finds uniform blocks, and feedback is written to. OpenGL binds the buffer to
     /// the target itself too. OpenGL 3.0, for uniform blocks 3.1 or GL_ARB_uniform_buffer_object.
-    /// @param target GL_UNIFORM_BUFFER or GL_TRANSFORM_FEEDBACK_BUFFER, or what else the context
-    /// has
+    /// @param target GL_UNIFORM_BUFFER or GL_TRANSFORM_FEEDBACK_BUFFER
     /// @param index which binding point
     /// @throws ExceptionOGL for a target that has no such point
     /// @{

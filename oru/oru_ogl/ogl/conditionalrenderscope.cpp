@@ -2,7 +2,8 @@
 #include "oru/oru_ogl/ogl/conditionalrenderscope.h"
 
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/objects/beginning.h"
+#include "oru/oru_ogl/ogl/internal/objects/pendingerror.h"
+#include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
 #include "oru/oru_ogl/ogl/query.h"
@@ -11,10 +12,6 @@
 namespace ORU::OGL {
 
 namespace {
-
-void End() {
-    ORU_GL0(EndConditionalRender);
-}
 
 #define ORU_MODE(Name)                                                                             \
     { ConditionalRenderScope::MODE_##Name, GL_QUERY_##Name }
@@ -31,11 +28,12 @@ ConditionalRenderScope::ConditionalRenderScope(Query const &query, Mode mode) {
         ORU_THROW_INTERNAL("Drawing can depend on a query of samples only: make it of "
                            "Query::TYPE_SAMPLES or TYPE_ANY_SAMPLES");
     auto const glMode = Mode2GL(mode);
-    internal::BeginScope([&] { ORU_GL(BeginConditionalRender, query.objectID(), glMode); }, End);
+    internal::ReportPendingError(__FILE__, __LINE__, "glBeginConditionalRender");
+    ORU_GL(BeginConditionalRender, query.objectID(), glMode);
 }
 
 ConditionalRenderScope::~ConditionalRenderScope() {
-    internal::Release(End);
+    internal::Release([] { ORU_GL0(EndConditionalRender); });
 }
 
 ORU_TRANSLATED(ConditionalRenderScope, Mode, kModes)

@@ -86,7 +86,9 @@ void GpuTimer::end() {
         ORU_THROW_INTERNAL("GpuTimer::end: the timer does not run. Call begin() first");
     if (std::exchange(state_, IDLE) == UNMEASURED)
         return;
+    ++missed_; // unless the second stamp is taken
     ORU_GL(QueryCounter, stamps(oldest_ + pending_)[1], GL_TIMESTAMP);
+    --missed_;
     ++pending_;
 }
 

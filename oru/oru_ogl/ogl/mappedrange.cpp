@@ -44,6 +44,7 @@ void MappedRange::requireMapping() const {
 
 void MappedRange::flush(std::int64_t offset, std::int64_t size) {
     requireMapping();
+    buffer_.bind(); // another range of the same target may have been mapped meanwhile
     buffer_.flushMappedRange(offset, size);
 }
 

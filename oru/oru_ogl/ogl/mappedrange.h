@@ -19,7 +19,8 @@ class Buffer;
 /// ```
 ///
 /// Meanwhile the buffer is bound to its target; at the end what was bound there before is bound
-/// again. OpenGL 3.0 or GL_ARB_map_buffer_range.
+/// again. The target of element arrays is the bound vertex array's own: bind no other one
+/// meanwhile. OpenGL 3.0 or GL_ARB_map_buffer_range.
 class ORU_API MappedRange {
 public:
     /// What the mapping is for; combine them with `|`. The values are OpenGL's.
@@ -30,7 +31,7 @@ public:
         ACCESS_INVALIDATE_BUFFER = 0x8, ///< GL_MAP_INVALIDATE_BUFFER_BIT: the rest may go, too
         ACCESS_FLUSH_EXPLICIT = 0x10,   ///< GL_MAP_FLUSH_EXPLICIT_BIT: `flush()` says what was
                                         ///< written
-        ACCESS_UNSYNCHRONISED = 0x20    ///< GL_MAP_UNSYNCHRONIZED_BIT: do not wait for commands
+        ACCESS_UNSYNCHRONIZED = 0x20    ///< GL_MAP_UNSYNCHRONIZED_BIT: do not wait for commands
                                         ///< that use it; the host has made sure with a Fence
     };
 
@@ -59,7 +60,7 @@ public:
     /// @param offset, size bytes, counted from `data()`
     /// @throws InternalException after `unmap()`; ExceptionOGL for a part that leaves the mapping,
     ///         and for another access
-    /// @note glFlushMappedBufferRange
+    /// @note glBindBuffer, glFlushMappedBufferRange
     void flush(std::int64_t offset, std::int64_t size);
 
     /// Ends the mapping and binds what was bound before.

@@ -85,7 +85,8 @@ public:
     PixelView begin();
 
     /// Gives the frame back, whose memory is OpenGL's again.
-    /// @throws InternalException before `begin()`
+    /// @throws InternalException before `begin()`, and when the system has lost the memory's
+    ///         contents; the frame is the oldest then still
     /// @note glUnmapBuffer
     void end();
 

@@ -26,6 +26,7 @@ ProgramPipeline::ProgramPipeline() : Object(GL_PROGRAM_PIPELINE, GL_PROGRAM_PIPE
     RequirePipelines();
     try {
         ORU_GL(GenProgramPipelines, 1, &objectID_);
+        ORU_ASSERT(objectID_ != 0);
     } catch (...) {
         deleteObject(); // an error that was pending before ends the call when the name is made
         throw;

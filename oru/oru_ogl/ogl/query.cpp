@@ -81,8 +81,12 @@ Query::~Query() {
 }
 
 void Query::deleteObject() noexcept {
-    if (ownsName())
-        internal::Release([this] { ORU_GL(DeleteQueries, 1, &objectID_); });
+    if (!ownsName())
+        return;
+    // A query that is deleted while it runs goes on, and nobody could begin another of its type.
+    if (state_ == RUNNING)
+        internal::Release([this] { ORU_GL(EndQuery, target()); });
+    internal::Release([this] { ORU_GL(DeleteQueries, 1, &objectID_); });
 }
 
 Query::Type Query::type() const {

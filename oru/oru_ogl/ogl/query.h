@@ -20,8 +20,9 @@ namespace ORU::OGL {
 ///     visible = samples.result() > 0;
 /// ```
 ///
-/// One query of a type runs at a time. Contexts that share objects do not share queries: a query is
-/// made, used and destroyed in the same context. To time frames see GpuTimer.
+/// One query of a type runs at a time, and of TYPE_SAMPLES and TYPE_ANY_SAMPLES one. Contexts that
+/// share objects do not share queries: a query is made, used and destroyed in the same context. To
+/// time frames see GpuTimer.
 class ORU_API Query : public Object {
 public:
     /// What a query tells.
@@ -40,7 +41,7 @@ public:
     explicit Query(Type type);
 
     /// A query that was made elsewhere. After a failure the name is the caller's as before.
-    /// @param type what it was, or is to be, begun with
+    /// @param type what it was begun with
     /// @throws InternalException also for a name that is no query
     /// @note glIsQuery, glGetQueryiv
     Query(unsigned int name, Type type, ownership_tag ownership);
@@ -48,7 +49,8 @@ public:
     Query(Query &&other) noexcept = default;
     Query &operator=(Query &&other) noexcept;
 
-    /// Deletes the query that the object owns, also one that runs. @note glDeleteQueries
+    /// Deletes the query that the object owns; one that runs is ended first.
+    /// @note glEndQuery, glDeleteQueries
     ~Query() override;
 
     /// What the query tells.

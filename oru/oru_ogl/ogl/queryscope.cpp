@@ -1,7 +1,8 @@
 // A query that runs for a scope.
 #include "oru/oru_ogl/ogl/queryscope.h"
 
-#include "oru/oru_ogl/ogl/internal/objects/beginning.h"
+#include "oru/oru_ogl/ogl/internal/objects/pendingerror.h"
+#include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/query.h"
 
 namespace ORU::OGL {
@@ -16,7 +17,8 @@ void End(Query &query) {
 } // namespace
 
 QueryScope::QueryScope(Query &query) : query_(query) {
-    internal::BeginScope([this] { query_.begin(); }, [this] { End(query_); });
+    internal::ReportPendingError(__FILE__, __LINE__, "glBeginQuery");
+    query_.begin();
 }
 
 QueryScope::~QueryScope() {

@@ -8,21 +8,22 @@
 namespace ORU::OGL {
 
 /// The kinds of state that a TemporaryStateScope holds.
-enum class StateKind {
-    Viewport, ///< ViewportState
-    Scissor,  ///< ScissorState
-    Depth,    ///< DepthState
-    Stencil,  ///< StencilState
-    Cull,     ///< CullState
-    ColorMask ///< ColorMaskState
+enum StateKind : unsigned int {
+    STATEKIND_VIEWPORT = 0, ///< ViewportState
+    STATEKIND_SCISSOR,      ///< ScissorState
+    STATEKIND_DEPTH,        ///< DepthState
+    STATEKIND_STENCIL,      ///< StencilState
+    STATEKIND_CULL,         ///< CullState
+    STATEKIND_COLORMASK     ///< ColorMaskState
 };
 
 // The members of the states are OpenGL's values as it tells them; 1 and 0 say on and off. They
-// begin as a new context has them.
+// begin as a new context has them, but rectangles empty.
 
-/// The rectangle that drawing is mapped to. @note glViewport
+/// The rectangle that drawing is mapped to. Of several viewports the first one's is read, and all
+/// are set. @note glViewport
 struct ViewportState {
-    static constexpr StateKind kKind = StateKind::Viewport; ///< its row of the table
+    static constexpr StateKind kKind = STATEKIND_VIEWPORT; ///< its row of the table
 
     int x = 0;      ///< pixels from the left
     int y = 0;      ///< pixels from the bottom
@@ -30,9 +31,10 @@ struct ViewportState {
     int height = 0; ///< pixels
 };
 
-/// The rectangle outside which nothing is drawn or cleared. @note glScissor; glEnable or glDisable
+/// The rectangle outside which nothing is drawn or cleared. Of several viewports the first one's is
+/// read, and all are set. @note glScissor; glEnable or glDisable
 struct ScissorState {
-    static constexpr StateKind kKind = StateKind::Scissor; ///< its row of the table
+    static constexpr StateKind kKind = STATEKIND_SCISSOR; ///< its row of the table
 
     int enabled = 0; ///< GL_SCISSOR_TEST
     int x = 0;       ///< pixels from the left
@@ -43,7 +45,7 @@ struct ScissorState {
 
 /// The depth test. @note glDepthMask, glDepthFunc; glEnable or glDisable
 struct DepthState {
-    static constexpr StateKind kKind = StateKind::Depth; ///< its row of the table
+    static constexpr StateKind kKind = STATEKIND_DEPTH; ///< its row of the table
 
     int enabled = 0;       ///< GL_DEPTH_TEST
     int writes = 1;        ///< whether depths that pass are written
@@ -61,10 +63,11 @@ struct StencilFace {
     unsigned int writes = ~0u; ///< the bits that are written
 };
 
-/// The stencil test. OpenGL 2.0. @note glStencilFuncSeparate, glStencilOpSeparate,
-/// glStencilMaskSeparate; glEnable or glDisable
+/// The stencil test. OpenGL 2.0. It tells masks and references as what the stencil buffer that is
+/// bound has bits for: let `change` alter what is found, and no more is set than that. @note
+/// glStencilFuncSeparate, glStencilOpSeparate, glStencilMaskSeparate; glEnable or glDisable
 struct StencilState {
-    static constexpr StateKind kKind = StateKind::Stencil; ///< its row of the table
+    static constexpr StateKind kKind = STATEKIND_STENCIL; ///< its row of the table
 
     int enabled = 0;   ///< GL_STENCIL_TEST
     StencilFace front; ///< of triangles that face the viewer, of lines and points
@@ -73,7 +76,7 @@ struct StencilState {
 
 /// Which triangles are left out. @note glCullFace, glFrontFace; glEnable or glDisable
 struct CullState {
-    static constexpr StateKind kKind = StateKind::Cull; ///< its row of the table
+    static constexpr StateKind kKind = STATEKIND_CULL; ///< its row of the table
 
     int enabled = 0;    ///< GL_CULL_FACE
     int side = 0x0405;  ///< the one that is left out: GL_BACK, GL_FRONT or GL_FRONT_AND_BACK
@@ -83,7 +86,7 @@ struct CullState {
 /// Which components of a colour are written. Of several colour buffers with masks of their own the
 /// first one's is read, and all are set. @note glColorMask
 struct ColorMaskState {
-    static constexpr StateKind kKind = StateKind::ColorMask; ///< its row of the table
+    static constexpr StateKind kKind = STATEKIND_COLORMASK; ///< its row of the table
 
     int red = 1;   ///< whether written
     int green = 1; ///< whether written

@@ -29,6 +29,7 @@ TransformFeedback::TransformFeedback()
     RequireObjects();
     try {
         ORU_GL(GenTransformFeedbacks, 1, &objectID_);
+        ORU_ASSERT(objectID_ != 0);
     } catch (...) {
         deleteObject(); // an error that was pending before ends the call when the name is made
         throw;

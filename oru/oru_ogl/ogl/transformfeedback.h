@@ -58,8 +58,7 @@ public:
     /// Captures into a part of a buffer.
     /// @param offset, size bytes, multiples of 4
     /// @throws InternalException for a part that is empty or leaves the buffer, and for numbers
-    /// that
-    ///         are no multiples of 4
+    ///         that are no multiples of 4
     void setBuffer(unsigned int index, Buffer const &buffer, std::size_t offset, std::size_t size);
 
     /// Draws as many vertices as were captured last, of the vertex array that is bound.

@@ -3,7 +3,8 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/objects/beginning.h"
+#include "oru/oru_ogl/ogl/internal/objects/pendingerror.h"
+#include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/transformfeedback.h"
 #include "oru/oru_ogl/platformgl.h"
@@ -25,7 +26,8 @@ void End() {
 TransformFeedbackScope::TransformFeedbackScope(unsigned int primitive) {
     ORU_ASSERT_TEXT("Transform feedback needs a current context of OpenGL 3.0",
                     internal::Supports(GL_VERSION_3_0));
-    internal::BeginScope([=] { ORU_GL(BeginTransformFeedback, primitive); }, End);
+    internal::ReportPendingError(__FILE__, __LINE__, "glBeginTransformFeedback");
+    ORU_GL(BeginTransformFeedback, primitive);
 }
 
 TransformFeedbackScope::TransformFeedbackScope(TransformFeedback &feedback, unsigned int primitive)

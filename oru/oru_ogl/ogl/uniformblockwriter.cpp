@@ -61,6 +61,15 @@ bool Takes(GLenum component, GLenum kind) {
            (component == GL_BOOL && (kind == GL_INT || kind == GL_UNSIGNED_INT));
 }
 
+/// Bytes from the block's beginning to the end of an element of a member.
+std::size_t EndOf(UniformBlock::Member const &member, TypeRow const &row, std::size_t number,
+                  unsigned int element) {
+    bool const isInRows = member.isRowMajor;
+    std::size_t const lines = isInRows ? row.rows : row.columns;
+    return member.offset + std::size_t{element} * member.arrayStride +
+           (lines - 1) * member.matrixStride + number * (isInRows ? row.columns : row.rows);
+}
+
 /// Copies a multiple of 4 bytes, so few that a call would take as long again.
 void Copy(unsigned char *to, unsigned char const *from, std::size_t bytes) {
     constexpr std::size_t kVector = 4 * sizeof(GLfloat);
@@ -104,10 +113,14 @@ void UniformBlockWriter::put(UniformBlock::Member const &member, Kind kind, void
     if (first > member.count || count > member.count - first)
         ORU_THROW_INTERNAL(ComposeText("The uniform \"", member.name, "\" has ", member.count,
                                        " elements, and was given ", count, " from ", first, " on"));
+    std::size_t const number = kind == DOUBLE ? sizeof(GLdouble) : sizeof(GLfloat);
+    if (count > 0 && EndOf(member, row, number, first + count - 1) > bytes_.size())
+        ORU_THROW_INTERNAL(ComposeText("The uniform \"", member.name,
+                                       "\" is of another block than \"", block_.name(),
+                                       "\": it would lie behind it"));
     auto const *from = static_cast<unsigned char const *>(values);
     unsigned char *element =
         bytes_.data() + member.offset + std::size_t{first} * member.arrayStride;
-    std::size_t const number = kind == DOUBLE ? sizeof(GLdouble) : sizeof(GLfloat);
     std::size_t const column = number * row.rows;
     for (; count > 0; --count, element += member.arrayStride, from += column * row.columns) {
         if (member.isRowMajor)

@@ -55,7 +55,8 @@ public:
     /// @}
 
     /// @name Vectors, matrices, arrays
-    /// Vectors lie one after the other without gaps, and so do the columns of a matrix, however the
+    /// Of floats, doubles, ints and unsigned ints; several bools are given as ints. Vectors lie one
+    /// after the other without gaps, and so do the columns of a matrix, however the
     /// block has them.
     /// @{
 
@@ -93,6 +94,9 @@ private:
     static constexpr Kind KindOf(double) { return DOUBLE; }
     static constexpr Kind KindOf(int) { return INT; }
     static constexpr Kind KindOf(unsigned int) { return UNSIGNED; }
+    // Smaller numbers, bools among them, would be promoted here and read as ints from memory.
+    template<class Number>
+    static constexpr Kind KindOf(Number) = delete;
 
     UniformBlock::Member const &find(std::string_view name) const { return block_.member(name); }
     static UniformBlock::Member const &find(UniformBlock::Member const &member) { return member; }

@@ -61,6 +61,7 @@ void WithBuffer(GLenum target, GLenum binding, GLuint name, Step step) {
 
 template<class Step>
 void WithPatches(int vertices, Step step) {
+    ORU_ASSERT_SUPPORTED(GL_ARB_TESSELLATION_SHADER);
     WithState(
         GL_PATCH_VERTICES, static_cast<GLuint>(vertices),
         [](GLuint count) { ORU_GL(PatchParameteri, GL_PATCH_VERTICES, static_cast<GLint>(count)); },
@@ -70,6 +71,7 @@ void WithPatches(int vertices, Step step) {
 /// Runs a draw with the buffer bound that has its numbers.
 template<class Draw>
 void WithCommands(Buffer const &commands, std::int64_t offset, std::int64_t size, Draw draw) {
+    ORU_ASSERT_SUPPORTED(GL_ARB_DRAW_INDIRECT);
     if (offset < 0 || offset % 4 != 0 || offset > static_cast<std::int64_t>(commands.size()) - size)
         ORU_THROW_INTERNAL(ComposeText("A draw of ", size, " bytes in the buffer of ",
                                        commands.size(), " cannot stand at ", offset,
@@ -159,9 +161,9 @@ void VertexArray::setAttribute(int location, Buffer const &buffer, Attribute con
                        offset);
                 break;
             case Attribute::KIND_FLOAT:
-            case Attribute::KIND_NORMALISED:
+            case Attribute::KIND_NORMALIZED:
                 ORU_GL(VertexAttribPointer, index, components, attribute.type_,
-                       attribute.kind_ == Attribute::KIND_NORMALISED, attribute.stride_, offset);
+                       attribute.kind_ == Attribute::KIND_NORMALIZED, attribute.stride_, offset);
             }
         });
         // Where there are no divisors, all attributes are for each vertex already.

@@ -16,7 +16,7 @@ class Buffer;
 /// VertexArray array;
 /// array.setAttribute(program.getAttributeLocation("place"), corners, {3, GL_FLOAT});
 /// array.setAttribute(program.getAttributeLocation("shade"), shades,
-///                    VertexArray::Attribute(4, GL_UNSIGNED_BYTE).normalised());
+///                    VertexArray::Attribute(4, GL_UNSIGNED_BYTE).normalized());
 /// array.setIndices(triangles, GL_UNSIGNED_SHORT);
 /// array.drawElements(GL_TRIANGLES, 36);
 /// ```
@@ -25,8 +25,8 @@ class Buffer;
 /// primitive is, GL_TRIANGLES say or VertexBuffer::PrimitiveType, is OpenGL's to judge.
 ///
 /// A draw binds the vertex array and then again what was bound before; of a bound one it only asks
-/// whether it is, and within a VertexArrayBindScope not even that. Contexts that share objects do not share vertex
-/// arrays: one is made, used and destroyed in the same context. OpenGL 3.0, or
+/// whether it is, and within a VertexArrayBindScope not even that. Contexts that share objects do
+/// not share vertex arrays: one is made, used and destroyed in the same context. OpenGL 3.0, or
 /// GL_ARB_vertex_array_object with OpenGL 2.0.
 class ORU_API VertexArray : public Object {
 public:
@@ -36,7 +36,7 @@ public:
         /// What the shader gets.
         enum Kind : unsigned int {
             KIND_FLOAT = 0,  ///< floats; integers in the buffer become floats of the same value
-            KIND_NORMALISED, ///< floats; integers become 0 to 1, those with a sign -1 to 1
+            KIND_NORMALIZED, ///< floats; integers become 0 to 1, those with a sign -1 to 1
             KIND_INTEGER,    ///< integers, for int, uint and their vectors; OpenGL 3.0
             KIND_DOUBLE      ///< doubles, for double and its vectors; GL_ARB_vertex_attrib_64bit
         };
@@ -49,7 +49,7 @@ public:
 
         /// @name Changes, each of which returns the attribute
         /// @{
-        Attribute &normalised() { return setKind(KIND_NORMALISED); } ///< See KIND_NORMALISED.
+        Attribute &normalized() { return setKind(KIND_NORMALIZED); } ///< See KIND_NORMALIZED.
         Attribute &integer() { return setKind(KIND_INTEGER); }       ///< See KIND_INTEGER.
         Attribute &asDouble() { return setKind(KIND_DOUBLE); }       ///< See KIND_DOUBLE.
 

@@ -7,14 +7,27 @@
 
 namespace ORU::OGL {
 
+namespace {
+
+/// The innermost scope: what the others hold is not bound meanwhile.
+thread_local VertexArrayBindScope const *gInnermost = nullptr;
+
+} // namespace
+
 VertexArrayBindScope::VertexArrayBindScope(VertexArray const &array)
-    : array_(array), previous_(array.getBoundID()), wasHeld_(array.isHeld_) {
+    : array_(array), previous_(array.getBoundID()), outer_(gInnermost) {
     array_.bind();
+    if (outer_)
+        outer_->array_.isHeld_ = false;
     array_.isHeld_ = true;
+    gInnermost = this;
 }
 
 VertexArrayBindScope::~VertexArrayBindScope() {
-    array_.isHeld_ = wasHeld_;
+    array_.isHeld_ = false;
+    if (outer_)
+        outer_->array_.isHeld_ = true;
+    gInnermost = outer_;
     internal::Release([this] { ORU_GL(BindVertexArray, previous_); });
 }
 

@@ -18,8 +18,9 @@ class VertexArray;
 /// }
 /// ```
 ///
-/// While it lives, let nobody bind another vertex array but by another scope, and move neither of
-/// the two.
+/// While it lives, let nobody bind another vertex array but by another scope, and draw no
+/// VertexBuffer, which leaves none bound. The vertex array outlives the scope and stays where it
+/// is.
 class ORU_API VertexArrayBindScope {
 public:
     /// @note glGetIntegerv, glBindVertexArray
@@ -33,8 +34,8 @@ public:
 
 private:
     VertexArray const &array_;
-    unsigned int previous_; ///< the name that was bound
-    bool wasHeld_;          ///< by a scope around this one
+    unsigned int previous_;             ///< the name that was bound
+    VertexArrayBindScope const *outer_; ///< the scope around this one
 };
 
 } // namespace ORU::OGL

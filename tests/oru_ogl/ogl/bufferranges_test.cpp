@@ -73,7 +73,7 @@ TEST_F(BufferRangesTest, MoveByEveryWay) {
                 for (GLenum const access : {0u, 0u | MappedRange::ACCESS_INVALIDATE_RANGE,
                                             0u | MappedRange::ACCESS_FLUSH_EXPLICIT,
                                             0u | MappedRange::ACCESS_INVALIDATE_RANGE |
-                                                MappedRange::ACCESS_UNSYNCHRONISED}) {
+                                                MappedRange::ACCESS_UNSYNCHRONIZED}) {
                     Buffer third = Make(rest);
                     write(third, to, count, piece, access);
                     EXPECT_TRUE(occupant.isBound());

@@ -84,7 +84,7 @@ TEST_F(VertexArrayTest, ReadsAttributesOfEveryKind) {
     auto const same = [](auto number) { return number; };
     ExpectAll<float>("vec4", {4, GL_FLOAT}, 0.25f, same);
     ExpectAll<std::uint8_t>("vec4", {4, GL_UNSIGNED_BYTE}, 3, same);
-    ExpectAll<std::uint8_t>("vec4", Attribute(4, GL_UNSIGNED_BYTE).normalised(), 17,
+    ExpectAll<std::uint8_t>("vec4", Attribute(4, GL_UNSIGNED_BYTE).normalized(), 17,
                             [](float number) { return number / 255; });
     ExpectAll<std::int16_t>("vec4", {4, GL_SHORT}, 1001, same);
     ExpectAll<std::int32_t>("ivec4", Attribute(4, GL_INT).integer(), 1000001, same);
@@ -176,8 +176,12 @@ TEST_F(VertexArrayTest, DrawsByEveryWay) {
             EXPECT_EQ(calls->count("DrawArrays"), calls->total());
         }
         EXPECT_TRUE(other.isBound());
-        array.drawArrays(points, 0, 1);
-        EXPECT_TRUE(other.isBound());
+        EXPECT_EQ(expected,
+                  DrawnInto(kCount, [&] { array.drawArraysInstanced(points, 0, 1, kCount); }))
+            << "another than the one that the scope holds";
+        VertexArrayBindScope const inner(array);
+        other.drawArrays(points, 0, 0);
+        EXPECT_TRUE(array.isBound()) << "an inner scope's";
     }
     EXPECT_TRUE(array.isBound());
     VertexArray::BindDefault();

@@ -30,9 +30,9 @@ inline void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const
 
 /// The same after a call that made a name, which goes before the exception does: nobody else has
 /// it.
-inline void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const *file,
-                             unsigned int line, char const *function,
-                             void(ORU_APIENTRY *deleteName)(GLuint), GLuint name) {
+template<class Name>
+void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const *file, unsigned int line,
+                      char const *function, void(ORU_APIENTRY *deleteName)(Name), Name name) {
     if (insideBeginEnd.load(std::memory_order_relaxed))
         return;
     if (GLenum const error = ::glGetError()) {

@@ -2,6 +2,8 @@
 #pragma once
 
 #include "oru/oru_ogl/ogl/internal/objects/ending.h"
+#include "oru/oru_ogl/ogl/internal/objects/pendingerror.h"
+#include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/pixelview.h"
 
@@ -21,6 +23,7 @@ void CheckLevel(Texture const &texture, PixelShape const &pixels, int level, std
 /// after a failure.
 template<class Read>
 void WithPackState(PixelShape const &pixels, Read read) {
+    ReportPendingError(__FILE__, __LINE__, "glPushClientAttrib");
     PixelStorageScope saved(kPackStorage);
     Ending restore([&saved] { saved.restore(); });
     auto const set = [](GLenum parameter, std::uint64_t value) {
@@ -31,10 +34,11 @@ void WithPackState(PixelShape const &pixels, Read read) {
     set(GL_PACK_ROW_LENGTH, pixels.rowLength);
     set(GL_PACK_SKIP_PIXELS, 0);
     set(GL_PACK_SKIP_ROWS, 0);
-    if (pixels.depth > 1) {
+    if (pixels.depth > 1)
         set(GL_PACK_IMAGE_HEIGHT, pixels.imageHeight);
+    // Counts for a three-dimensional texture of one image, too.
+    if (CurrentRecord(&ExtensionManager::supportsTexture3D))
         set(GL_PACK_SKIP_IMAGES, 0);
-    }
     set(GL_PACK_ALIGNMENT, pixels.alignment);
     read();
     restore.now();
@@ -49,6 +53,7 @@ void Upload(SendPart<Sides> send, Part<Sides> const &part, Texture::InternalForm
     CheckSides(shape, Sides);
     RequireSameKind(format, shape.format);
     PixelLayout const layout = LayoutOf(shape.format, shape.type);
+    ReportPendingError(__FILE__, __LINE__, "glPushClientAttrib");
     PixelStorageScope saved(kUnpackStorage);
     Ending restore([&saved] { saved.restore(); });
     shape.unpackParameters().apply();
