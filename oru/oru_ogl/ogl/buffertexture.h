@@ -16,12 +16,14 @@ public:
     /// not tell.
     /// @param format one of 8, 16 or 32 bits a channel with a size in its name, INTERNALFORMAT_R8
     ///        and not INTERNALFORMAT_RED
-    /// @throws InternalException without OpenGL 3.1 or GL_ARB_texture_buffer_object; ExceptionOGL
-    ///         for a format that buffer textures do not have
+    /// @throws InternalException without OpenGL 3.1 or GL_ARB_texture_buffer_object, and for a
+    ///         format whose texels have no size; ExceptionOGL for one that buffer textures do not
+    ///         have
     /// @note glTexBuffer, glTexBufferARB
     BufferTexture(InternalFormat format, Buffer const &buffer);
 
-    /// A texture that was made elsewhere, and has a buffer. Failures as Texture2D's.
+    /// A texture that was made elsewhere, and has a buffer; one of INTERNALFORMAT_R8 says
+    /// INTERNALFORMAT_RED. Failures as Texture2D's.
     BufferTexture(unsigned int name, ownership_tag ownership);
 
     BufferTexture(BufferTexture &&other) noexcept = default;

@@ -35,7 +35,7 @@ GLenum ColorAttachment(unsigned int colorIndex) {
 /// Calls `attach` with the GL points that a point stands for.
 template<class Attach>
 void ForEachPoint(Framebuffer::AttachmentPoint point, Attach attach) {
-    if (point == Framebuffer::ATTACHMENT_NONE)
+    if (point >= Framebuffer::ATTACHMENT_NONE)
         ORU_THROW_INTERNAL("Nothing can be attached at ATTACHMENT_NONE: name a colour, depth or "
                            "stencil");
     if (point < Framebuffer::ATTACHMENT_DEPTH)
@@ -245,7 +245,16 @@ void Framebuffer::setDrawBuffers(std::initializer_list<AttachmentPoint> points) 
 
 void Framebuffer::setReadBuffer(AttachmentPoint point) {
     requireBound("Framebuffer object must be bound before its draw and read buffers are set");
-    ORU_GL(ReadBuffer, ColorBuffer(point));
+    GLenum const buffer = ColorBuffer(point);
+    // It is set for what is read, which need not be what is drawn into, and bound.
+    if (internal::Supports(GL_ARB_FRAMEBUFFER_OBJECT)) {
+        GLint read = 0;
+        ORU_GL(GetIntegerv, GL_READ_FRAMEBUFFER_BINDING, &read);
+        if (static_cast<unsigned int>(read) != objectID())
+            ORU_THROW_INTERNAL("Another framebuffer is bound to be read from: bind() this one "
+                               "before its read buffer is set");
+    }
+    ORU_GL(ReadBuffer, buffer);
 }
 
 void Framebuffer::detach(Texture2 *texture, unsigned int colorIndex) {

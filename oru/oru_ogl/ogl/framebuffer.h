@@ -47,7 +47,9 @@ public:
 
     /// The attachment point of a colour index.
     static constexpr AttachmentPoint Color(unsigned int index) {
-        return static_cast<AttachmentPoint>(index);
+        // One beyond all colours stays one, and is refused as such where it is used.
+        return static_cast<AttachmentPoint>(index < ATTACHMENT_DEPTH ? index
+                                                                     : ATTACHMENT_DEPTH - 1);
     }
 
     /// What `Blit` copies; several are joined by `|`.
@@ -207,7 +209,8 @@ public:
                         size2 const &size);
 
     /// @name Clear a rectangle
-    /// Whether or not the scissor test is on; colour, depth and stencil masks count.
+    /// Whether or not the scissor test is on; colour, depth and stencil masks count. Nothing is
+    /// cleared while GL_RASTERIZER_DISCARD is on, or a ConditionalRenderScope drops it.
     /// @param framebuffer null for the window's own
     /// @param part what is cleared, or null for all; put back afterwards is the scissor rectangle
     /// @throws InternalException without OpenGL 3.0, or for an empty rectangle; ExceptionOGL when

@@ -7,11 +7,12 @@
 #include "oru/oru_ogl/ogl/internal/objects/ending.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
-#include "oru/oru_ogl/ogl/internal/textures/texturestorage.h"
 #include "oru/oru_ogl/ogl/internal/textures/viewtransfer.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <algorithm>
 #include <array>
+#include <limits>
 #include <optional>
 
 namespace ORU::OGL {
@@ -63,14 +64,23 @@ struct Edges {
     GLint x0, y0, x1, y1;
     GLsizei width, height;
 
+    /// A side whose far end is a number of OpenGL's, too: a blit takes wrapped ones for a mirrored
+    /// rectangle.
+    static GLsizei Length(GLint from, std::size_t size) {
+        constexpr GLint kLargest = std::numeric_limits<GLint>::max();
+        if (size > static_cast<std::size_t>(kLargest - std::max(from, 0)))
+            ORU_THROW_INTERNAL(ComposeText("A framebuffer's rectangle cannot reach ", size,
+                                           " pixels beyond ", from, ": no framebuffer does"));
+        return static_cast<GLsizei>(size);
+    }
+
     explicit Edges(IntegerRect const &rect) {
         if (rect.isEmpty())
             ORU_THROW_INTERNAL("A framebuffer's rectangle is empty: give it a width and a height");
-        auto const sides = internal::ToSides(rect.width(), rect.height());
         x0 = rect.offset().x;
         y0 = rect.offset().y;
-        width = sides[0];
-        height = sides[1];
+        width = Length(x0, rect.width());
+        height = Length(y0, rect.height());
         x1 = x0 + width;
         y1 = y0 + height;
     }
@@ -292,7 +302,7 @@ void Framebuffer::Read(Framebuffer const *framebuffer, IntegerRect const &part,
     internal::PixelLayout const layout = internal::LayoutOf(format, type);
     ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
     TargetScope bound(GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING, framebuffer);
-    internal::WithPackAlignment(alignment, [&] {
+    internal::KeepingPackAlignment(alignment, [&] {
         ORU_GL(ReadPixels, edges.x0, edges.y0, edges.width, edges.height, layout.format,
                layout.type, dst);
     });
@@ -309,7 +319,7 @@ void Framebuffer::Read(Framebuffer const *framebuffer, IntegerRect const &part,
     ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
     internal::BecomePackBuffer(*buffer);
     TargetScope bound(GL_READ_FRAMEBUFFER, GL_READ_FRAMEBUFFER_BINDING, framebuffer);
-    internal::WithPackAlignment(alignment, [&] {
+    internal::KeepingPackAlignment(alignment, [&] {
         internal::ReadInto(*buffer, offset, [&](void *pixels) {
             ORU_GL(ReadPixels, edges.x0, edges.y0, edges.width, edges.height, layout.format,
                    layout.type, pixels);

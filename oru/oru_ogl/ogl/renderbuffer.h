@@ -64,7 +64,9 @@ public:
     /// The largest width and height in pixels. @note glGetIntegerv
     static int MaxSize();
 
-    /// The most samples of a pixel. @note glGetIntegerv
+    /// The most samples of a pixel.
+    /// @throws ExceptionOGL where the context has no renderbuffers of several samples
+    /// @note glGetIntegerv
     static int MaxSamples();
 
     /// Whether the current context has GL_EXT_framebuffer_object; false without a context.

@@ -1,6 +1,9 @@
 // One stage of a GLSL program: its source and its compilation.
 #include "oru/oru_ogl/ogl/shader.h"
 
+#include "oru/core/utility/composetext.h"
+#include <limits>
+
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/ogl/internal/shaderimplcore.h"
 
@@ -55,6 +58,10 @@ void Shader::load(std::string const &source) {
 
 void Shader::loadSource(std::string_view source) {
     char const *const text = source.empty() ? "" : source.data();
+    // OpenGL would take a length that wraps around to less than 0 for a text that ends with a zero.
+    if (source.size() > static_cast<std::size_t>(std::numeric_limits<int>::max()))
+        ORU_THROW_INTERNAL(ComposeText("A shader's source of ", source.size(),
+                                       " bytes is longer than OpenGL counts"));
     int const length = static_cast<int>(source.size());
     load(1, &text, &length);
 }

@@ -42,6 +42,13 @@ Texture::InternalFormat FormatOf(GLenum gl) {
         return Texture::INTERNALFORMAT_RED;
     if (gl == GL_RG8)
         return Texture::INTERNALFORMAT_RG;
+    // Names without a size, as they stand in many a call of other code.
+    if (gl == GL_DEPTH_STENCIL)
+        return Texture::INTERNALFORMAT_DEPTH24_STENCIL8;
+    if (gl == GL_SRGB)
+        return Texture::INTERNALFORMAT_SRGB8;
+    if (gl == GL_SRGB_ALPHA)
+        return Texture::INTERNALFORMAT_SRGB8_ALPHA8;
     if (auto const *const row = internal::kInternalFormats.findGL(gl))
         return row->value;
     auto const *const row = internal::kLaterFormats.findGL(gl);
@@ -89,7 +96,14 @@ Texture::Texture(Target target, TargetBinding binding, unsigned int name, owners
         depth_ = ofLevel0(GL_TEXTURE_DEPTH);
     if (width_ == 0)
         ORU_THROW_INTERNAL(ComposeText("The texture ", name, " has no level 0 yet"));
-    format_ = FormatOf(ofLevel0(GL_TEXTURE_INTERNAL_FORMAT));
+    GLenum internalFormat = ofLevel0(GL_TEXTURE_INTERNAL_FORMAT);
+    if (internalFormat == GL_DEPTH_COMPONENT) {
+        unsigned int const bits = ofLevel0(GL_TEXTURE_DEPTH_SIZE);
+        internalFormat = bits <= 16   ? GL_DEPTH_COMPONENT16
+                         : bits <= 24 ? GL_DEPTH_COMPONENT24
+                                      : GL_DEPTH_COMPONENT32;
+    }
+    format_ = FormatOf(internalFormat);
     bound.restore();
 }
 

@@ -362,7 +362,7 @@ public:
     /// @note glTexParameteri
     void setCompare(Compare compare);
 
-    /// The levels that are sampled and that `generateMipmap` makes.
+    /// The levels that are sampled; `generateMipmap` makes those after the first.
     /// @param first, last levels counted from 0
     /// @throws InternalException for a last one before the first, or beyond what OpenGL counts
     /// @note glTexParameteri; needs OpenGL 1.2

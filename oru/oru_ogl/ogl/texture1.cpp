@@ -107,7 +107,7 @@ void Texture1::getPixelData(MutablePixelView const &pixels, int level) const {
 }
 
 void Texture1::readLevel(int level, PixelShape const &shape, void *pixels) const {
-    internal::CheckLevel(*this, shape, level, width(static_cast<unsigned>(level)), 1, 1);
+    internal::CheckLevel(*this, target(), shape, level);
     internal::ReadLevel(target(), level, shape, pixels);
 }
 

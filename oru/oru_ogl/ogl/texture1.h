@@ -71,7 +71,8 @@ public:
     /// @param pixels as many as the level has texels
     /// @throws InternalException when the texture is not bound, and for pixels of other sides than
     ///         the level's
-    /// @note glGetTexImage, with glPixelStorei and what saves its state around it
+    /// @note glGetTexLevelParameteriv; glGetTexImage, with glPixelStorei and what saves its state
+    ///       around it
     void getPixelData(MutablePixelView const &pixels, int level) const;
 
     /// Bytes that level 0 takes in memory when its rows have no gaps, whatever the level.

@@ -65,12 +65,8 @@ void Texture2::allocate(bool mipmapped, Type type) {
     unsigned int const glType = type == TYPE_NONE ? internal::StorageType(format()) : Type2GL(type);
     bool const layered = target() == GL_TEXTURE_1D_ARRAY;
     auto const allocateLevel = [&](GLint level, std::array<GLsizei, 2> const &sides) {
-        if (IsCompressed(format()))
-            ORU_GL(CompressedTexImage2D, target(), level, InternalFormat2GL(format()), sides[0],
-                   sides[1], 0, internal::CompressedBytes(format(), sides[0], sides[1]), nullptr);
-        else
-            ORU_GL(TexImage2D, target(), level, glInternalFormat, sides[0], sides[1], 0, glFormat,
-                   glType, clientStorage_);
+        ORU_GL(TexImage2D, target(), level, glInternalFormat, sides[0], sides[1], 0, glFormat,
+               glType, clientStorage_);
     };
     internal::ForEachLevel(internal::ToSides(width(0), height(0)), layered ? 1 : 2, mipmapped,
                            allocateLevel);
@@ -127,8 +123,10 @@ void Texture2::compressedSubImage(int level, int x, int y, std::uint64_t width,
     checkPart("subimage", level, width, height);
     checkCompressed(width, height, 1, bytes);
     auto const sides = internal::ToSides(width, height, bytes);
-    ORU_GL(CompressedTexSubImage2D, target(), level, x, y, sides[0], sides[1],
-           InternalFormat2GL(format()), sides[2], data);
+    internal::KeepingUnpackState(PixelUnpackParameters(), [&] {
+        ORU_GL(CompressedTexSubImage2D, target(), level, x, y, sides[0], sides[1],
+               InternalFormat2GL(format()), sides[2], data);
+    });
     imageChanged(level);
 }
 
@@ -136,7 +134,7 @@ void Texture2::getCompressedData(void *dst, std::size_t bytes, int level) const 
     if (!isBound())
         ORU_THROW_INTERNAL("Texture must be bound");
     checkCompressedLevel(level, 1, bytes);
-    ORU_GL(GetCompressedTexImage, target(), level, dst);
+    internal::ReadBlocks(target(), level, dst, bytes);
 }
 
 void Texture2::copyTexSubImage(int level, int xOffset, int yOffset, int x, int y,
@@ -182,9 +180,7 @@ void Texture2::getPixelData(MutablePixelView const &pixels, int level) const {
 }
 
 void Texture2::readLevel(int level, PixelShape const &shape, void *pixels) const {
-    auto const halvings = static_cast<unsigned>(level);
-    unsigned const ofRows = target() == GL_TEXTURE_1D_ARRAY ? 0 : halvings; // layers stay as many
-    internal::CheckLevel(*this, shape, level, width(halvings), height(ofRows), 1);
+    internal::CheckLevel(*this, target(), shape, level);
     internal::ReadLevel(target(), level, shape, pixels);
 }
 

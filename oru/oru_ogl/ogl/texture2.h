@@ -62,15 +62,18 @@ public:
     /// @param data `bytes` bytes, or an offset into the pixel unpack buffer while one is bound
     /// @throws InternalException for a size or level out of range, for a format that is not
     ///         compressed, and for another number of bytes than the blocks take (see `SizeInBytes`)
-    /// @note glCompressedTexSubImage2D; needs OpenGL 1.3
+    /// @note glCompressedTexSubImage2D, with glPixelStorei and what saves its state around it;
+    /// needs OpenGL 1.3
     void compressedSubImage(int level, int x, int y, std::uint64_t width, std::uint64_t height,
                             void const *data, std::size_t bytes);
 
     /// Reads the compressed blocks of a level.
-    /// @param dst, bytes memory, of `compressedSize(level)` bytes
+    /// @param dst, bytes memory, of `compressedSize(level)` bytes; an offset while a pixel pack
+    ///        buffer is bound
     /// @throws InternalException when the texture is not bound, for a format that is
     ///         not compressed, and for another number of bytes
-    /// @note glGetCompressedTexImage; needs OpenGL 1.3
+    /// @note glGetTexLevelParameteriv; glGetCompressedTexImage, with glPixelStorei and what saves
+    ///       its state around it; needs OpenGL 1.3
     void getCompressedData(void *dst, std::size_t bytes, int level) const;
 
     /// Copies a rectangle of the current read framebuffer, beginning at (x, y).
@@ -99,7 +102,8 @@ public:
     /// @param pixels as many as the level has texels
     /// @throws InternalException when the texture is not bound, and for pixels of other sides than
     ///         the level's
-    /// @note glGetTexImage, with glPixelStorei and what saves its state around it
+    /// @note glGetTexLevelParameteriv; glGetTexImage, with glPixelStorei and what saves its state
+    ///       around it
     void getPixelData(MutablePixelView const &pixels, int level) const;
 
     /// Bytes that level 0 takes in memory when its rows have no gaps, whatever the level.

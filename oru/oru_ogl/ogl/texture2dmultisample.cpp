@@ -30,9 +30,14 @@ Texture2DMultisample::Texture2DMultisample(InternalFormat format, std::uint64_t 
 Texture2DMultisample::Texture2DMultisample(unsigned int name, ownership_tag ownership)
     : Texture(TARGET_TEXTURE_2D_MULTISAMPLE, TARGETBINDING_TEXTURE_BINDING_2D_MULTISAMPLE, name,
               ownership) {
-    internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
-    readSamples();
-    bound.restore();
+    try {
+        internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
+        readSamples();
+        bound.restore();
+    } catch (...) {
+        disown(); // the name is the caller's still, and the base's destructor would delete it
+        throw;
+    }
 }
 
 Texture2DMultisample::~Texture2DMultisample() = default;
@@ -46,7 +51,7 @@ void Texture2DMultisample::readSamples() {
 unsigned int Texture2DMultisample::MaxSamples() {
     ORU_ASSERT_SUPPORTED(GL_ARB_TEXTURE_MULTISAMPLE);
     GLint most = 0;
-    ORU_GL(GetIntegerv, GL_MAX_SAMPLES, &most);
+    ORU_GL(GetIntegerv, GL_MAX_COLOR_TEXTURE_SAMPLES, &most);
     return static_cast<unsigned int>(most);
 }
 

@@ -34,7 +34,7 @@ public:
         return samples_;
     }
 
-    /// The most samples of any format; integers and depth may have fewer.
+    /// The most samples of a format of colours; integers and depth may have fewer.
     /// @throws InternalException where there are no such textures
     /// @note glGetIntegerv
     static unsigned int MaxSamples();

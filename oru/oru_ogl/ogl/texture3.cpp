@@ -46,14 +46,8 @@ Texture3::Texture3(Target target, TargetBinding binding, InternalFormat format, 
         unsigned int const glFormat = getGLFormat(format);
         internal::ForEachLevel(
             level0, halved, mipmapped, [&](GLint level, std::array<GLsizei, 3> const &sides) {
-                if (IsCompressed(format))
-                    ORU_GL(CompressedTexImage3D, this->target(), level, InternalFormat2GL(format),
-                           sides[0], sides[1], sides[2], 0,
-                           internal::CompressedBytes(format, sides[0], sides[1], sides[2]),
-                           nullptr);
-                else
-                    ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1],
-                           sides[2], 0, glFormat, internal::StorageType(format), nullptr);
+                ORU_GL(TexImage3D, this->target(), level, glInternalFormat, sides[0], sides[1],
+                       sides[2], 0, glFormat, internal::StorageType(format), nullptr);
             });
     });
 }
@@ -133,8 +127,10 @@ void Texture3::compressedSubImage(int level, int x, int y, int z, std::uint64_t 
     checkPart(level, width, height, depth);
     checkCompressed(width, height, depth, bytes);
     auto const sides = internal::ToSides(width, height, depth, bytes);
-    ORU_GL(CompressedTexSubImage3D, target(), level, x, y, z, sides[0], sides[1], sides[2],
-           InternalFormat2GL(format()), sides[3], data);
+    internal::KeepingUnpackState(PixelUnpackParameters(), [&] {
+        ORU_GL(CompressedTexSubImage3D, target(), level, x, y, z, sides[0], sides[1], sides[2],
+               InternalFormat2GL(format()), sides[3], data);
+    });
     imageChanged(level);
 }
 
@@ -142,7 +138,7 @@ void Texture3::getCompressedData(void *dst, std::size_t bytes, int level) const 
     if (!isBound())
         ORU_THROW_INTERNAL("Texture must be bound");
     checkCompressedLevel(level, depth(static_cast<unsigned int>(level)), bytes);
-    ORU_GL(GetCompressedTexImage, target(), level, dst);
+    internal::ReadBlocks(target(), level, dst, bytes);
 }
 
 void Texture3::copyTexSubImage(int level, int xOffset, int yOffset, int zOffset, int x, int y,
@@ -184,8 +180,7 @@ void Texture3::getPixelData(MutablePixelView const &pixels, int level) const {
 }
 
 void Texture3::readLevel(int level, PixelShape const &shape, void *pixels) const {
-    auto const halvings = static_cast<unsigned>(level);
-    internal::CheckLevel(*this, shape, level, width(halvings), height(halvings), depth(halvings));
+    internal::CheckLevel(*this, target(), shape, level);
     internal::ReadLevel(target(), level, shape, pixels);
 }
 
@@ -215,10 +210,20 @@ Texture2DArray::Texture2DArray(InternalFormat format, std::uint64_t width, std::
 Texture2DArray::Texture2DArray(unsigned int name, ownership_tag ownership)
     : Texture3(TARGET_TEXTURE_2D_ARRAY, TARGETBINDING_TEXTURE_BINDING_2D_ARRAY, name, ownership) {}
 
+namespace {
+
+/// Layers of an array of cubes, before any call.
+std::uint64_t LayersOf(std::uint64_t cubes) {
+    ORU_ASSERT_SUPPORTED(GL_ARB_TEXTURE_CUBE_MAP_ARRAY);
+    return 6 * cubes;
+}
+
+} // namespace
+
 TextureCubeArray::TextureCubeArray(InternalFormat format, std::uint64_t side, std::uint64_t cubes,
                                    bool mipmapped)
     : Texture3(TARGET_TEXTURE_CUBE_MAP_ARRAY, TARGETBINDING_TEXTURE_BINDING_CUBE_MAP_ARRAY, format,
-               side, side, 6 * cubes, mipmapped) {}
+               side, side, LayersOf(cubes), mipmapped) {}
 
 TextureCubeArray::TextureCubeArray(unsigned int name, ownership_tag ownership)
     : Texture3(TARGET_TEXTURE_CUBE_MAP_ARRAY, TARGETBINDING_TEXTURE_BINDING_CUBE_MAP_ARRAY, name,

@@ -63,10 +63,12 @@ public:
                             std::size_t bytes);
 
     /// Reads the compressed blocks of a level.
-    /// @param dst, bytes memory, of `compressedSize(level)` bytes
+    /// @param dst, bytes memory, of `compressedSize(level)` bytes; an offset while a pixel pack
+    ///        buffer is bound
     /// @throws InternalException when the texture is not bound, for a format that is
     ///         not compressed, and for another number of bytes
-    /// @note glGetCompressedTexImage; needs OpenGL 1.3
+    /// @note glGetTexLevelParameteriv; glGetCompressedTexImage, with glPixelStorei and what saves
+    ///       its state around it; needs OpenGL 1.3
     void getCompressedData(void *dst, std::size_t bytes, int level) const;
 
     /// Copies a rectangle of the current read framebuffer, beginning at (x, y), into one image.
@@ -95,7 +97,8 @@ public:
     /// @param pixels as many as the level has texels
     /// @throws InternalException when the texture is not bound, and for pixels of other sides than
     ///         the level's
-    /// @note glGetTexImage, with glPixelStorei and what saves its state around it
+    /// @note glGetTexLevelParameteriv; glGetTexImage, with glPixelStorei and what saves its state
+    ///       around it
     void getPixelData(MutablePixelView const &pixels, int level) const;
 
     /// Bytes that level 0 takes in memory when its rows have no gaps, whatever the level.
@@ -182,7 +185,7 @@ public:
     /// Makes the texture and its storage.
     /// @param side, cubes texels of a side of level 0, and how many cubes
     /// @param mipmapped whether the levels down to one texel are allocated too
-    /// @throws as Texture3, and ExceptionOGL where the context has no arrays of cube maps
+    /// @throws as Texture3, and InternalException without GL_ARB_texture_cube_map_array
     TextureCubeArray(InternalFormat format, std::uint64_t side, std::uint64_t cubes,
                      bool mipmapped);
 

@@ -36,15 +36,9 @@ TextureCube::TextureCube(InternalFormat format, std::uint64_t side, bool mipmapp
     unsigned int const glFormat = getGLFormat(format);
     unsigned int const glType = internal::StorageType(format);
     auto const allocate = [&](GLint level, std::array<GLsizei, 2> const &sides) {
-        GLsizei const bytes = internal::CompressedBytes(format, sides[0], sides[1]);
-        for (Face const face : kCubeFaces) {
-            if (bytes > 0)
-                ORU_GL(CompressedTexImage2D, Face2GL(face), level, glInternalFormat, sides[0],
-                       sides[1], 0, bytes, nullptr);
-            else
-                ORU_GL(TexImage2D, Face2GL(face), level, static_cast<GLint>(glInternalFormat),
-                       sides[0], sides[1], 0, glFormat, glType, nullptr);
-        }
+        for (Face const face : kCubeFaces)
+            ORU_GL(TexImage2D, Face2GL(face), level, static_cast<GLint>(glInternalFormat), sides[0],
+                   sides[1], 0, glFormat, glType, nullptr);
     };
     internal::ForEachLevel(internal::ToSides(side, side), 2, mipmapped, allocate);
     setFilter(FILTER_NEAREST, FILTER_NEAREST);
@@ -120,8 +114,10 @@ void TextureCube::compressedSubImage(Face face, int level, int x, int y, std::ui
     checkPart("subimage", level, width, height);
     checkCompressed(width, height, 1, bytes);
     auto const sides = internal::ToSides(width, height, bytes);
-    ORU_GL(CompressedTexSubImage2D, Face2GL(face), level, x, y, sides[0], sides[1],
-           InternalFormat2GL(format()), sides[2], data);
+    internal::KeepingUnpackState(PixelUnpackParameters(), [&] {
+        ORU_GL(CompressedTexSubImage2D, Face2GL(face), level, x, y, sides[0], sides[1],
+               InternalFormat2GL(format()), sides[2], data);
+    });
     imageChanged(level);
 }
 
@@ -138,7 +134,7 @@ void TextureCube::getPixelData(Face face, void *dst, int level, Format format, T
     requireBound();
     internal::RequireSameKind(this->format(), format);
     internal::PixelLayout const layout = internal::LayoutOf(format, type);
-    internal::WithPackAlignment(alignment, [&] {
+    internal::KeepingPackAlignment(alignment, [&] {
         ORU_GL(GetTexImage, Face2GL(face), level, layout.format, layout.type, dst);
     });
 }
@@ -152,7 +148,7 @@ void TextureCube::getPixelData(Face face, Buffer *buffer, std::size_t offset, in
     internal::PixelLayout const layout = internal::LayoutOf(format, type);
     GLenum const image = Face2GL(face);
     internal::BecomePackBuffer(*buffer);
-    internal::WithPackAlignment(alignment, [&] {
+    internal::KeepingPackAlignment(alignment, [&] {
         internal::ReadInto(*buffer, offset, [&](void *pixels) {
             ORU_GL(GetTexImage, image, level, layout.format, layout.type, pixels);
         });
@@ -160,15 +156,15 @@ void TextureCube::getPixelData(Face face, Buffer *buffer, std::size_t offset, in
 }
 
 void TextureCube::getPixelData(Face face, MutablePixelView const &pixels, int level) const {
-    std::uint64_t const side = width(static_cast<unsigned int>(level));
-    internal::CheckLevel(*this, pixels.shape(), level, side, side, 1);
-    internal::ReadLevel(Face2GL(face), level, pixels.shape(), pixels.data());
+    GLenum const image = Face2GL(face);
+    internal::CheckLevel(*this, image, pixels.shape(), level);
+    internal::ReadLevel(image, level, pixels.shape(), pixels.data());
 }
 
 void TextureCube::getCompressedData(Face face, void *dst, std::size_t bytes, int level) const {
     requireBound();
     checkCompressedLevel(level, 1, bytes);
-    ORU_GL(GetCompressedTexImage, Face2GL(face), level, dst);
+    internal::ReadBlocks(Face2GL(face), level, dst, bytes);
 }
 
 std::size_t TextureCube::pixelDataSize(Format format, Type type) const {

@@ -36,7 +36,7 @@ public:
     /// @param side texels of a side of level 0
     /// @param mipmapped whether the levels down to one texel are allocated too
     /// @throws InternalException before OpenGL 1.3; ExceptionOGL when OpenGL refuses size or format
-    /// @note glTexImage2D, glCompressedTexImage2D
+    /// @note glTexImage2D
     TextureCube(InternalFormat format, std::uint64_t side, bool mipmapped);
 
     /// A texture that was made elsewhere; side and format are what level 0 of the first face has.
@@ -100,12 +100,14 @@ public:
     /// afterwards, also after a failure.
     /// @throws InternalException when the texture is not bound, and for pixels of other sides than
     ///         the level's
-    /// @note glGetTexImage, with glPixelStorei and what saves its state around it
+    /// @note glGetTexLevelParameteriv; glGetTexImage, with glPixelStorei and what saves its state
+    ///       around it
     void getPixelData(Face face, MutablePixelView const &pixels, int level) const;
 
     /// Reads the compressed blocks of a level of a face.
     /// @param dst, bytes memory, of a sixth of `compressedSize(level)` bytes
-    /// @note glGetCompressedTexImage
+    /// @note glGetTexLevelParameteriv; glGetCompressedTexImage, with glPixelStorei and what saves
+    ///       its state around it
     void getCompressedData(Face face, void *dst, std::size_t bytes, int level) const;
 
     /// Bytes that level 0 of a face takes in memory when its rows have no gaps.

@@ -148,6 +148,13 @@ TEST_F(BufferRangesTest, RefuseWhatLeavesTheBuffer) {
         EXPECT_FAILURE("Buffer::copySubData buffer cannot be mapped",
                        buffer.copySubData(other, 0, 0, 8));
         EXPECT_FAILURE("Buffer::orphan buffer cannot be mapped", buffer.orphan());
+        {
+            MappedRange first(other, 0, 8,
+                              MappedRange::ACCESS_WRITE | MappedRange::ACCESS_FLUSH_EXPLICIT);
+            Buffer third(8, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STREAM_DRAW, nullptr);
+            MappedRange const second(third, 0, 8, MappedRange::ACCESS_WRITE);
+            EXPECT_FAILURE("", first.flush(0, 8)) << "its own buffer, not what was bound last";
+        }
         range.unmap();
         EXPECT_FAILURE("The MappedRange is no longer mapped: unmap() was called", range.unmap());
         EXPECT_FAILURE("The MappedRange is no longer mapped: unmap() was called",

@@ -191,7 +191,10 @@ TEST_F(FramebufferTransfersTest, RectanglesAreClearedReadAndCopied) {
     EXPECT_EQ("Framebuffer::Blit copies colour, depth and stencil, and 8 is none of them joined",
               blit(part, 8, T::FILTER_NEAREST));
     char const *const empty = "A framebuffer's rectangle is empty: give it a width and a height";
-    IntegerRect const nothing = Rect(1, 1, 0, 4);
+    IntegerRect const nothing = Rect(1, 1, 0, 4), huge = Rect(2, 2, 0x80000000, 1);
+    EXPECT_EQ(
+        "A framebuffer's rectangle cannot reach 2147483648 pixels beyond 2: no framebuffer does",
+        blit(huge, F::CONTENTS_COLOR, T::FILTER_NEAREST));
     EXPECT_EQ(empty, blit(nothing, F::CONTENTS_COLOR, T::FILTER_NEAREST));
     EXPECT_FAILURE(empty, F::ClearColor(&source, 0, kRed.data(), &nothing));
     EXPECT_FAILURE(empty, F::Read(&source, nothing, kBytes.format, kBytes.type, back.data(), 1));
@@ -239,6 +242,13 @@ TEST_F(FramebufferTransfersTest, OtherContentsAreClearedCopiedAndResolved) {
     EXPECT_FAILURE("Depth and stencil are no draw or read buffers: name colours, or "
                    "ATTACHMENT_NONE",
                    framebuffer.setDrawBuffers({F::ATTACHMENT_DEPTH}));
+    ORU_GL(BindFramebuffer, GL_READ_FRAMEBUFFER, copy.objectID());
+    EXPECT_FAILURE("Another framebuffer is bound to be read from: bind() this one before its read "
+                   "buffer is set",
+                   framebuffer.setReadBuffer(F::Color(1)));
+    framebuffer.bind();
+    for (unsigned int const index : {256u, 257u, 258u, 259u, 100000u})
+        EXPECT_NE("", MessageOf([&] { framebuffer.attachTexture(numbers, 0, F::Color(index)); }));
     EXPECT_FAILURE("Nothing can be attached at ATTACHMENT_NONE: name a colour, depth or stencil",
                    framebuffer.detachFrom(F::ATTACHMENT_NONE));
 
@@ -289,7 +299,8 @@ TEST_F(FramebufferTransfersTest, FailingCallsLeaveNothingBehind) {
     TextureCube cube(kRGBA8, 4, false);
     ORU_GL(BindTexture, GL_TEXTURE_CUBE_MAP, cube.objectID());
     Sampler const sampler(T::FILTER_LINEAR, T::FILTER_LINEAR, T::WRAPMODE_REPEAT);
-    unsigned int const names[] = {sampler.objectID(), cube.objectID()};
+    Texture2DMultisample samples(kRGBA8, 4, 4, 2);
+    unsigned int const names[] = {sampler.objectID(), cube.objectID(), samples.disown()};
     IntegerRect const part = Rect(1, 1, 2, 2);
     std::vector<unsigned char> pixels(64);
     MutablePixelView const view(pixels.data(), pixels.size(), {kBytes.format, kBytes.type, 4, 4});
@@ -303,6 +314,7 @@ TEST_F(FramebufferTransfersTest, FailingCallsLeaveNothingBehind) {
         [&] { TextureCube(names[1], borrow_name_tag()); },
         [&] { TextureCubeArray(kRGBA8, 4, 2, true); },
         [&] { Texture2DMultisample(kRGBA8, 4, 4, 2); },
+        [&] { Texture2DMultisample(names[2], take_name_tag()).disown(); },
         [&] { BufferTexture(kRGBA8, buffer); },
         [&] { BufferTexture::MaxTexels(); },
         [&] { Renderbuffer(GL_RGBA8, 4, 4, 2); },
@@ -327,8 +339,10 @@ TEST_F(FramebufferTransfersTest, FailingCallsLeaveNothingBehind) {
             EXPECT_EQ(calls->refused.empty() ? "" : "refused", said);
             if (calls->refused.empty())
                 break;
-            while (!IsCoreRun() && Get(GL_CLIENT_ATTRIB_STACK_DEPTH) > 0)
+            bool const isUpload = &operation == std::end(operations) - 1;
+            if (!IsCoreRun() && isUpload && Get(GL_CLIENT_ATTRIB_STACK_DEPTH) > 0)
                 ORU_GL0(PopClientAttrib); // what uploads leave to be looked at
+            EXPECT_EQ(0, IsCoreRun() ? 0 : Get(GL_CLIENT_ATTRIB_STACK_DEPTH));
             EXPECT_EQ(before, State())
                 << calls->refused << " of operation " << &operation - operations;
         }
@@ -336,4 +350,5 @@ TEST_F(FramebufferTransfersTest, FailingCallsLeaveNothingBehind) {
         calls->at = 0;
     }
     ORU_GL(BindTexture, GL_TEXTURE_CUBE_MAP, 0u);
+    Texture2DMultisample const again(names[2], take_name_tag());
 }

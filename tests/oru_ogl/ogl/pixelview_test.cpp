@@ -51,6 +51,11 @@ std::size_t EndOfWritten(Texture &texture, PixelShape const &shape) {
 class PixelViewTest : public ObjectTest {};
 
 TEST_F(PixelViewTest, EndsWhereOpenGLEnds) {
+    // What the host left behind counts for nothing.
+    std::pair<GLenum, GLint> const left[] = {
+        {GL_PACK_SKIP_IMAGES, 3}, {GL_PACK_IMAGE_HEIGHT, 50}, {GL_PACK_SKIP_ROWS, 2}};
+    for (auto const &[parameter, value] : left)
+        ORU_GL(PixelStorei, parameter, value);
     for (TextureKind const &kind : kTextureKinds) {
         Sides const size = kind.cut({5, 3, 2});
         BoundTexture const texture(kind.make(kRGBA8, size, false));
@@ -76,6 +81,10 @@ TEST_F(PixelViewTest, EndsWhereOpenGLEnds) {
         }
         EXPECT_LT(300, layouts);
         EXPECT_EQ((std::vector<GLint>{4, 0}), Get({GL_PACK_ALIGNMENT, GL_PACK_ROW_LENGTH}));
+    }
+    for (auto const &[parameter, value] : left) {
+        EXPECT_EQ(value, Get(parameter));
+        ORU_GL(PixelStorei, parameter, 0);
     }
 }
 
@@ -138,8 +147,19 @@ TEST_F(PixelViewTest, RefusesWhatDoesNotFit) {
     EXPECT_FAILURE("a negative texture image mip-map level supplied", ReadView(*bound, view, -1));
     EXPECT_FAILURE("Pixels of 4 x 4 x 1 have more sides than the texture, which has 1",
                    line.subImage(0, 0, view));
-    EXPECT_EQ(calls->count("GetIntegerv"), calls->total()) << "whether it is bound";
+    EXPECT_EQ(calls->count("GetIntegerv") + calls->count("GetTexLevelParameteriv"), calls->total())
+        << "whether it is bound, and how large";
     EXPECT_FAILURE("GL_INVALID_VALUE", UploadView(*bound, {1, 0, 0}, view));
+    for (int i = 0; i < 20; ++i) { // more than the stack of pixel storage holds
+        ::glEnable(GL_NONE);
+        EXPECT_FAILURE("GL_INVALID_ENUM", UploadView(*bound, {}, view));
+    }
+    EXPECT_FAILURE("", UploadView(*bound, {}, view));
+    // Levels that other code made are of the size that OpenGL tells.
+    ::glTexImage2D(GL_TEXTURE_2D, 1, GL_RGBA8, 9, 9, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
+    EXPECT_FAILURE(
+        "Level 1 has 9 x 9 x 1 texels and is read as a whole: the pixels are 2 x 2 x 1",
+        ReadView(*bound, MutablePixelView(memory.data(), 16, Shape(kBytes, {2, 2, 1})), 1));
     EXPECT_EQ((std::vector<GLint>{4, 0}), Get({GL_UNPACK_ALIGNMENT, GL_UNPACK_ROW_LENGTH}))
         << "put back after a failure";
 }

@@ -155,6 +155,12 @@ TEST_F(QueryTest, RefusesWhatHasNoSense) {
     expect("GL_INVALID_ENUM",
            [&] { ConditionalRenderScope(other, ConditionalRenderScope::MODE_WAIT); });
     EXPECT_NO_THROW(ConditionalRenderScope(other, ConditionalRenderScope::MODE_WAIT));
+    {
+        ConditionalRenderScope const outer(other, ConditionalRenderScope::MODE_WAIT);
+        for (int i = 0; i < 2; ++i) // the first one would end the outer one
+            expect("GL_INVALID_OPERATION",
+                   [&] { ConditionalRenderScope(other, ConditionalRenderScope::MODE_WAIT); });
+    }
 
     ExpectTranslation("Query type", Query::Type2GL, Query::GL2Type, 6, GL_TIMESTAMP);
     ExpectTranslation("Conditional rendering mode", ConditionalRenderScope::Mode2GL,

@@ -180,6 +180,7 @@ TEST_F(StagesTest, FeedbackCapturesWhatIsAskedFor) {
     EXPECT_FAILURE("GL_INVALID_ENUM", TransformFeedbackScope(GL_POINTS));
     try {
         TransformFeedbackScope const capture(GL_POINTS);
+        EXPECT_FAILURE("GL_INVALID_OPERATION", TransformFeedbackScope(GL_POINTS)); // goes on
         feedback.draw(GL_POINTS);
         throw std::runtime_error("ends the capture");
     } catch (std::runtime_error const &) {

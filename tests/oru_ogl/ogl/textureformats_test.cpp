@@ -205,6 +205,27 @@ TEST_F(TextureFormatsTest, CompressedBlocksGoThereAndBack) {
         dynamic_cast<Texture2D &>(*plain).compressedSubImage(0, 0, 0, 4, 4, all.data(), 64));
 }
 
+// Names without a size, as other code uses them.
+TEST_F(TextureFormatsTest, TheirShortNamesAreAdopted) {
+    std::pair<GLint, T::InternalFormat> const names[] = {
+        {GL_DEPTH_STENCIL, T::INTERNALFORMAT_DEPTH24_STENCIL8},
+        {GL_SRGB, T::INTERNALFORMAT_SRGB8},
+        {GL_SRGB_ALPHA, T::INTERNALFORMAT_SRGB8_ALPHA8},
+        {GL_DEPTH_COMPONENT, T::INTERNALFORMAT_DEPTH_COMPONENT24}};
+    for (auto const &[gl, format] : names) {
+        BoundTexture const made(std::make_unique<Texture2D>(kRGBA8, 4, 4, false));
+        GLenum const pixels =
+            gl == GL_SRGB || gl == GL_SRGB_ALPHA ? GL_RGBA : static_cast<GLenum>(gl);
+        ::glTexImage2D(GL_TEXTURE_2D, 0, gl, 4, 4, 0, pixels,
+                       gl == GL_DEPTH_STENCIL ? GL_UNSIGNED_INT_24_8 : GL_UNSIGNED_INT, nullptr);
+        T::InternalFormat const adopted = Texture2D(made->objectID(), borrow_name_tag()).format();
+        // How many bits a depth gets is the driver's choice.
+        bool const isDepth = adopted == T::INTERNALFORMAT_DEPTH_COMPONENT16 ||
+                             adopted == T::INTERNALFORMAT_DEPTH_COMPONENT32;
+        EXPECT_EQ(format, gl == GL_DEPTH_COMPONENT && isDepth ? format : adopted) << adopted;
+    }
+}
+
 // Of the bound texture and of a sampler: the same names give the same values.
 TEST_F(TextureFormatsTest, SamplingParametersAreSet) {
     BoundTexture const texture(std::make_unique<Texture2D>(kRGBA8, 8, 8, true));

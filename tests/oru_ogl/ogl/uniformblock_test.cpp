@@ -155,6 +155,12 @@ TEST_F(UniformBlockTest, RefusesWhatIsNotThere) {
                    writer.set("gains", {1.f, 2.f}, 1));
     EXPECT_FAILURE("The uniform \"gains\" has 2 elements, and was given 1 from 3 on",
                    writer.set("gains", {1.f}, 3));
+    UniformBlock::Member foreign = block.member("gains");
+    foreign.offset = block.size() - 4;
+    EXPECT_FAILURE(
+        "The uniform \"gains\" is of another block than \"Light[1]\": it would lie behind "
+        "it",
+        writer.set(foreign, {1.f, 2.f}));
     writer.set("on", true);
     writer.set("colour", {1.f, 2.f, 3.f});
     Buffer small(block.size() - 1, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STREAM_DRAW, nullptr);

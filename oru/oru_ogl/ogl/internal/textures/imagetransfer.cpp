@@ -61,6 +61,13 @@ char const *NameOf(TexelKind kind) {
 
 } // namespace
 
+/// The version of a record, 30 for 3.0. Records count all from 4.1 on as 4.1, and the shading
+/// language, numbered alike there, tells them apart.
+unsigned int VersionOf(ExtensionManager const &record) {
+    unsigned int const version = record.majorVersion() * 10 + record.minorVersion();
+    return version < 41 ? version : record.glslMajorVersion() * 10 + record.glslMinorVersion() / 10;
+}
+
 bool IsFormatSupported(Texture::InternalFormat format) {
     if (IsDeprecated(format))
         return !IsCoreContext();
@@ -68,7 +75,7 @@ bool IsFormatSupported(Texture::InternalFormat format) {
     if (!row)
         return kInternalFormats.find(format) != nullptr;
     ExtensionManager const &record = *RecordOfCurrent();
-    if (row->version && record.majorVersion() * 10 + record.minorVersion() >= row->version)
+    if (row->version && VersionOf(record) >= row->version)
         return true;
     auto const &names = record.supportedExtensionNames();
     return row->extension && std::find(names.begin(), names.end(), row->extension) != names.end();

@@ -102,15 +102,6 @@ inline void RequireSameKind(Texture::InternalFormat format, Texture::Format pixe
 /// The type of pixels that storage of a format is allocated with.
 GLenum StorageType(Texture::InternalFormat format);
 
-/// Bytes of a level of a compressed format, or 0 for other formats.
-template<class... Sides>
-GLsizei CompressedBytes(Texture::InternalFormat format, Sides... sides) {
-    if (!Texture::IsCompressed(format))
-        return 0;
-    std::uint64_t const texels[] = {static_cast<std::uint64_t>(sides)..., 1};
-    return static_cast<GLsizei>(Texture::SizeInBytes(format, texels[0], texels[1], texels[2]));
-}
-
 /// A format and a type of pixels in memory, as OpenGL takes them.
 struct PixelLayout {
     GLenum format;
@@ -160,6 +151,17 @@ void WithPackAlignment(unsigned int bytes, Download download) {
     ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, static_cast<GLint>(bytes));
     download();
     saved.restore();
+}
+
+/// The same for what leaves nothing behind: the state is put back also after a failure.
+template<class Download>
+void KeepingPackAlignment(unsigned int bytes, Download download) {
+    CheckByteAlignment(bytes);
+    PixelStorageScope saved(kPackAlignment);
+    Ending restore([&saved] { saved.restore(); });
+    ORU_GL(PixelStorei, GL_PACK_ALIGNMENT, static_cast<GLint>(bytes));
+    download();
+    restore.now();
 }
 
 /// Makes a buffer one that can be bound for `ReadInto`.

@@ -13,11 +13,10 @@ namespace ORU::OGL::internal {
 void CheckSides(PixelShape const &pixels, std::size_t sides);
 
 /// Checks pixels that receive a whole level of a texture.
-/// @param width, height, depth texels of the level, 0 standing for 1
+/// @param image the target, or the face of a cube map
 /// @throws InternalException unless the pixels have the level's sides and kind; also for a texture
 ///         that is not bound and for a negative level
-void CheckLevel(Texture const &texture, PixelShape const &pixels, int level, std::uint64_t width,
-                std::uint64_t height, std::uint64_t depth);
+void CheckLevel(Texture const &texture, GLenum image, PixelShape const &pixels, int level);
 
 /// Runs a read-back into rows and images that lie as the shape says, and puts the state back, also
 /// after a failure.
@@ -34,13 +33,26 @@ void WithPackState(PixelShape const &pixels, Read read) {
     set(GL_PACK_ROW_LENGTH, pixels.rowLength);
     set(GL_PACK_SKIP_PIXELS, 0);
     set(GL_PACK_SKIP_ROWS, 0);
-    if (pixels.depth > 1)
-        set(GL_PACK_IMAGE_HEIGHT, pixels.imageHeight);
-    // Counts for a three-dimensional texture of one image, too.
-    if (CurrentRecord(&ExtensionManager::supportsTexture3D))
+    // Also for one image: the host's values count for every texture of three sides, and drivers
+    // take the layers of a 1-D array for images.
+    if (CurrentRecord(&ExtensionManager::supportsTexture3D)) {
+        set(GL_PACK_IMAGE_HEIGHT, pixels.depth > 1 ? pixels.imageHeight : 0);
         set(GL_PACK_SKIP_IMAGES, 0);
+    }
     set(GL_PACK_ALIGNMENT, pixels.alignment);
     read();
+    restore.now();
+}
+
+/// Runs an upload with the unpack state that the parameters describe, and puts the state back, also
+/// after a failure.
+template<class Send>
+void KeepingUnpackState(PixelUnpackParameters const &parameters, Send send) {
+    ReportPendingError(__FILE__, __LINE__, "glPushClientAttrib");
+    PixelStorageScope saved(kUnpackStorage);
+    Ending restore([&saved] { saved.restore(); });
+    parameters.apply();
+    send();
     restore.now();
 }
 
@@ -53,13 +65,15 @@ void Upload(SendPart<Sides> send, Part<Sides> const &part, Texture::InternalForm
     CheckSides(shape, Sides);
     RequireSameKind(format, shape.format);
     PixelLayout const layout = LayoutOf(shape.format, shape.type);
-    ReportPendingError(__FILE__, __LINE__, "glPushClientAttrib");
-    PixelStorageScope saved(kUnpackStorage);
-    Ending restore([&saved] { saved.restore(); });
-    shape.unpackParameters().apply();
-    send(part, layout.format, layout.type, pixels);
-    restore.now();
+    KeepingUnpackState(shape.unpackParameters(),
+                       [&] { send(part, layout.format, layout.type, pixels); });
 }
+
+/// Reads the compressed blocks of a level of the texture bound to a target.
+/// @param image the target, or the face of a cube map
+/// @param pixels an address, or an offset into the pixel pack buffer
+/// @throws InternalException unless OpenGL has as many bytes there
+void ReadBlocks(GLenum image, int level, void *pixels, std::size_t bytes);
 
 /// Reads a level of the texture bound to a target, which `CheckLevel` has seen.
 /// @param image the target, or the face of a cube map
