@@ -9,9 +9,9 @@
 using namespace apps_test;
 
 TEST(Gallery, DrawsItsPictures) {
-    for (std::string const name : {"hello_offscreen", "float_texture", "streaming_upload",
-                                   "blend_and_lines", "background_loader", "mirror_balls",
-                                   "bloom", "deferred_shading"}) {
+    for (std::string const name :
+         {"hello_offscreen", "float_texture", "streaming_upload", "blend_and_lines",
+          "background_loader", "mirror_balls", "bloom", "deferred_shading"}) {
         TemporaryFolder const folder;
         Outcome const outcome = RunProgram(name + ".exe", "picture.png", folder.path());
         EXPECT_EQ(0, outcome.exitCode);
