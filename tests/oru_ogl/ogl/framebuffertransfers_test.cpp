@@ -105,7 +105,9 @@ TEST_F(FramebufferTransfersTest, EveryImageIsAttachedAndCleared) {
         {std::make_unique<Texture2DArray>(kRGBA8, 4, 4, 3, true), 3},
         {std::make_unique<TextureCube>(kRGBA8, 4, true), 6},
         {std::make_unique<TextureCubeArray>(kRGBA8, 4, 2, true), 12}};
-    for (auto const &[texture, layers] : textures) {
+    for (auto const &row : textures) {
+        Texture const *const texture = row.first.get();
+        unsigned int const layers = row.second;
         SCOPED_TRACE(texture->target());
         framebuffer.attachTexture(*texture, 0, F::ATTACHMENT_COLOR0);
         EXPECT_EQ("", framebuffer.incompleteness());

@@ -212,10 +212,10 @@ TEST_F(VertexArrayTest, RefusesWhatItDoesNotHave) {
     EXPECT_FAILURE(noIndices, array.drawElements(GL_POINTS, 1));
     EXPECT_FAILURE(noIndices, array.drawElementsIndirect(GL_POINTS, numbers));
     array.setIndices(numbers, GL_UNSIGNED_INT);
-    for (auto const &[count, first] : {std::pair{5, 0}, {2, 3}, {1, -1}, {0, 5}})
-        EXPECT_FAILURE("The vertex array has 4 indices, not " + std::to_string(count) + " from " +
-                           std::to_string(first) + " on",
-                       array.drawElements(GL_POINTS, count, first));
+    for (auto const &range : {std::pair{5, 0}, {2, 3}, {1, -1}, {0, 5}})
+        EXPECT_FAILURE("The vertex array has 4 indices, not " + std::to_string(range.first) +
+                           " from " + std::to_string(range.second) + " on",
+                       array.drawElements(GL_POINTS, range.first, range.second));
     for (int const offset : {-4, 1, 4})
         EXPECT_FAILURE("A draw of 16 bytes in the buffer of 16 cannot stand at " +
                            std::to_string(offset) +
