@@ -52,10 +52,10 @@ struct Tile {
 /// What takes its time: a part of a Julia set.
 std::vector<unsigned char> Compute(unsigned int number) {
     std::vector<unsigned char> pixels;
+    unsigned int const left = number % kColumns * kSide, bottom = number / kColumns * kSide;
     for (unsigned int y = 0; y < kSide; ++y) {
         for (unsigned int x = 0; x < kSide; ++x) {
-            double re = (x + number % kColumns * kSide - 159.5) / 100;
-            double im = (y + number / kColumns * kSide - 119.5) / 100;
+            double re = (left + x - 159.5) / 100, im = (bottom + y - 119.5) / 100;
             int steps = 0;
             for (; steps < 100 && re * re + im * im < 4; ++steps) {
                 double const next = re * re - im * im - 0.8;
@@ -131,9 +131,9 @@ void Draw(std::filesystem::path const &file) {
         tile.ready.wait(); // the GPU waits, this thread goes on
         timer.begin();
         TextureUnit::Unit(0)->bind(tile.texture.get());
-        auto const column = static_cast<float>(number % kColumns);
-        auto const row = static_cast<float>(number / kColumns);
-        values.set("place", {2 * column / kColumns - 1, 2 * row / kRows - 1});
+        unsigned int const column = number % kColumns, row = number / kColumns;
+        values.set("place", {2.f * static_cast<float>(column) / kColumns - 1,
+                             2.f * static_cast<float>(row) / kRows - 1});
         values.upload(uniforms);
         array.drawArrays(GL_TRIANGLE_STRIP, 0, 4);
         timer.end();

@@ -128,7 +128,7 @@ void UniformBlockWriter::put(UniformBlock::Member const &member, Kind kind, void
         else if (row.columns == 1 || member.matrixStride == column)
             Copy(element, from, column * row.columns);
         else
-            for (unsigned int i = 0; i < row.columns; ++i)
+            for (std::size_t i = 0; i < row.columns; ++i)
                 Copy(element + i * member.matrixStride, from + i * column, column);
     }
 }

@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <initializer_list>
+#include <type_traits>
 
 namespace ORU::OGL {
 
@@ -94,9 +95,13 @@ private:
     static constexpr Kind KindOf(double) { return DOUBLE; }
     static constexpr Kind KindOf(int) { return INT; }
     static constexpr Kind KindOf(unsigned int) { return UNSIGNED; }
-    // Smaller numbers, bools among them, would be promoted here and read as ints from memory.
     template<class Number>
-    static constexpr Kind KindOf(Number) = delete;
+    static constexpr Kind KindOf(Number) {
+        // Smaller numbers would be promoted, and read as ints from memory.
+        static_assert(!std::is_same_v<Number, Number>,
+                      "Give floats, doubles, ints or unsigned ints; several bools as ints.");
+        return INT;
+    }
 
     UniformBlock::Member const &find(std::string_view name) const { return block_.member(name); }
     static UniformBlock::Member const &find(UniformBlock::Member const &member) { return member; }
