@@ -137,10 +137,10 @@ Verdict Decide(EntryPoint const &entry, std::uintptr_t const *arguments) {
 // What every stub jumps to, its entry point in r10: asks Decide with the arguments saved, then goes
 // on to the real function as if nothing had happened, or returns.
 extern "C" {
-std::uintptr_t OruSweepResult = 0;
+std::uintptr_t gSweepResult = 0;
 std::uintptr_t OruSweepDecide(sweep::EntryPoint const *entry, std::uintptr_t const *arguments) {
     auto const [address, result] = sweep::Decide(*entry, arguments);
-    OruSweepResult = result;
+    gSweepResult = result;
     return address;
 }
 void OruSweepCommon();
@@ -173,7 +173,7 @@ OruSweepCommon:
     test %rax, %rax
     jz 1f
     jmp *%rax
-1:  mov OruSweepResult(%rip), %rax
+1:  mov gSweepResult(%rip), %rax
     ret
 )");
 

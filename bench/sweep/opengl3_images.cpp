@@ -35,7 +35,7 @@ constexpr auto kBytes = Texture::TYPE_UNSIGNED_BYTE;
 } // namespace
 
 void LaterTextures() {
-    std::vector<unsigned char> pixels(8 * 8 * 4 * 4);
+    std::vector<unsigned char> pixels(1024);
     PixelUnpackParameters const plain;
     TextureCube sky(kRGBA8, 8, true);
     TextureUnit::Unit(0)->bind(&sky);

@@ -76,7 +76,7 @@ void WrappedContext() {
 }
 
 void Textures() {
-    std::vector<unsigned char> pixels(8 * 8 * 4 * 4);
+    std::vector<unsigned char> pixels(1024);
     PixelUnpackParameters const plain;
     Texture1D line(kRGBA8, 8, true);
     TextureUnit::Unit(0)->bind(&line);

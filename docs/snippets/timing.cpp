@@ -140,9 +140,7 @@ TEST_F(TimingGuide, FillsPartsThatAreFree) {
     // [ring]
     std::int64_t const part = 256, parts = 3;
     Buffer ring(part * parts, Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_STREAM_DRAW, nullptr);
-    std::vector<Fence> done;
-    for (int i = 0; i < parts; ++i)
-        done.push_back(Fence());
+    std::vector<Fence> done(parts); // each marks what was asked for so far: nothing yet
     for (int frame = 0; frame < 9; ++frame) {
         auto const now = static_cast<std::size_t>(frame % parts);
         done[now].clientWait(1s); // what drew from this part three frames ago

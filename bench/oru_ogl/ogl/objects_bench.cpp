@@ -270,7 +270,7 @@ void UploadBlock(benchmark::State &state) {
     ORU_ENTRY(glBindBufferBase, BINDBUFFERBASE);
     UniformBlock const block(scene.program, "Look");
     UniformBlockWriter writer(block);
-    UniformBlock::Member const colour = block.member("colour"), view = block.member("view");
+    UniformBlock::Member const &colour = block.member("colour"), &view = block.member("view");
     Buffer buffer(block.size(), Buffer::TYPE_ARRAY_BUFFER, Buffer::USAGE_DYNAMIC_DRAW, nullptr);
     GLuint const name = buffer.objectID();
     float const values[16] = {1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};

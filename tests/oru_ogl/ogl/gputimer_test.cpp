@@ -121,7 +121,7 @@ TEST_F(GpuTimerTest, TimesTheDriverAndRefusesWhatHasNoSense) {
     EXPECT_EQ(1u, moved.pending());
     for (auto const use : {+[](GpuTimer &t) { t.begin(); }, +[](GpuTimer &t) { t.end(); },
                            +[](GpuTimer &t) { t.take(); }})
-        EXPECT_NE("", MessageOf([&] { use(timer); }));
+        EXPECT_NE("", MessageOf([&] { use(timer); })); // NOLINT(bugprone-use-after-move)
     timer = std::move(moved);
     EXPECT_EQ(1u, timer.pending());
     struct NoClock : OpenGLForwarder {
