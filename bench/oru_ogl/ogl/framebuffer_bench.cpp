@@ -53,7 +53,7 @@ struct Fixture {
                                          Texture2D(kRGBA8, kSide, kSide, false)};
     std::array<Framebuffer, 2> framebuffers;
     PFNGLBINDFRAMEBUFFERPROC bind = EntryPoint<PFNGLBINDFRAMEBUFFERPROC>("glBindFramebuffer");
-    std::vector<unsigned char> pixels = std::vector<unsigned char>(kSide * kSide * 4);
+    std::vector<unsigned char> pixels = std::vector<unsigned char>(std::size_t{4} * kSide * kSide);
 };
 
 void Blit(benchmark::State &state) {

@@ -86,7 +86,7 @@ void TimeFrames(benchmark::State &state) {
     ORU_ENTRY(glGetQueryObjectui64v, GETQUERYOBJECTUI64V);
     GLuint stamps[8] = {};
     glGenQueries(8, stamps);
-    unsigned int oldest = 0, pending = 0;
+    std::size_t oldest = 0, pending = 0;
     GpuTimer timer(4);
     Compare(
         state, 200,
