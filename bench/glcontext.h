@@ -5,6 +5,8 @@
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <benchmark/benchmark.h>
+
 #include <memory>
 #include <mutex>
 
@@ -54,3 +56,6 @@ Function EntryPoint(char const *name) {
 }
 
 } // namespace oru_bench
+
+/// A plain call with its error query, which the library makes too.
+#define ORU_PLAIN(call) ((call), benchmark::DoNotOptimize(::glGetError()))

@@ -21,9 +21,6 @@ using oru_bench::ThreadContext;
 
 namespace {
 
-/// A plain call with its error query, which the library makes too.
-#define ORU_PLAIN(call) ((call), benchmark::DoNotOptimize(::glGetError()))
-
 GLsizei const kSide = 256;
 ORU::IntegerRect const kAll({0, 0}, ORU::size2(kSide, kSide));
 auto const kRGBA8 = Texture::INTERNALFORMAT_RGBA8;

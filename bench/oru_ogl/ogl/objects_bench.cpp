@@ -27,9 +27,6 @@ using oru_bench::ThreadContext;
 
 namespace {
 
-/// A plain call with its error query, which the library makes too.
-#define ORU_PLAIN(call) ((call), benchmark::DoNotOptimize(::glGetError()))
-
 /// An entry point, looked up once.
 #define ORU_ENTRY(name, NAME) PFNGL##NAME##PROC const name = EntryPoint<PFNGL##NAME##PROC>(#name)
 

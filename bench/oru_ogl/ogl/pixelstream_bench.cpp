@@ -44,9 +44,6 @@ struct Picture {
     std::vector<unsigned char> frame, memory;
 };
 
-/// A plain call with its error query, which the library makes too.
-#define ORU_PLAIN(call) ((call), benchmark::DoNotOptimize(::glGetError()))
-
 /// A transfer with a layout of its own that does not outlive it.
 template<class Transfer>
 void WithPlainState(std::initializer_list<GLenum> zeros, GLenum alignment, Transfer transfer) {

@@ -19,9 +19,6 @@ namespace {
 
 constexpr int kCalls = 1000;
 
-/// A plain call with its error query, which the library makes too.
-#define ORU_PLAIN(call) ((call), benchmark::DoNotOptimize(::glGetError()))
-
 void Viewport(benchmark::State &state) {
     ThreadContext const context;
     Compare(

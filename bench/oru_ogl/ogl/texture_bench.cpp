@@ -39,9 +39,6 @@ int Calls(Square const &square) {
     return square.side <= 256 ? 64 : 1;
 }
 
-/// A plain call with its error query, which the library makes too.
-#define ORU_PLAIN(call) ((call), benchmark::DoNotOptimize(::glGetError()))
-
 /// What an upload takes besides the call itself: a layout of its own that does not outlive it.
 template<class Upload>
 void WithPlainUnpackState(Upload upload) {

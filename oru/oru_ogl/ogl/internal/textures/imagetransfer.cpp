@@ -59,14 +59,14 @@ char const *NameOf(TexelKind kind) {
     return kind == TexelKind::Integer ? "integers" : kind == TexelKind::Depth ? "depth" : "colours";
 }
 
-} // namespace
-
 /// The version of a record, 30 for 3.0. Records count all from 4.1 on as 4.1, and the shading
 /// language, numbered alike there, tells them apart.
 unsigned int VersionOf(ExtensionManager const &record) {
     unsigned int const version = record.majorVersion() * 10 + record.minorVersion();
     return version < 41 ? version : record.glslMajorVersion() * 10 + record.glslMinorVersion() / 10;
 }
+
+} // namespace
 
 bool IsFormatSupported(Texture::InternalFormat format) {
     if (IsDeprecated(format))

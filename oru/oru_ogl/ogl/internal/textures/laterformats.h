@@ -95,13 +95,12 @@ inline constexpr Translation<Texture::Format, 9, FormatRow> kLaterPixelFormats =
     kFirstLater};
 #undef ORU_ROW
 
-/// `bytes` are those of a whole pixel: the types are packed.
-#define ORU_ROW(Name, Bytes)                                                                       \
-    { Texture::TYPE_##Name, GL_##Name, Bytes }
-inline constexpr Translation<Texture::Type, 3, TypeRow> kLaterTypes = {
+#define ORU_ROW(Name)                                                                              \
+    { Texture::TYPE_##Name, GL_##Name }
+inline constexpr Translation<Texture::Type, 3> kLaterTypes = {
     nullptr,
-    {ORU_ROW(UNSIGNED_INT_24_8, 4), ORU_ROW(FLOAT_32_UNSIGNED_INT_24_8_REV, 8),
-     ORU_ROW(UNSIGNED_INT_10F_11F_11F_REV, 4)},
+    {ORU_ROW(UNSIGNED_INT_24_8), ORU_ROW(FLOAT_32_UNSIGNED_INT_24_8_REV),
+     ORU_ROW(UNSIGNED_INT_10F_11F_11F_REV)},
     kFirstLater};
 #undef ORU_ROW
 
