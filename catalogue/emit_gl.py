@@ -259,8 +259,8 @@ def error_checker(entries):
         function = f"::{entry.name}"
         if not entry.is_core:
             function = "function_"
-            lines = [f"auto const function_ = ExtensionManager::CurrentTable().{entry.name};",
-                     "if (!function_)",
+            lines = [f"auto const function_ = internal::CurrentTable().{entry.name};",
+                     "if (!ORU_LIKELY(function_))",
                      f'    ThrowMissingFunction(file, line, "{entry.name}", "{entry.group}");']
         call = f"{function}({entry.arguments})"
         check = f'CheckOpenGLError(insideBeginEnd_, file, line, "{entry.name}");'
@@ -269,12 +269,12 @@ def error_checker(entries):
         else:
             if entry.name in UNDONE_BY:
                 check = (f'CheckOpenGLError(insideBeginEnd_, file, line, "{entry.name}",\n'
-                         f"                     ExtensionManager::CurrentTable().{UNDONE_BY[entry.name]}, value_);")
+                         f"                     internal::CurrentTable().{UNDONE_BY[entry.name]}, value_);")
             lines += [f"{entry.result} const value_ = {call};", check, "return value_;"]
         body = "\n".join(f"    {text}" for text in lines)
         bodies.append(f"{entry.result} OpenGLErrorChecker::{entry.operation}({entry.full_declarations}) {{\n"
                       f"{body}\n}}")
-    return f"""#include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
+    return f"""#include "oru/oru_ogl/extensionator/internal/currenttable.h"
 #include "oru/oru_ogl/extensionator/internal/openglerrorcheck.h"
 
 namespace ORU::OGL {{

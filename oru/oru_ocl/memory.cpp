@@ -54,8 +54,7 @@ Memory::MemoryObjectType Memory::memType() const {
 
 cl_mem Memory::Checked(cl_mem handle, MemoryObjectType type) {
     if (MemoryObjectType const actual = TypeOf(handle); actual != type)
-        ORU_THROW_INTERNAL(
-            ComposeText("The memory to make ", kTypeNames[type], " of is ", kTypeNames[actual]));
+        ORU_THROW_INTERNAL("The memory to make ", kTypeNames[type], " of is ", kTypeNames[actual]);
     return handle;
 }
 

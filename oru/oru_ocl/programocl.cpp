@@ -129,9 +129,8 @@ Program::BinaryArray::BinaryArray(std::vector<Device> const &devices,
     ORU_ASSERT(sizes.size() == binaries.size());
     for (std::size_t i = 0; i < sizes.size(); ++i) // the runtime would read behind its end
         if (sizes[i] > binaries[i].size())
-            ORU_THROW_INTERNAL(ComposeText("Program::BinaryArray binary ", i, " holds ",
-                                           binaries[i].size(), " bytes, not the ", sizes[i],
-                                           " given as its size"));
+            ORU_THROW_INTERNAL("Program::BinaryArray binary ", i, " holds ", binaries[i].size(),
+                               " bytes, not the ", sizes[i], " given as its size");
 }
 
 Program::BinaryArray::BinaryArray(std::vector<cl_device_id> const &devices,

@@ -15,6 +15,13 @@
 #define ORU_COLD __attribute__((cold, noinline))
 #endif
 
+/// A condition that nearly always holds: its branch is laid out to be fallen into.
+#if defined(_MSC_VER)
+#define ORU_LIKELY(...) (__VA_ARGS__)
+#else
+#define ORU_LIKELY(...) __builtin_expect(static_cast<bool>(__VA_ARGS__), 1)
+#endif
+
 namespace ORU_private {
 
 /// Throws `ORU::InternalException(file, line, message)`.
@@ -63,5 +70,7 @@ Failure Noted(Failure failure, std::string const &note) {
 #define ORU_ASSERT_SUCCEEDED(...)                                                                  \
     ((__VA_ARGS__) >= 0 ? void(0) : ::ORU_private::ThrowInternal(__FILE__, __LINE__, #__VA_ARGS__))
 
-/// Throws `InternalException` with a text: a literal, or a string (see `ComposeText`).
-#define ORU_THROW_INTERNAL(text) ::ORU_private::ThrowInternal(__FILE__, __LINE__, text)
+/// Throws `InternalException` with a text: a literal, or a string. Several pieces are put together
+/// as `ComposeText` does, for which composetext.h is included:
+/// `ORU_THROW_INTERNAL("Unknown mode ", mode)`.
+#define ORU_THROW_INTERNAL(...) ::ORU_private::ThrowInternal(__FILE__, __LINE__, __VA_ARGS__)

@@ -225,27 +225,26 @@ void Buffer::unmap() {
 
 void Buffer::requireUnmapped(char const *operation) const {
     if (isMapped())
-        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " buffer cannot be mapped"));
+        ORU_THROW_INTERNAL("Buffer::", operation, " buffer cannot be mapped");
 }
 
 void Buffer::requireRange(char const *operation, std::int64_t offset, std::int64_t size) const {
     requireObject();
     if (offset < 0)
-        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " offset must not be negative"));
+        ORU_THROW_INTERNAL("Buffer::", operation, " offset must not be negative");
     if (size < 1)
-        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " size must be at least 1"));
+        ORU_THROW_INTERNAL("Buffer::", operation, " size must be at least 1");
     if (offset > size_ || size > size_ - offset)
-        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " the range of ", size,
-                                       " bytes from ", offset, " on leaves the buffer, which has ",
-                                       size_));
+        ORU_THROW_INTERNAL("Buffer::", operation, " the range of ", size, " bytes from ", offset,
+                           " on leaves the buffer, which has ", size_);
 }
 
 void Buffer::checkTransfer(char const *operation, std::int64_t offset, void const *data) const {
     requireUnmapped(operation);
     if (!data)
-        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " pointer to data must not be NULL"));
+        ORU_THROW_INTERNAL("Buffer::", operation, " pointer to data must not be NULL");
     if (offset < 0)
-        ORU_THROW_INTERNAL(ComposeText("Buffer::", operation, " offset must not be negative"));
+        ORU_THROW_INTERNAL("Buffer::", operation, " offset must not be negative");
 }
 
 void Buffer::subData(std::int64_t offset, std::int64_t size, void const *data) {

@@ -104,9 +104,9 @@ HGLRC Context::makeAsAsked(HDC dc, ContextAttributes const &attributes) {
     ExtensionManager const *const manager = ExtensionManager::Instance(displayDeviceKey_);
     auto const create = manager ? manager->getWglCreateContextAttribsPtr() : nullptr;
     if (!create)
-        ORU_THROW_INTERNAL(ComposeText(
+        ORU_THROW_INTERNAL(
             "A context with attributes (", Describe(attributes),
-            ") needs WGL_ARB_create_context, which the driver does not have: ask for none"));
+            ") needs WGL_ARB_create_context, which the driver does not have: ask for none");
     if (HGLRC const context = create(dc, nullptr, ListOf(attributes).data()))
         return context;
 
@@ -121,8 +121,8 @@ HGLRC Context::makeAsAsked(HDC dc, ContextAttributes const &attributes) {
         refused = wish.name;
         break;
     }
-    ORU_THROW_INTERNAL(ComposeText("No context of ", Describe(attributes), ": the driver refuses ",
-                                   refused, " (", error, "). Ask for less, or update the driver"));
+    ORU_THROW_INTERNAL("No context of ", Describe(attributes), ": the driver refuses ", refused,
+                       " (", error, "). Ask for less, or update the driver");
 }
 
 void Context::requireAttributes(ContextAttributes const &attributes) {
@@ -134,13 +134,13 @@ void Context::requireAttributes(ContextAttributes const &attributes) {
         ~traits.flags & ((attributes.isDebug() ? GL_CONTEXT_FLAG_DEBUG_BIT : 0) |
                          (attributes.isRobust() ? GL_CONTEXT_FLAG_ROBUST_ACCESS_BIT : 0));
     if (isOld || hasOtherProfile || missing)
-        ORU_THROW_INTERNAL(ComposeText("Instead of a context of ", Describe(attributes),
-                                       " the driver made one of OpenGL ", traits.major, ".",
-                                       traits.minor, traits.isCore ? " core" : "", ", without ",
-                                       isOld             ? "that version"
-                                       : hasOtherProfile ? "that profile"
-                                                         : "debug or robust access",
-                                       ". Ask for less, or update the driver"));
+        ORU_THROW_INTERNAL("Instead of a context of ", Describe(attributes),
+                           " the driver made one of OpenGL ", traits.major, ".", traits.minor,
+                           traits.isCore ? " core" : "", ", without ",
+                           isOld             ? "that version"
+                           : hasOtherProfile ? "that profile"
+                                             : "debug or robust access",
+                           ". Ask for less, or update the driver");
 }
 
 } // namespace ORU::OGL

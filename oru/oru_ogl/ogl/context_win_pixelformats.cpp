@@ -136,9 +136,9 @@ int Context::ChoosePixelFormat(HDC dc, BufferFormat const &format, bool doubleBu
 
     int const pixelFormat = ::ChoosePixelFormat(dc, &descriptor);
     if (!pixelFormat)
-        ORU_THROW_INTERNAL(ComposeText("Cannot create OpenGL Context. Can't find suitable format. "
-                                       "Windows error ",
-                                       ::GetLastError()));
+        ORU_THROW_INTERNAL("Cannot create OpenGL Context. Can't find suitable format. "
+                           "Windows error ",
+                           ::GetLastError());
     return pixelFormat;
 }
 
@@ -166,15 +166,13 @@ int Context::ChoosePixelFormat(HDC dc, BufferFormat const &format, Buffering buf
 
 void Context::setPixelFormat(HDC dc, int pixelFormat) {
     if (pixelFormat < 1)
-        ORU_THROW_INTERNAL(
-            ComposeText("Context::setPixelFormat invalid pixel format ", pixelFormat));
+        ORU_THROW_INTERNAL("Context::setPixelFormat invalid pixel format ", pixelFormat);
     pixelFormat_ = pixelFormat;
     PIXELFORMATDESCRIPTOR descriptor = {};
     descriptor.nSize = sizeof descriptor;
     if (!::SetPixelFormat(dc, pixelFormat, &descriptor))
-        ORU_THROW_INTERNAL(ComposeText("Context::setPixelFormat Unable to set pixel format ",
-                                       pixelFormat,
-                                       " on device context. Window Error: ", ::GetLastError()));
+        ORU_THROW_INTERNAL("Context::setPixelFormat Unable to set pixel format ", pixelFormat,
+                           " on device context. Window Error: ", ::GetLastError());
 }
 
 ContextAttributes Context::attributesFor(BufferFormat const &format) const {

@@ -27,8 +27,8 @@ constexpr char kDetachUnbound[] = "Framebuffer Object must be bound before detac
 GLenum ColorAttachment(unsigned int colorIndex) {
     unsigned int const maximum = Framebuffer::MaxColorAttachments();
     if (colorIndex >= maximum)
-        ORU_THROW_INTERNAL(ComposeText("Invalid color buffer attachment only ", maximum,
-                                       " attachments supported with ", colorIndex, " requested"));
+        ORU_THROW_INTERNAL("Invalid color buffer attachment only ", maximum,
+                           " attachments supported with ", colorIndex, " requested");
     return GL_COLOR_ATTACHMENT0_EXT + colorIndex;
 }
 
@@ -174,8 +174,8 @@ GLenum Framebuffer::AttachmentFor(Renderbuffer const &renderbuffer, unsigned int
     ColorAttachment(colorIndex);
     GLenum const attachment = renderbuffer.attachment();
     if (attachment != GL_COLOR_ATTACHMENT0_EXT && colorIndex != 0)
-        ORU_THROW_INTERNAL(ComposeText("Color buffer index is not supported with attachment:",
-                                       ORUOGLTokenName(attachment)));
+        ORU_THROW_INTERNAL("Color buffer index is not supported with attachment:",
+                           ORUOGLTokenName(attachment));
     return attachment + colorIndex;
 }
 
@@ -207,9 +207,9 @@ void Framebuffer::attachLayer(Texture const &texture, unsigned int level, unsign
     requireBound(kAttachUnbound);
     std::uint64_t const layers = LayersOf(texture, level);
     if (layer >= layers)
-        ORU_THROW_INTERNAL(ComposeText("There is no layer ", layer, " in a texture of ", layers,
-                                       ": they count from 0, and textures without any are attached "
-                                       "by attachTexture"));
+        ORU_THROW_INTERNAL("There is no layer ", layer, " in a texture of ", layers,
+                           ": they count from 0, and textures without any are attached "
+                           "by attachTexture");
     if (texture.target() == GL_TEXTURE_CUBE_MAP)
         return attachImage(point, GL_TEXTURE_CUBE_MAP_POSITIVE_X + layer, name, level);
     ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);

@@ -69,8 +69,8 @@ struct Edges {
     static GLsizei Length(GLint from, std::size_t size) {
         constexpr GLint kLargest = std::numeric_limits<GLint>::max();
         if (size > static_cast<std::size_t>(kLargest - std::max(from, 0)))
-            ORU_THROW_INTERNAL(ComposeText("A framebuffer's rectangle cannot reach ", size,
-                                           " pixels beyond ", from, ": no framebuffer does"));
+            ORU_THROW_INTERNAL("A framebuffer's rectangle cannot reach ", size, " pixels beyond ",
+                               from, ": no framebuffer does");
         return static_cast<GLsizei>(size);
     }
 
@@ -238,8 +238,8 @@ void Framebuffer::Blit(Framebuffer const *source, IntegerRect const &from,
     Edges const a(from), b(to);
     constexpr unsigned int kAll = CONTENTS_COLOR | CONTENTS_DEPTH | CONTENTS_STENCIL;
     if (contents == 0 || (contents & ~kAll) != 0)
-        ORU_THROW_INTERNAL(ComposeText("Framebuffer::Blit copies colour, depth and stencil, and ",
-                                       contents, " is none of them joined"));
+        ORU_THROW_INTERNAL("Framebuffer::Blit copies colour, depth and stencil, and ", contents,
+                           " is none of them joined");
     bool const smooth = filter == Texture::FILTER_LINEAR && contents == CONTENTS_COLOR;
     if (filter != Texture::FILTER_NEAREST && !smooth)
         ORU_THROW_INTERNAL("Framebuffer::Blit takes FILTER_NEAREST, or FILTER_LINEAR for colours "

@@ -27,10 +27,8 @@ MappedRange::MappedRange(Buffer &buffer, std::int64_t offset, std::int64_t size,
 MappedRange::~MappedRange() {
     if (!data_)
         return;
-    // Each step by itself: one that fails must not keep the others from being taken.
-    internal::Release([this] { buffer_.bind(); });
-    internal::Release([this] { buffer_.unmap(); });
-    internal::Release([this] { bindPrevious(); });
+    internal::Release([this] { buffer_.bind(); }, [this] { buffer_.unmap(); },
+                      [this] { bindPrevious(); });
 }
 
 void MappedRange::bindPrevious() const {

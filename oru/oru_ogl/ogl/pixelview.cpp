@@ -52,8 +52,8 @@ Size SizeOf(GLenum type) {
     case GL_FLOAT_32_UNSIGNED_INT_24_8_REV:
         return {8, true};
     default:
-        ORU_THROW_INTERNAL(ComposeText("Pixels of ", ORUOGLTokenName(type),
-                                       " are no whole bytes: give the pointer itself"));
+        ORU_THROW_INTERNAL("Pixels of ", ORUOGLTokenName(type),
+                           " are no whole bytes: give the pointer itself");
     }
 }
 
@@ -95,11 +95,11 @@ PixelView::PixelView(void const *data, std::size_t bytes, PixelShape const &shap
     std::uint64_t const needed = shape.bytes();
     std::size_t const there = data ? bytes : 0;
     if (there < needed)
-        ORU_THROW_INTERNAL(ComposeText("The memory is too short: ", shape.width, " x ",
-                                       shape.height, " x ", shape.depth, " pixels of ",
-                                       ORUOGLTokenName(Texture::Format2GL(shape.format)), " and ",
-                                       ORUOGLTokenName(Texture::Type2GL(shape.type)), " take ",
-                                       needed, " bytes, and it has ", there));
+        ORU_THROW_INTERNAL("The memory is too short: ", shape.width, " x ", shape.height, " x ",
+                           shape.depth, " pixels of ",
+                           ORUOGLTokenName(Texture::Format2GL(shape.format)), " and ",
+                           ORUOGLTokenName(Texture::Type2GL(shape.type)), " take ", needed,
+                           " bytes, and it has ", there);
 }
 
 } // namespace ORU::OGL

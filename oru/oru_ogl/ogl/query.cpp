@@ -38,8 +38,7 @@ constexpr internal::Translation<Query::Type, 6, TypeRow> kTypes = {
 void RequireSupport(Query::Type type) {
     TypeRow const &row = *kTypes.find(type);
     if (!internal::Supports(row.needed))
-        ORU_THROW_INTERNAL(
-            ComposeText("ExtensionManager::Instance()->isSupported(", row.neededName, ")"));
+        ORU_THROW_INTERNAL("ExtensionManager::Instance()->isSupported(", row.neededName, ")");
 }
 
 } // namespace

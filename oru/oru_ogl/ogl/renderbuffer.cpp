@@ -48,17 +48,17 @@ Renderbuffer::Renderbuffer(unsigned int format, int width, int height, int sampl
     ORU_ASSERT_SUPPORTED(GL_EXT_FRAMEBUFFER_OBJECT);
     int const maximum = MaxSize();
     if (width > maximum)
-        ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of width ", width,
-                                       ", a max width of ", maximum, " is supported"));
+        ORU_THROW_INTERNAL("Can't create renderbuffer of width ", width, ", a max width of ",
+                           maximum, " is supported");
     if (height > maximum) // the check's text is what hosts see, with its "width"
-        ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of width ", height,
-                                       ", a max height of ", maximum, " is supported"));
+        ORU_THROW_INTERNAL("Can't create renderbuffer of width ", height, ", a max height of ",
+                           maximum, " is supported");
     if (samples != 0) {
         ORU_ASSERT_SUPPORTED(GL_ARB_FRAMEBUFFER_OBJECT);
         int const most = MaxSamples();
         if (samples < 0 || samples > most)
-            ORU_THROW_INTERNAL(ComposeText("Can't create renderbuffer of ", samples,
-                                           " samples, at most ", most, " are supported"));
+            ORU_THROW_INTERNAL("Can't create renderbuffer of ", samples, " samples, at most ", most,
+                               " are supported");
     }
     try {
         ORU_GL(GenRenderbuffersEXT, 1, &objectID_);

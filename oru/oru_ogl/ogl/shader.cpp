@@ -60,8 +60,8 @@ void Shader::loadSource(std::string_view source) {
     char const *const text = source.empty() ? "" : source.data();
     // OpenGL would take a length that wraps around to less than 0 for a text that ends with a zero.
     if (source.size() > static_cast<std::size_t>(std::numeric_limits<int>::max()))
-        ORU_THROW_INTERNAL(ComposeText("A shader's source of ", source.size(),
-                                       " bytes is longer than OpenGL counts"));
+        ORU_THROW_INTERNAL("A shader's source of ", source.size(),
+                           " bytes is longer than OpenGL counts");
     int const length = static_cast<int>(source.size());
     load(1, &text, &length);
 }

@@ -3,7 +3,6 @@
 
 #include "oru/core/utility/dropexceptions.h"
 #include "oru/oru_ogl/extensionator/glcall.h"
-#include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <algorithm>
@@ -142,7 +141,7 @@ public:
 
     static void Set(GLint const *from, GLint const *to) {
         try {
-            ForEachDifference(from, to, [to](auto piece) { SetPiece(piece, to); });
+            ForEachPiece([=](auto piece) { SetDifference(piece, from, to); });
         } catch (...) {
             PutBack(to, from);
             throw;
@@ -150,10 +149,8 @@ public:
     }
 
     static void PutBack(GLint const *from, GLint const *to) noexcept {
-        internal::Release([&] {
-            ForEachDifference(from, to,
-                              [to](auto piece) { DropExceptions([&] { SetPiece(piece, to); }); });
-        });
+        ForEachPiece(
+            [=](auto piece) { DropExceptions([=] { SetDifference(piece, from, to); }); });
     }
 
 private:
@@ -169,18 +166,11 @@ private:
         (each(std::integral_constant<std::size_t, kRange.begin + Index>()), ...);
     }
 
-    template<class Set>
-    static void ForEachDifference(GLint const *from, GLint const *to, Set set) {
-        ForEachPiece([&](auto piece) {
-            constexpr std::size_t kPlace = PlaceOf(piece), kEnd = kPlace + kPieces[piece].count;
-            if (!std::equal(from + kPlace, from + kEnd, to + kPlace))
-                set(piece);
-        });
-    }
-
     template<class Index>
-    static void SetPiece(Index piece, GLint const *values) {
-        kPieces[piece].set(values + PlaceOf(piece));
+    static void SetDifference(Index piece, GLint const *from, GLint const *to) {
+        constexpr std::size_t kPlace = PlaceOf(piece), kEnd = kPlace + kPieces[piece].count;
+        if (!std::equal(from + kPlace, from + kEnd, to + kPlace))
+            kPieces[piece].set(to + kPlace);
     }
 };
 
@@ -211,6 +201,11 @@ GLint const *Values(void const *state) {
 
 void StateAccess::Read(StateKind kind, void *state) {
     FunctionsFor(kind).read(static_cast<GLint *>(state));
+}
+
+void StateAccess::Change(StateKind kind, void *found, void const *wanted) {
+    Read(kind, found);
+    Set(kind, found, wanted);
 }
 
 void StateAccess::Set(StateKind kind, void const *from, void const *to) {

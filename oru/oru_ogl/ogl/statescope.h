@@ -100,6 +100,9 @@ public:
     /// Reads a state of the current context. @note glGetIntegerv
     static void Read(StateKind kind, void *state);
 
+    /// Reads a state, and makes the calls for what differs from the one that is wanted.
+    static void Change(StateKind kind, void *found, void const *wanted);
+
     /// Makes the calls for what differs between two states; what was set before one of them fails
     /// is put back.
     static void Set(StateKind kind, void const *from, void const *to);
@@ -133,9 +136,8 @@ class TemporaryStateScope {
 public:
     /// Sets all of a state.
     /// @throws ExceptionOGL for values that OpenGL does not know; nothing is changed then
-    explicit TemporaryStateScope(State const &wanted)
-        : found_(CurrentState<State>()), set_(wanted) {
-        StateAccess::Set(State::kKind, &found_, &set_);
+    explicit TemporaryStateScope(State const &wanted) : set_(wanted) {
+        StateAccess::Change(State::kKind, &found_, &set_);
     }
 
     /// Sets what `change` makes of the state that is found.

@@ -53,8 +53,8 @@ Texture::InternalFormat FormatOf(GLenum gl) {
         return row->value;
     auto const *const row = internal::kLaterFormats.findGL(gl);
     if (!row)
-        ORU_THROW_INTERNAL(ComposeText("A texture of the format ", ORUOGLTokenName(gl),
-                                       " cannot be taken over: no InternalFormat stands for it"));
+        ORU_THROW_INTERNAL("A texture of the format ", ORUOGLTokenName(gl),
+                           " cannot be taken over: no InternalFormat stands for it");
     return row->value;
 }
 
@@ -95,7 +95,7 @@ Texture::Texture(Target target, TargetBinding binding, unsigned int name, owners
              target == TARGET_TEXTURE_CUBE_MAP_ARRAY)
         depth_ = ofLevel0(GL_TEXTURE_DEPTH);
     if (width_ == 0)
-        ORU_THROW_INTERNAL(ComposeText("The texture ", name, " has no level 0 yet"));
+        ORU_THROW_INTERNAL("The texture ", name, " has no level 0 yet");
     GLenum internalFormat = ofLevel0(GL_TEXTURE_INTERNAL_FORMAT);
     if (internalFormat == GL_DEPTH_COMPONENT) {
         unsigned int const bits = ofLevel0(GL_TEXTURE_DEPTH_SIZE);
@@ -215,10 +215,10 @@ void Texture::setCompare(Compare compare) {
 void Texture::setLevelRange(unsigned int first, unsigned int last) {
     constexpr unsigned int kMostLevels = 1000; // what OpenGL itself begins with as the last
     if (last < first || last > kMostLevels)
-        ORU_THROW_INTERNAL(ComposeText("Levels ", first, " to ", last,
-                                       " are no range: the last is not before the first, and at "
-                                       "most ",
-                                       kMostLevels));
+        ORU_THROW_INTERNAL("Levels ", first, " to ", last,
+                           " are no range: the last is not before the first, and at "
+                           "most ",
+                           kMostLevels);
     ORU_GL(TexParameteri, target(), GL_TEXTURE_BASE_LEVEL, static_cast<GLint>(first));
     ORU_GL(TexParameteri, target(), GL_TEXTURE_MAX_LEVEL, static_cast<GLint>(last));
 }
@@ -247,12 +247,12 @@ std::size_t Texture::compressedSize(unsigned int level) const {
 void Texture::checkCompressed(std::uint64_t width, std::uint64_t height, std::uint64_t depth,
                               std::size_t bytes) const {
     if (!IsCompressed(format()))
-        ORU_THROW_INTERNAL(ComposeText("A texture of ", format(),
-                                       " is not compressed: use subImage and getPixelData"));
+        ORU_THROW_INTERNAL("A texture of ", format(),
+                           " is not compressed: use subImage and getPixelData");
     std::size_t const needed = SizeInBytes(format(), width, height, depth);
     if (bytes != needed)
-        ORU_THROW_INTERNAL(ComposeText("Blocks of ", format(), " for ", width, " x ", height, " x ",
-                                       depth, " texels take ", needed, " bytes, not ", bytes));
+        ORU_THROW_INTERNAL("Blocks of ", format(), " for ", width, " x ", height, " x ", depth,
+                           " texels take ", needed, " bytes, not ", bytes);
 }
 
 void Texture::checkCompressedLevel(int level, std::uint64_t depth, std::size_t bytes) const {
@@ -290,8 +290,8 @@ std::size_t Texture::SizeInBytes(InternalFormat format, std::uint64_t width, std
     std::size_t const channels = Channels(format);
     auto const &row = *internal::kInternalFormats.find(format);
     if (row.bytes == 0)
-        ORU_THROW_INTERNAL(ComposeText("Texture::SizeInBytes Unknown color channels for format ",
-                                       ORUOGLTokenName(row.gl)));
+        ORU_THROW_INTERNAL("Texture::SizeInBytes Unknown color channels for format ",
+                           ORUOGLTokenName(row.gl));
     return channels * row.bytes * width * height * depth;
 }
 
@@ -301,8 +301,8 @@ std::size_t Texture::BytesPerPixel(Format format, Type type) {
         return static_cast<std::size_t>(PixelShape{format, type}.bytesPerPixel());
     auto const *const row = internal::kTypes.find(type);
     if (!row || row->bytes == 0)
-        ORU_THROW_INTERNAL(ComposeText("pixelDataSize: Unknown type ",
-                                       row ? ORUOGLTokenName(row->gl) : "Unknown Token"));
+        ORU_THROW_INTERNAL("pixelDataSize: Unknown type ",
+                           row ? ORUOGLTokenName(row->gl) : "Unknown Token");
     return channels * row->bytes;
 }
 

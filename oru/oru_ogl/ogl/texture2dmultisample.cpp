@@ -17,8 +17,7 @@ Texture2DMultisample::Texture2DMultisample(InternalFormat format, std::uint64_t 
               width, height, 1) {
     unsigned int const most = MaxSamples();
     if (samples < 1 || samples > most)
-        ORU_THROW_INTERNAL(
-            ComposeText("A texel cannot have ", samples, " samples: ask for 1 to ", most));
+        ORU_THROW_INTERNAL("A texel cannot have ", samples, " samples: ask for 1 to ", most);
     internal::BoundObjectScope bound(*this, ORU_BINDER(BindTexture));
     auto const sides = internal::ToSides(width, height);
     ORU_GL(TexImage2DMultisample, target(), static_cast<GLsizei>(samples),

@@ -57,8 +57,8 @@ std::uint64_t TextureCube::depth(unsigned int /*level*/) const {
 
 unsigned int TextureCube::Face2GL(Face face) {
     if (face >= kFaceCount)
-        ORU_THROW_INTERNAL(ComposeText("A cube map has no face ", static_cast<unsigned int>(face),
-                                       ": they count from 0 to 5"));
+        ORU_THROW_INTERNAL("A cube map has no face ", static_cast<unsigned int>(face),
+                           ": they count from 0 to 5");
     return GL_TEXTURE_CUBE_MAP_POSITIVE_X + face;
 }
 

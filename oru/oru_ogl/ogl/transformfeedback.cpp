@@ -75,9 +75,9 @@ void TransformFeedback::setBuffer(unsigned int index, Buffer const &buffer, std:
                                   std::size_t size) {
     if (size == 0 || offset > buffer.size() || size > buffer.size() - offset || offset % 4 != 0 ||
         size % 4 != 0)
-        ORU_THROW_INTERNAL(ComposeText("Feedback goes to whole multiples of 4 bytes within its "
-                                       "buffer: not to ",
-                                       size, " bytes behind ", offset, " of ", buffer.size()));
+        ORU_THROW_INTERNAL("Feedback goes to whole multiples of 4 bytes within its "
+                           "buffer: not to ",
+                           size, " bytes behind ", offset, " of ", buffer.size());
     internal::BoundObjectScope bound(*this, ORU_BINDER(BindTransformFeedback));
     // The call binds the buffer to the target itself, too, beside the object's place for it.
     GLint previous = 0;

@@ -40,7 +40,7 @@ UniformBlock::UniformBlock(Program const &program, std::string const &name)
     ORU_ASSERT_SUPPORTED(GL_ARB_UNIFORM_BUFFER_OBJECT);
     index_ = ORU_GL(GetUniformBlockIndex, program_, name.c_str());
     if (index_ == GL_INVALID_INDEX)
-        ORU_THROW_INTERNAL(ComposeText("The program has no active uniform block \"", name, "\""));
+        ORU_THROW_INTERNAL("The program has no active uniform block \"", name, "\"");
     size_ = static_cast<unsigned int>(parameter(GL_UNIFORM_BLOCK_DATA_SIZE));
     askForMembers();
 }
@@ -95,8 +95,7 @@ UniformBlock::Member const &UniformBlock::member(std::string_view name) const {
     if (found == members_.end())
         found = std::find_if(members_.begin(), members_.end(), named(withoutPrefix(name)));
     if (found == members_.end())
-        ORU_THROW_INTERNAL(
-            ComposeText("The uniform block \"", name_, "\" has no active member \"", name, "\""));
+        ORU_THROW_INTERNAL("The uniform block \"", name_, "\" has no active member \"", name, "\"");
     return *found;
 }
 

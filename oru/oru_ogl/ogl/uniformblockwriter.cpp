@@ -48,9 +48,9 @@ TypeRow const &RowOf(UniformBlock::Member const &member) {
         std::find_if(std::begin(kTypes), std::end(kTypes),
                      [&](TypeRow const &row) { return row.type == member.type; });
     if (found == std::end(kTypes))
-        ORU_THROW_INTERNAL(ComposeText("The uniform \"", member.name, "\" is of the type ",
-                                       ORUOGLTokenName(member.type),
-                                       ", which UniformBlockWriter does not know"));
+        ORU_THROW_INTERNAL("The uniform \"", member.name, "\" is of the type ",
+                           ORUOGLTokenName(member.type),
+                           ", which UniformBlockWriter does not know");
     return *found;
 }
 
@@ -98,8 +98,8 @@ void UniformBlockWriter::putNumbers(UniformBlock::Member const &member, Kind kin
     TypeRow const &row = RowOf(member);
     std::size_t const each = std::size_t{row.columns} * row.rows;
     if (amount % each != 0)
-        ORU_THROW_INTERNAL(ComposeText("The uniform \"", member.name, "\" takes ", each,
-                                       " numbers for each element, and was given ", amount));
+        ORU_THROW_INTERNAL("The uniform \"", member.name, "\" takes ", each,
+                           " numbers for each element, and was given ", amount);
     put(member, kind, numbers, static_cast<unsigned int>(amount / each), first);
 }
 
@@ -107,17 +107,16 @@ void UniformBlockWriter::put(UniformBlock::Member const &member, Kind kind, void
                              unsigned int count, unsigned int first) {
     TypeRow const &row = RowOf(member);
     if (!Takes(row.component, kComponents[kind]))
-        ORU_THROW_INTERNAL(ComposeText("The uniform \"", member.name, "\" is of the type ",
-                                       ORUOGLTokenName(member.type), ", and was given values of ",
-                                       ORUOGLTokenName(kComponents[kind])));
+        ORU_THROW_INTERNAL("The uniform \"", member.name, "\" is of the type ",
+                           ORUOGLTokenName(member.type), ", and was given values of ",
+                           ORUOGLTokenName(kComponents[kind]));
     if (first > member.count || count > member.count - first)
-        ORU_THROW_INTERNAL(ComposeText("The uniform \"", member.name, "\" has ", member.count,
-                                       " elements, and was given ", count, " from ", first, " on"));
+        ORU_THROW_INTERNAL("The uniform \"", member.name, "\" has ", member.count,
+                           " elements, and was given ", count, " from ", first, " on");
     std::size_t const number = kind == DOUBLE ? sizeof(GLdouble) : sizeof(GLfloat);
     if (count > 0 && EndOf(member, row, number, first + count - 1) > bytes_.size())
-        ORU_THROW_INTERNAL(ComposeText("The uniform \"", member.name,
-                                       "\" is of another block than \"", block_.name(),
-                                       "\": it would lie behind it"));
+        ORU_THROW_INTERNAL("The uniform \"", member.name, "\" is of another block than \"",
+                           block_.name(), "\": it would lie behind it");
     auto const *from = static_cast<unsigned char const *>(values);
     unsigned char *element =
         bytes_.data() + member.offset + std::size_t{first} * member.arrayStride;
@@ -137,9 +136,9 @@ void UniformBlockWriter::upload(Buffer &buffer, std::int64_t offset) const {
     auto const size = static_cast<std::int64_t>(bytes_.size());
     auto const room = static_cast<std::int64_t>(buffer.size());
     if (offset > room || size > room - offset)
-        ORU_THROW_INTERNAL(ComposeText("The uniform block \"", block_.name(), "\" of ", size,
-                                       " bytes does not fit into the buffer of ", room, " from ",
-                                       offset, " on"));
+        ORU_THROW_INTERNAL("The uniform block \"", block_.name(), "\" of ", size,
+                           " bytes does not fit into the buffer of ", room, " from ", offset,
+                           " on");
     internal::BoundObjectScope bound(buffer, ORU_BINDER(BindBuffer));
     buffer.subData(offset, size, bytes_.data());
     bound.restore();

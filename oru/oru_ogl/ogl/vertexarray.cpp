@@ -73,9 +73,9 @@ template<class Draw>
 void WithCommands(Buffer const &commands, std::int64_t offset, std::int64_t size, Draw draw) {
     ORU_ASSERT_SUPPORTED(GL_ARB_DRAW_INDIRECT);
     if (offset < 0 || offset % 4 != 0 || offset > static_cast<std::int64_t>(commands.size()) - size)
-        ORU_THROW_INTERNAL(ComposeText("A draw of ", size, " bytes in the buffer of ",
-                                       commands.size(), " cannot stand at ", offset,
-                                       ": it has to lie in the buffer, at a multiple of 4"));
+        ORU_THROW_INTERNAL("A draw of ", size, " bytes in the buffer of ", commands.size(),
+                           " cannot stand at ", offset,
+                           ": it has to lie in the buffer, at a multiple of 4");
     WithBuffer(GL_DRAW_INDIRECT_BUFFER, GL_DRAW_INDIRECT_BUFFER_BINDING, commands.objectID(),
                [=] { draw(AsPointer(offset)); });
 }
@@ -198,8 +198,8 @@ void VertexArray::requireIndices() const {
 void const *VertexArray::placeOfIndices(int count, std::int64_t first) const {
     requireIndices();
     if (first < 0 || first > indexCount_ || count > indexCount_ - first)
-        ORU_THROW_INTERNAL(ComposeText("The vertex array has ", indexCount_, " indices, not ",
-                                       count, " from ", first, " on"));
+        ORU_THROW_INTERNAL("The vertex array has ", indexCount_, " indices, not ", count, " from ",
+                           first, " on");
     return AsPointer(first * SizeOfIndex(indexType_));
 }
 

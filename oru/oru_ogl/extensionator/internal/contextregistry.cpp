@@ -25,7 +25,7 @@ ContextRegistry::Slot ContextRegistry::sIndex_[kSlots + kProbes];
 ContextRegistry::Slot *ContextRegistry::FindSlot(HGLRC context) {
     Slot *const first = sIndex_ + Hash(context);
     for (Slot *slot = first; slot != first + kProbes; ++slot)
-        if (slot->context.load(std::memory_order_acquire) == Key(context))
+        if (Holds(*slot, context))
             return slot;
     return nullptr;
 }

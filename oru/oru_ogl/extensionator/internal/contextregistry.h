@@ -1,6 +1,7 @@
 // Which capability record belongs to which rendering context.
 #pragma once
 
+#include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/windowsforward.h"
 
 #include <atomic>
@@ -29,14 +30,19 @@ public:
     /// The context's record, or null.
     static ExtensionManager *Find(HGLRC context);
 
-    /// The function table of the context's record when the index knows the context, else null.
-    static FunctionTable const *FindTable(HGLRC context) {
-        // The first place is the right one but for a collision of two contexts in use.
+    /// @name At once
+    /// The record, or its function table, when the index has the context at its first place, which
+    /// is where it is but for a collision of two contexts in use; else null.
+    /// @{
+    static ExtensionManager *FindAtOnce(HGLRC context) {
         Slot const &slot = sIndex_[Hash(context)];
-        if (slot.context.load(std::memory_order_acquire) == Key(context))
-            return slot.table.load(std::memory_order_relaxed);
-        return nullptr;
+        return ORU_LIKELY(Holds(slot, context)) ? slot.record.load(std::memory_order_relaxed) : nullptr;
     }
+    static FunctionTable const *FindTable(HGLRC context) {
+        Slot const &slot = sIndex_[Hash(context)];
+        return ORU_LIKELY(Holds(slot, context)) ? slot.table.load(std::memory_order_relaxed) : nullptr;
+    }
+    /// @}
 
     /// Adds an entry; one already present for the context stays.
     /// @param table the record's function table
@@ -84,6 +90,10 @@ private:
     /// Fibonacci hashing: handles differ in a few low or middle bits only.
     static std::size_t Hash(HGLRC context) {
         return (Key(context) * std::uintptr_t(0x9E3779B97F4A7C15)) >> (64 - kSlotBits);
+    }
+
+    static bool Holds(Slot const &slot, HGLRC context) {
+        return slot.context.load(std::memory_order_acquire) == Key(context);
     }
 
     static Slot *FindSlot(HGLRC context);

@@ -22,10 +22,11 @@ namespace ORU::OGL {
 /// where OpenGL allows no query.
 inline void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const *file,
                              unsigned int line, char const *function) {
-    if (insideBeginEnd.load(std::memory_order_relaxed))
-        return;
-    if (GLenum const error = ::glGetError())
-        ThrowOpenGLError(file, line, error, function);
+    if (ORU_LIKELY(!insideBeginEnd.load(std::memory_order_relaxed))) {
+        GLenum const error = ::glGetError();
+        if (!ORU_LIKELY(error == GL_NO_ERROR))
+            ThrowOpenGLError(file, line, error, function);
+    }
 }
 
 /// The same after a call that made a name, which goes before the exception does: nobody else has

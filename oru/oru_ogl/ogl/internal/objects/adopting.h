@@ -12,8 +12,7 @@ namespace ORU::OGL::internal {
 /// @throws InternalException unless it is one
 inline void RequireName(bool isOne, unsigned int name, char const *kind) {
     if (!isOne)
-        ORU_THROW_INTERNAL(
-            ComposeText("The name ", name, " is no ", kind, " of the current context"));
+        ORU_THROW_INTERNAL("The name ", name, " is no ", kind, " of the current context");
 }
 
 } // namespace ORU::OGL::internal

@@ -4,17 +4,21 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
-#include "oru/oru_ogl/extensionator/wgl/wglcall.h"
+#include "oru/oru_ogl/extensionator/internal/contextregistry.h"
+#include "oru/oru_ogl/extensionator/internal/currentcontext.h"
 
 namespace ORU::OGL::internal {
 
 /// The record of the current context, null without one. A core context that the host made may have
 /// none yet, and the defaults for unknown contexts are not for it: its record is made.
 inline ExtensionManager const *RecordOfCurrent() {
-    ExtensionManager const *const record = ExtensionManager::Instance();
+    HGLRC const context = ORU_CURRENT_CONTEXT();
+    if (ExtensionManager const *record = ContextRegistry::FindAtOnce(context))
+        return record;
+    ExtensionManager const *const record = ExtensionManager::Instance(context);
     if (record || !IsCoreContext())
         return record;
-    return ExtensionManager::InstanceGuaranteed(ORU_WGL0(GetCurrentContext));
+    return ExtensionManager::InstanceGuaranteed(context);
 }
 
 /// Whether there is a current context and a test of its record holds:
@@ -27,7 +31,8 @@ bool CurrentRecord(bool (ExtensionManager::*test)(Parameters...) const, Paramete
 
 /// Whether there is a current context and it has a capability.
 inline bool Supports(OpenGLExtension e) {
-    return CurrentRecord(&ExtensionManager::isSupported, e);
+    ExtensionManager const *const record = RecordOfCurrent();
+    return record && record->isSupported(e);
 }
 
 } // namespace ORU::OGL::internal

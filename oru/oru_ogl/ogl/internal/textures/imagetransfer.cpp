@@ -15,15 +15,14 @@ namespace ORU::OGL::internal {
 void ThrowPart(char const *operation, int level, std::initializer_list<Side> sides) {
     for (Side const &side : sides) {
         if (side.size == 0)
-            ORU_THROW_INTERNAL(
-                ComposeText("error ", operation, " ", side.padded, " of zero supplied"));
+            ORU_THROW_INTERNAL("error ", operation, " ", side.padded, " of zero supplied");
     }
     if (level < 0)
         ORU_THROW_INTERNAL("a negative texture image mip-map level supplied");
     for (Side const &side : sides) {
         if (side.size > side.limit)
-            ORU_THROW_INTERNAL(ComposeText(side.name, "(", side.size, ") is greater than ",
-                                           side.padded, " of image (", side.limit, ") "));
+            ORU_THROW_INTERNAL(side.name, "(", side.size, ") is greater than ", side.padded,
+                               " of image (", side.limit, ") ");
     }
     ORU_ASSERT(!"A part that breaks no rule.");
 }
@@ -37,8 +36,8 @@ void CheckBuffer(Buffer const *buffer) {
 void CheckUnpackBuffer(Buffer const *buffer, std::uint64_t offset) {
     ORU_ENFORCE_TEXT("buffer != NULL", buffer);
     if (offset >= buffer->size())
-        ORU_THROW_INTERNAL(ComposeText(
-            "offset(", offset, ") is greater than pixel buffer object size", buffer->size()));
+        ORU_THROW_INTERNAL("offset(", offset, ") is greater than pixel buffer object size",
+                           buffer->size());
     CheckBuffer(buffer);
 }
 
@@ -84,20 +83,20 @@ bool IsFormatSupported(Texture::InternalFormat format) {
 void RequireFormat(Texture::InternalFormat format) {
     if (auto const *const row = kLaterFormats.find(format)) {
         if (RecordOfCurrent() && !IsFormatSupported(format))
-            ORU_THROW_INTERNAL(ComposeText("The current context has no textures of ", row->name,
-                                           ": ask Texture::IsFormatSupported first"));
+            ORU_THROW_INTERNAL("The current context has no textures of ", row->name,
+                               ": ask Texture::IsFormatSupported first");
         return;
     }
     if (IsDeprecated(format) && IsCoreContext())
-        ORU_THROW_INTERNAL(ComposeText(format, " needs a compatibility context: in a core one use "
-                                               "a format of red, or of red and green"));
+        ORU_THROW_INTERNAL(format, " needs a compatibility context: in a core one use "
+                                   "a format of red, or of red and green");
 }
 
 void RequireAnisotropy(float ratio) {
     ORU_ASSERT_SUPPORTED(GL_EXT_TEXTURE_FILTER_ANISOTROPIC);
     float const most = Texture::MaxAnisotropy();
     if (!(ratio >= 1 && ratio <= most))
-        ORU_THROW_INTERNAL(ComposeText("An anisotropy of ", ratio, " is not from 1 to ", most));
+        ORU_THROW_INTERNAL("An anisotropy of ", ratio, " is not from 1 to ", most);
 }
 
 void CheckSameKind(Texture::InternalFormat format, Texture::Format pixels) {
@@ -106,9 +105,9 @@ void CheckSameKind(Texture::InternalFormat format, Texture::Format pixels) {
     unsigned int const glFormat = Texture::Format2GL(pixels);
     TexelKind const memory = KindOf(glFormat);
     if (texels != memory)
-        ORU_THROW_INTERNAL(ComposeText("A texture of ", format, " holds ", NameOf(texels),
-                                       ", and pixels of ", ORUOGLTokenName(glFormat), " are ",
-                                       NameOf(memory), ": transfer it in a format of its kind"));
+        ORU_THROW_INTERNAL("A texture of ", format, " holds ", NameOf(texels), ", and pixels of ",
+                           ORUOGLTokenName(glFormat), " are ", NameOf(memory),
+                           ": transfer it in a format of its kind");
 }
 
 GLenum StorageType(Texture::InternalFormat format) {
@@ -123,9 +122,9 @@ PixelLayout LayoutOf(Texture::Format format, Texture::Type type) {
         format == Texture::FORMAT_LUMINANCE || format == Texture::FORMAT_LUMINANCE_ALPHA ||
         type == Texture::TYPE_BITMAP;
     if (isDeprecated && IsCoreContext())
-        ORU_THROW_INTERNAL(ComposeText(
+        ORU_THROW_INTERNAL(
             "Pixels of ", ORUOGLTokenName(layout.format), " and ", ORUOGLTokenName(layout.type),
-            " need a compatibility context: in a core one use FORMAT_RED or FORMAT_RG"));
+            " need a compatibility context: in a core one use FORMAT_RED or FORMAT_RG");
     return layout;
 }
 

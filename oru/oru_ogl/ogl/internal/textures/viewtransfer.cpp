@@ -9,9 +9,8 @@ namespace ORU::OGL::internal {
 
 void CheckSides(PixelShape const &pixels, std::size_t sides) {
     if ((sides < 3 && pixels.depth != 1) || (sides < 2 && pixels.height != 1))
-        ORU_THROW_INTERNAL(ComposeText("Pixels of ", pixels.width, " x ", pixels.height, " x ",
-                                       pixels.depth,
-                                       " have more sides than the texture, which has ", sides));
+        ORU_THROW_INTERNAL("Pixels of ", pixels.width, " x ", pixels.height, " x ", pixels.depth,
+                           " have more sides than the texture, which has ", sides);
 }
 
 void CheckLevel(Texture const &texture, GLenum image, PixelShape const &pixels, int level) {
@@ -32,17 +31,17 @@ void CheckLevel(Texture const &texture, GLenum image, PixelShape const &pixels, 
                                     ? side(GL_TEXTURE_DEPTH)
                                     : std::min<std::uint64_t>(width, 1);
     if (pixels.width != width || pixels.height != height || pixels.depth != depth)
-        ORU_THROW_INTERNAL(ComposeText("Level ", level, " has ", width, " x ", height, " x ", depth,
-                                       " texels and is read as a whole: the pixels are ",
-                                       pixels.width, " x ", pixels.height, " x ", pixels.depth));
+        ORU_THROW_INTERNAL("Level ", level, " has ", width, " x ", height, " x ", depth,
+                           " texels and is read as a whole: the pixels are ", pixels.width, " x ",
+                           pixels.height, " x ", pixels.depth);
 }
 
 void ReadBlocks(GLenum image, int level, void *pixels, std::size_t bytes) {
     GLint there = 0;
     ORU_GL(GetTexLevelParameteriv, image, level, GL_TEXTURE_COMPRESSED_IMAGE_SIZE, &there);
     if (static_cast<std::size_t>(there) != bytes) // other code may have made it, of any size
-        ORU_THROW_INTERNAL(ComposeText("OpenGL has ", there, " bytes of blocks in level ", level,
-                                       ", not ", bytes));
+        ORU_THROW_INTERNAL("OpenGL has ", there, " bytes of blocks in level ", level, ", not ",
+                           bytes);
     WithPackState(PixelShape(), [&] { ORU_GL(GetCompressedTexImage, image, level, pixels); });
 }
 
