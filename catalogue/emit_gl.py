@@ -35,6 +35,7 @@ def emit(folder, writer):
         "gloperations.inc": operations(catalogue),
         "extensionmanagerogl_loaders.inc": loader_declarations(catalogue),
         "extensionmanagerogl_loaders.cpp": loaders(catalogue),
+        "internal/librarycalls.h": library_calls(catalogue),
         "prototypechecks.cpp": prototype_checks(catalogue),
     }
     for title, entries in catalogue.chunks():
@@ -250,28 +251,31 @@ static_assert(sizeof(FunctionTable) == {len(catalogue.extended)} * sizeof(void *
 """
 
 
+def call(entry, check):
+    """The lines that make the real call of an entry point, and then `check`: what follows its closing quote."""
+    lines = []
+    function = f"::{entry.name}"
+    if not entry.is_core:
+        function = "function_"
+        lines = [f"auto const function_ = internal::CurrentTable().{entry.name};",
+                 "if (!ORU_LIKELY(function_))",
+                 f'    ThrowMissingFunction(file, line, "{entry.name}", "{entry.group}");']
+    made = f"{function}({entry.arguments})"
+    if entry.result == "void":
+        return lines + [f"{made};", check]
+    return lines + [f"{entry.result} const value_ = {made};", check, "return value_;"]
+
+
 def error_checker(entries):
     bodies = []
     for entry in entries:
         if entry.name in HAND_CHECKED:
             continue
-        lines = []
-        function = f"::{entry.name}"
-        if not entry.is_core:
-            function = "function_"
-            lines = [f"auto const function_ = internal::CurrentTable().{entry.name};",
-                     "if (!ORU_LIKELY(function_))",
-                     f'    ThrowMissingFunction(file, line, "{entry.name}", "{entry.group}");']
-        call = f"{function}({entry.arguments})"
-        check = f'CheckOpenGLError(insideBeginEnd_, file, line, "{entry.name}");'
-        if entry.result == "void":
-            lines += [f"{call};", check]
-        else:
-            if entry.name in UNDONE_BY:
-                check = (f'CheckOpenGLError(insideBeginEnd_, file, line, "{entry.name}",\n'
-                         f"                     internal::CurrentTable().{UNDONE_BY[entry.name]}, value_);")
-            lines += [f"{entry.result} const value_ = {call};", check, "return value_;"]
-        body = "\n".join(f"    {text}" for text in lines)
+        undone = ""
+        if entry.name in UNDONE_BY:
+            undone = f",\n                     internal::CurrentTable().{UNDONE_BY[entry.name]}, value_"
+        check = f'CheckOpenGLError(insideBeginEnd_, file, line, "{entry.name}"{undone});'
+        body = "\n".join(f"    {text}" for text in call(entry, check))
         bodies.append(f"{entry.result} OpenGLErrorChecker::{entry.operation}({entry.full_declarations}) {{\n"
                       f"{body}\n}}")
     return f"""#include "oru/oru_ogl/extensionator/internal/currenttable.h"
@@ -282,4 +286,29 @@ namespace ORU::OGL {{
 {chr(10).join(bodies)}
 
 }} // namespace ORU::OGL
+"""
+
+
+def library_calls(catalogue):
+    functions = []
+    for entry in catalogue.entry_points:
+        chain = f"OpenGLInterceptor::Instance()->{entry.operation}({entry.full_arguments});"
+        body = [f"return {chain}"]
+        if entry.name not in HAND_CHECKED and entry.name not in UNDONE_BY:
+            body = ["if (!ORU_LIKELY(IsOpenGLChainPlain()))", f"    return {chain}"]
+            body += call(entry, f'CheckOpenGLError(file, line, "{entry.name}");')
+        text = "\n".join(f"    {line}" for line in body)
+        functions.append(f"inline {entry.result} Call{entry.short_name}({entry.full_declarations}) {{\n{text}\n}}")
+    return f"""#pragma once
+
+#include "oru/oru_ogl/extensionator/internal/currenttable.h"
+#include "oru/oru_ogl/extensionator/internal/openglerrorcheck.h"
+
+// What the operations of the chain's first link do, for calls of the library itself. While the chain is its
+// last link alone, the call and its check are made in place.
+namespace ORU::OGL::internal {{
+
+{chr(10).join(functions)}
+
+}} // namespace ORU::OGL::internal
 """

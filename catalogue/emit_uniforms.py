@@ -100,7 +100,7 @@ def bodies(rows):
                 lines = "\n".join(f"    {line}" for line in body(row, suffix, subject))
                 functions.append(f"void ProgramImplCore::{row.setter}{suffix}({parameter}, {row.parameters}) {{\n"
                                  f"{lines}\n}}")
-    return f"""#include "oru/oru_ogl/extensionator/glcall.h"
+    return f"""#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/programimplcore.h"
 #include "oru/oru_ogl/platformgl.h"
 

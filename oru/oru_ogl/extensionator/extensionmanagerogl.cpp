@@ -4,7 +4,7 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/tokenize.h"
 #include "oru/core/utility/versionstring.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/catalogueogl.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/extensionator/internal/contextservices.h"

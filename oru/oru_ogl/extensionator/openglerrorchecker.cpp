@@ -63,6 +63,7 @@ void OpenGLErrorChecker::cgmBegin(char const *file, unsigned int line, GLenum mo
     if (insideBeginEnd_.load(std::memory_order_relaxed))
         throw ExceptionOGL(file, line, "Unbalanced glBegin()!", 0);
     insideBeginEnd_.store(true, std::memory_order_relaxed);
+    internal::gIsOpenGLChainPlain.store(false, std::memory_order_relaxed);
     ::glBegin(mode);
 }
 
@@ -70,6 +71,7 @@ void OpenGLErrorChecker::cgmEnd(char const *file, unsigned int line) {
     if (!insideBeginEnd_.load(std::memory_order_relaxed))
         throw ExceptionOGL(file, line, "Unbalanced glEnd()!", 0);
     insideBeginEnd_.store(false, std::memory_order_relaxed);
+    internal::gIsOpenGLChainPlain.store(Instance() == this, std::memory_order_relaxed);
     ::glEnd();
     CheckOpenGLError(insideBeginEnd_, file, line, "glEnd");
 }

@@ -23,6 +23,9 @@ public:
     /// static.
     static unsigned char const *GetOpenGLErrorString(unsigned int error);
 
+    /// Whether `cgmBegin` was called and `cgmEnd` not yet.
+    bool isInsideBeginEnd() const { return insideBeginEnd_.load(std::memory_order_relaxed); }
+
 #define ORU_GL_OPERATION(Result, Name, Parameters, Arguments) Result cgm##Name Parameters override;
 #include "oru/oru_ogl/extensionator/gloperations.inc"
 

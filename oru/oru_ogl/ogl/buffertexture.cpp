@@ -1,7 +1,7 @@
 // Buffer textures: a buffer that shaders read as a long row of texels.
 #include "oru/oru_ogl/ogl/buffertexture.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"

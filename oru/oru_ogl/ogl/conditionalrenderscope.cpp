@@ -1,7 +1,7 @@
 // Drawing that depends on a query, for a scope.
 #include "oru/oru_ogl/ogl/conditionalrenderscope.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/pendingerror.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"

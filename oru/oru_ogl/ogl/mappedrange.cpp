@@ -2,7 +2,7 @@
 #include "oru/oru_ogl/ogl/mappedrange.h"
 
 #include "oru/core/exceptions/checks.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/internal/objects/ending.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"

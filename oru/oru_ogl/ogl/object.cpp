@@ -1,7 +1,7 @@
 // The base of the classes that own an OpenGL object.
 #include "oru/oru_ogl/ogl/object.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 
 #include <utility>
 

@@ -1,7 +1,7 @@
 // Helpers for hosts that keep OpenGL program names of their own.
 #include "oru/oru_ogl/ogl/oruopengl.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
 namespace ORU::OGL {

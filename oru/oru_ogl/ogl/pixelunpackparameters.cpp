@@ -1,7 +1,7 @@
 // How the pixels of an upload lie in the caller's memory.
 #include "oru/oru_ogl/ogl/pixelunpackparameters.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/platformgl.h"
 

@@ -1,6 +1,6 @@
 // What programs can do since OpenGL 3: more stages and outputs, binaries, parts of pipelines.
 #include "oru/core/exceptions/checks.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
 #include "oru/oru_ogl/ogl/internal/programs/programbinary.h"

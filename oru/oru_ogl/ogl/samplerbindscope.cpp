@@ -1,7 +1,7 @@
 // A sampler on a texture unit for a scope.
 #include "oru/oru_ogl/ogl/samplerbindscope.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/ending.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/sampler.h"

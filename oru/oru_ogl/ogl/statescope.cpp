@@ -2,10 +2,9 @@
 #include "oru/oru_ogl/ogl/statescope.h"
 
 #include "oru/core/utility/dropexceptions.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
-#include <algorithm>
 #include <array>
 #include <cstddef>
 #include <iterator>
@@ -19,7 +18,7 @@ namespace {
 /// Values of a state that one call sets, in the order of the state's members.
 struct Piece {
     StateKind kind;
-    GLenum queries[3]; ///< one for all values, or one for each of several
+    GLenum queries[3]; ///< one for all values, or one for each of three
     std::size_t count; ///< of values
     void (*set)(GLint const *values);
 };
@@ -133,10 +132,19 @@ class Access {
 public:
     static void Read(GLint *values) {
         ForEachPiece([values](auto piece) {
-            for (std::size_t i = 0; i < std::size(kPieces[piece].queries); ++i)
-                if (GLenum const query = kPieces[piece].queries[i])
-                    ORU_GL(GetIntegerv, query, values + PlaceOf(piece) + i);
+            constexpr GLenum const(&kQueries)[3] = kPieces[piece].queries;
+            GLint *const place = values + PlaceOf(piece);
+            ORU_GL(GetIntegerv, kQueries[0], place);
+            if constexpr (kQueries[1] != 0) {
+                ORU_GL(GetIntegerv, kQueries[1], place + 1);
+                ORU_GL(GetIntegerv, kQueries[2], place + 2);
+            }
         });
+    }
+
+    static void Change(GLint *found, GLint const *wanted) {
+        Read(found);
+        Set(found, wanted);
     }
 
     static void Set(GLint const *from, GLint const *to) {
@@ -149,8 +157,7 @@ public:
     }
 
     static void PutBack(GLint const *from, GLint const *to) noexcept {
-        ForEachPiece(
-            [=](auto piece) { DropExceptions([=] { SetDifference(piece, from, to); }); });
+        ForEachPiece([=](auto piece) { DropExceptions([=] { SetDifference(piece, from, to); }); });
     }
 
 private:
@@ -168,22 +175,27 @@ private:
 
     template<class Index>
     static void SetDifference(Index piece, GLint const *from, GLint const *to) {
-        constexpr std::size_t kPlace = PlaceOf(piece), kEnd = kPlace + kPieces[piece].count;
-        if (!std::equal(from + kPlace, from + kEnd, to + kPlace))
-            kPieces[piece].set(to + kPlace);
+        // Number by number: drivers write them so, and a wider load right behind would wait.
+        GLint difference = 0;
+        for (std::size_t i = PlaceOf(piece); i < PlaceOf(piece) + kPieces[piece].count; ++i)
+            difference |= from[i] ^ to[i];
+        if (difference != 0)
+            kPieces[piece].set(to + PlaceOf(piece));
     }
 };
 
 /// The functions of a kind.
 struct Functions {
     void (*read)(GLint *values);
+    void (*change)(GLint *found, GLint const *wanted);
     void (*set)(GLint const *from, GLint const *to);
     void (*putBack)(GLint const *from, GLint const *to) noexcept;
 };
 
 template<StateKind... Kinds>
 constexpr std::array<Functions, sizeof...(Kinds)> FunctionsOf() {
-    return {Functions{Access<Kinds>::Read, Access<Kinds>::Set, Access<Kinds>::PutBack}...};
+    return {Functions{Access<Kinds>::Read, Access<Kinds>::Change, Access<Kinds>::Set,
+                      Access<Kinds>::PutBack}...};
 }
 
 constexpr auto kFunctions = FunctionsOf<STATEKIND_VIEWPORT, STATEKIND_SCISSOR, STATEKIND_DEPTH,
@@ -204,8 +216,7 @@ void StateAccess::Read(StateKind kind, void *state) {
 }
 
 void StateAccess::Change(StateKind kind, void *found, void const *wanted) {
-    Read(kind, found);
-    Set(kind, found, wanted);
+    FunctionsFor(kind).change(static_cast<GLint *>(found), Values(wanted));
 }
 
 void StateAccess::Set(StateKind kind, void const *from, void const *to) {

@@ -1,7 +1,7 @@
 // One of OpenGL's switches turned for a scope.
 #include "oru/oru_ogl/ogl/switchscope.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/platformgl.h"
 

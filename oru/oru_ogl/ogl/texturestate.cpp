@@ -1,7 +1,7 @@
 // The active texture unit of the current context, and what its textures can be.
 #include "oru/oru_ogl/ogl/texturestate.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/texture.h"
 #include "oru/oru_ogl/platformgl.h"

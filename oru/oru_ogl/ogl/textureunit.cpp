@@ -2,7 +2,7 @@
 #include "oru/oru_ogl/ogl/textureunit.h"
 
 #include "oru/core/exceptions/checks.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
 #include "oru/oru_ogl/ogl/internal/objects/translation.h"
 #include "oru/oru_ogl/ogl/texture1.h"

@@ -2,7 +2,7 @@
 #include "oru/oru_ogl/ogl/transformfeedbackscope.h"
 
 #include "oru/core/exceptions/checks.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/pendingerror.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"

@@ -3,7 +3,7 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/composetext.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
 #include "oru/oru_ogl/ogl/programogl.h"
 #include "oru/oru_ogl/platformgl.h"

@@ -3,7 +3,7 @@
 
 #include "oru/core/exceptions/checks.h"
 #include "oru/core/utility/composetext.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"

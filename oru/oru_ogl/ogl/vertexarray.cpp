@@ -2,7 +2,7 @@
 #include "oru/oru_ogl/ogl/vertexarray.h"
 
 #include "oru/core/utility/composetext.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/internal/objects/adopting.h"
 #include "oru/oru_ogl/ogl/internal/objects/ending.h"

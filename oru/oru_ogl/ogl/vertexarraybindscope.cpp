@@ -1,7 +1,7 @@
 // A vertex array bound for a scope.
 #include "oru/oru_ogl/ogl/vertexarraybindscope.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/ogl/vertexarray.h"
 

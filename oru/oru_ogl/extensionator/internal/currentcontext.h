@@ -7,7 +7,7 @@
 namespace ORU::OGL::internal {
 
 /// Whether the WGL chain is its last link alone, which only calls the platform.
-extern bool gWGLChainIsPlain;
+extern bool gIsWGLChainPlain;
 
 /// `wcgmGetCurrentContext` of the chain's first link.
 HGLRC AskChainForCurrentContext(char const *file, unsigned int line);
@@ -15,7 +15,7 @@ HGLRC AskChainForCurrentContext(char const *file, unsigned int line);
 /// The calling thread's current context, or null, asked through the WGL chain. Where nobody listens
 /// the platform is asked at once, which takes half the time.
 inline HGLRC CurrentContext(char const *file, unsigned int line) {
-    return ORU_LIKELY(gWGLChainIsPlain) ? ::wglGetCurrentContext()
+    return ORU_LIKELY(gIsWGLChainPlain) ? ::wglGetCurrentContext()
                                         : AskChainForCurrentContext(file, line);
 }
 

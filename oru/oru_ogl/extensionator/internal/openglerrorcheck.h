@@ -18,15 +18,29 @@ namespace ORU::OGL {
 [[noreturn]] ORU_COLD void ThrowMissingFunction(char const *file, unsigned int line,
                                                 char const *function, char const *group);
 
-/// Throws when the call of `function` before left an error; asks nothing inside glBegin and glEnd,
-/// where OpenGL allows no query.
+namespace internal {
+
+/// Whether the chain is its last link alone, outside glBegin and glEnd.
+extern std::atomic<bool> gIsOpenGLChainPlain;
+
+inline bool IsOpenGLChainPlain() {
+    return gIsOpenGLChainPlain.load(std::memory_order_relaxed);
+}
+
+} // namespace internal
+
+/// Throws when the call of `function` before left an error.
+inline void CheckOpenGLError(char const *file, unsigned int line, char const *function) {
+    GLenum const error = ::glGetError();
+    if (!ORU_LIKELY(error == GL_NO_ERROR))
+        ThrowOpenGLError(file, line, error, function);
+}
+
+/// The same, but asks nothing inside glBegin and glEnd, where OpenGL allows no query.
 inline void CheckOpenGLError(std::atomic<bool> const &insideBeginEnd, char const *file,
                              unsigned int line, char const *function) {
-    if (ORU_LIKELY(!insideBeginEnd.load(std::memory_order_relaxed))) {
-        GLenum const error = ::glGetError();
-        if (!ORU_LIKELY(error == GL_NO_ERROR))
-            ThrowOpenGLError(file, line, error, function);
-    }
+    if (ORU_LIKELY(!insideBeginEnd.load(std::memory_order_relaxed)))
+        CheckOpenGLError(file, line, function);
 }
 
 /// The same after a call that made a name, which goes before the exception does: nobody else has

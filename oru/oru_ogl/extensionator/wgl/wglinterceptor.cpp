@@ -7,11 +7,9 @@
 
 namespace ORU::OGL {
 
-WGLInterceptor *WGLInterceptor::sInterceptor_ = nullptr;
-
 namespace internal {
 
-bool gWGLChainIsPlain = false;
+bool gIsWGLChainPlain = false;
 
 HGLRC AskChainForCurrentContext(char const *file, unsigned int line) {
     return WGLInterceptor::Instance()->wcgmGetCurrentContext(file, line);
@@ -19,11 +17,21 @@ HGLRC AskChainForCurrentContext(char const *file, unsigned int line) {
 
 } // namespace internal
 
+namespace {
+
+void NoteFirst(WGLInterceptor const *link) {
+    internal::gIsWGLChainPlain = dynamic_cast<WGLErrorChecker const *>(link) != nullptr;
+}
+
+} // namespace
+
+WGLInterceptor *WGLInterceptor::sInterceptor_ = nullptr;
+
 WGLInterceptorDecorator::~WGLInterceptorDecorator() = default;
 
 WGLInterceptor *WGLInterceptor::CreateChecker() {
     sInterceptor_ = ORU_NEW WGLErrorChecker();
-    internal::gWGLChainIsPlain = true;
+    NoteFirst(sInterceptor_);
     return sInterceptor_;
 }
 
@@ -34,20 +42,20 @@ void WGLInterceptor::Destroy() {
     ORU_ENFORCE_TEXT("dynamic_cast<WGLErrorChecker*>(sInterceptor_) != NULL", checker);
     ORUDeleter<WGLErrorChecker>()(checker);
     sInterceptor_ = nullptr;
-    internal::gWGLChainIsPlain = false;
+    NoteFirst(nullptr);
 }
 
 void WGLInterceptor::addInterceptor(WGLInterceptorDecorator *decorator) {
     decorator->setInterceptor(sInterceptor_);
     sInterceptor_ = decorator;
-    internal::gWGLChainIsPlain = false;
+    NoteFirst(decorator);
 }
 
 WGLInterceptorDecorator *WGLInterceptor::popInterceptor() {
     auto *const decorator = dynamic_cast<WGLInterceptorDecorator *>(sInterceptor_);
     if (decorator) {
         sInterceptor_ = decorator->interceptor();
-        internal::gWGLChainIsPlain = dynamic_cast<WGLErrorChecker *>(sInterceptor_) != nullptr;
+        NoteFirst(sInterceptor_);
     }
     return decorator;
 }

@@ -1,7 +1,7 @@
 // An object bound to its target for a scope.
 #pragma once
 
-#include "oru/oru_ogl/extensionator/openglinterceptor.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/ending.h"
 #include "oru/oru_ogl/ogl/object.h"
 
@@ -15,9 +15,8 @@ namespace ORU::OGL::internal {
 ///     bound.restore();
 class BoundObjectScope {
 public:
-    /// The operation that binds objects of a kind to a target.
-    using Bind = void (OpenGLInterceptor::*)(char const *file, unsigned int line, GLenum target,
-                                             GLuint name);
+    /// The call that binds objects of a kind to a target.
+    using Bind = void (*)(char const *file, unsigned int line, GLenum target, GLuint name);
 
     /// @param bind, file, line what `ORU_BINDER` makes
     BoundObjectScope(Object const &object, Bind bind, char const *file, unsigned int line)
@@ -36,9 +35,7 @@ private:
         GLenum target;
         GLuint name;
 
-        void operator()() const {
-            (OpenGLInterceptor::Instance()->*bind)(file, line, target, name);
-        }
+        void operator()() const { bind(file, line, target, name); }
     };
 
     Ending<Binding> restore_;
@@ -48,4 +45,4 @@ private:
 
 /// The last arguments of a BoundObjectScope: `ORU_BINDER(BindTexture)` binds by glBindTexture, with
 /// this source position.
-#define ORU_BINDER(Name) &::ORU::OGL::OpenGLInterceptor::cgm##Name, __FILE__, __LINE__
+#define ORU_BINDER(Name) ::ORU::OGL::internal::Call##Name, __FILE__, __LINE__

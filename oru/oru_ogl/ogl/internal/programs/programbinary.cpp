@@ -1,7 +1,7 @@
 // A program's binary with what tells whose it is and whether it is whole.
 #include "oru/oru_ogl/ogl/internal/programs/programbinary.h"
 
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
 #include <algorithm>

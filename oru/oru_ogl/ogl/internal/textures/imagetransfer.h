@@ -2,7 +2,7 @@
 #pragma once
 
 #include "oru/core/exceptions/checks.h"
-#include "oru/oru_ogl/extensionator/glcall.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/bufferogl.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"
 #include "oru/oru_ogl/ogl/internal/textures/pixelstorage.h"
