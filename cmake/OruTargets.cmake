@@ -33,13 +33,13 @@ function(oru_list_linked_files target)
 endfunction()
 
 # oru_add_test(<name> SOURCES <file>... [LIBRARIES <target>...] [ENVIRONMENT <VAR=value>...]
-#              [TIMEOUT <seconds>] [INTERNAL])
+#              [TIMEOUT <seconds>] [INTERNAL] [VARIANTS_ONLY])
 # A GoogleTest program, each of its cases a test of CTest, run with ENVIRONMENT and ended after TIMEOUT
 # (60 s unless told). With an ENVIRONMENT its tests are named "<name>/Suite.Name", so that several programs
 # can run the same cases, each in its own. INTERNAL links the library's objects instead of the DLL, to
-# reach what it does not export.
+# reach what it does not export. With VARIANTS_ONLY the program runs as oru_add_test_variant says alone.
 function(oru_add_test name)
-    cmake_parse_arguments(arg "INTERNAL" "TIMEOUT" "SOURCES;LIBRARIES;ENVIRONMENT" ${ARGN})
+    cmake_parse_arguments(arg "INTERNAL;VARIANTS_ONLY" "TIMEOUT" "SOURCES;LIBRARIES;ENVIRONMENT" ${ARGN})
     if(arg_UNPARSED_ARGUMENTS)
         message(FATAL_ERROR "oru_add_test(${name}): unknown arguments ${arg_UNPARSED_ARGUMENTS}")
     endif()
@@ -66,19 +66,25 @@ function(oru_add_test name)
     if(arg_ENVIRONMENT)
         set(prefix "${name}/")
     endif()
-    oru_discover_tests(${name} "${prefix}" ${name}_TESTS ${arg_TIMEOUT} "${arg_ENVIRONMENT}")
+    if(NOT arg_VARIANTS_ONLY)
+        oru_discover_tests(${name} "${prefix}" ${name}_TESTS ${arg_TIMEOUT} "${arg_ENVIRONMENT}" "")
+    endif()
 endfunction()
 
-# oru_add_test_variant(<name> <program> ENVIRONMENT <VAR=value>...)
-# Runs the cases of a test program a second time with ENVIRONMENT, as "<name>/Suite.Name".
+# oru_add_test_variant(<name> <program> ENVIRONMENT <VAR=value>... [FILTER <expression>])
+# Runs the cases of a test program, or those that a filter of GoogleTest's chooses, once more with ENVIRONMENT, as
+# "<name>/Suite.Name".
 function(oru_add_test_variant name program)
-    cmake_parse_arguments(arg "" "" "ENVIRONMENT" ${ARGN})
-    oru_discover_tests(${program} "${name}/" ${name}_TESTS 60 "${arg_ENVIRONMENT}")
+    cmake_parse_arguments(arg "" "FILTER" "ENVIRONMENT" ${ARGN})
+    oru_discover_tests(${program} "${name}/" ${name}_TESTS 60 "${arg_ENVIRONMENT}" "${arg_FILTER}")
 endfunction()
 
-# Makes each case of a program a test of CTest; `list` is a name for all of them.
-function(oru_discover_tests program prefix list timeout environment)
-    gtest_discover_tests(${program}
+# Makes each case of a program, all or those of a filter, a test of CTest; `list` is a name for all of them.
+function(oru_discover_tests program prefix list timeout environment filter)
+    if(filter)
+        set(filter TEST_FILTER "${filter}")
+    endif()
+    gtest_discover_tests(${program} ${filter}
         TEST_PREFIX "${prefix}"
         TEST_LIST ${list}
         DISCOVERY_MODE PRE_TEST

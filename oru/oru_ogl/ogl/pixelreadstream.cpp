@@ -41,9 +41,14 @@ void PixelReadStream::read(int x, int y) {
     internal::CheckSides(shape, 2);
     internal::PixelLayout const layout = internal::LayoutOf(shape.format, shape.type);
     auto const sides = internal::ToSides(shape.width, shape.height);
-    ask([&](void *pixels) {
+    std::uint64_t const row = shape.rowBytes();
+    ask([&](void *) {
         internal::WithPackState(shape, [&] {
-            ORU_GL(ReadPixels, x, y, sides[0], sides[1], layout.format, layout.type, pixels);
+            internal::ForEachBand(shape.height, row, [&](std::uint64_t first, std::uint64_t count) {
+                ORU_GL(ReadPixels, x, y + static_cast<GLint>(first), sides[0],
+                       static_cast<GLsizei>(count), layout.format, layout.type,
+                       internal::BufferOffset(first * row));
+            });
         });
     });
 }

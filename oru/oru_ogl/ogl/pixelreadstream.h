@@ -58,7 +58,8 @@ public:
     ///         refuses. There is no frame then
     /// @{
 
-    /// From the read framebuffer, the rectangle with its lower left corner at (x, y).
+    /// From the read framebuffer, the rectangle with its lower left corner at (x, y), in bands of
+    /// about a mebibyte, the last first.
     /// @note glReadPixels, glFenceSync
     void read(int x, int y);
 

@@ -58,8 +58,9 @@ public:
     MutablePixelView begin();
 
     /// @name Send the frame on its way
-    /// To a part of the texture that is bound to its target, as its `subImage` does. The pixel
-    /// unpack buffer that is bound, and pixel storage, stay. After a failure the frame is gone.
+    /// To a part of the texture that is bound to its target, as its `subImage` does, in bands of
+    /// about a mebibyte, the last first. The pixel unpack buffer that is bound, and pixel storage,
+    /// stay. After a failure the frame is gone.
     /// @throws InternalException before `begin()`, and when the system has lost the memory's
     ///         contents; also as `subImage`
     /// @note glUnmapBuffer, glTexSubImage1D, glTexSubImage2D or glTexSubImage3D, glFenceSync

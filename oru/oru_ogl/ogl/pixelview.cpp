@@ -66,19 +66,27 @@ std::uint64_t PixelShape::bytesPerPixel() const {
     return size.isPacked ? size.bytes : size.bytes * Texture::Channels(format);
 }
 
+std::uint64_t PixelShape::rowBytes() const {
+    internal::CheckByteAlignment(alignment);
+    std::uint64_t const pixels = bytesPerPixel() * (rowLength ? rowLength : width);
+    return (pixels + alignment - 1) / alignment * alignment;
+}
+
+std::uint64_t PixelShape::imageBytes() const {
+    return rowBytes() * (imageHeight ? imageHeight : height);
+}
+
 std::uint64_t PixelShape::bytes() const {
     internal::CheckByteAlignment(alignment);
-    std::uint64_t const pixel = bytesPerPixel();
+    std::uint64_t const last = bytesPerPixel() * width;
     if (width == 0 || height == 0 || depth == 0)
         return 0;
     constexpr std::uint64_t kLargest = std::numeric_limits<GLsizei>::max();
     if (std::max({width, height, depth, rowLength, imageHeight}) > kLargest)
         return kEndless;
     // With sides of 31 bits only the last product can be too much for 64 of them.
-    std::uint64_t const row =
-        (pixel * (rowLength ? rowLength : width) + alignment - 1) / alignment * alignment;
+    std::uint64_t const row = rowBytes();
     std::uint64_t const rows = (depth - 1) * (imageHeight ? imageHeight : height) + height - 1;
-    std::uint64_t const last = pixel * width;
     return rows <= (kEndless - last) / row ? rows * row + last : kEndless;
 }
 

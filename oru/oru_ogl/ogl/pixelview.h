@@ -29,6 +29,14 @@ struct ORU_API PixelShape {
     ///         numbers that are no format or type
     std::uint64_t bytesPerPixel() const;
 
+    /// Bytes from the beginning of a row to that of the next.
+    /// @throws InternalException as `bytes`
+    std::uint64_t rowBytes() const;
+
+    /// Bytes from the beginning of an image to that of the next.
+    /// @throws InternalException as `bytes`
+    std::uint64_t imageBytes() const;
+
     /// Bytes from the beginning of the first pixel to the end of the last one, by section 8.4.4.1
     /// of the OpenGL 4.5 core specification; 0 when a side is 0, and the largest number for what
     /// OpenGL cannot address.

@@ -2,11 +2,14 @@
 #include "oru/oru_ogl/ogl/statescope.h"
 
 #include "oru/core/utility/dropexceptions.h"
+#include "oru/oru_ogl/extensionator/internal/currentcontext.h"
 #include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
+#include <functional>
 #include <iterator>
 #include <type_traits>
 #include <utility>
@@ -142,11 +145,6 @@ public:
         });
     }
 
-    static void Change(GLint *found, GLint const *wanted) {
-        Read(found);
-        Set(found, wanted);
-    }
-
     static void Set(GLint const *from, GLint const *to) {
         try {
             ForEachPiece([=](auto piece) { SetDifference(piece, from, to); });
@@ -157,7 +155,12 @@ public:
     }
 
     static void PutBack(GLint const *from, GLint const *to) noexcept {
-        ForEachPiece([=](auto piece) { DropExceptions([=] { SetDifference(piece, from, to); }); });
+        ForEachPiece([=](auto piece) {
+            DropExceptions([=] {
+                if (ORU_CURRENT_CONTEXT())
+                    SetDifference(piece, from, to);
+            });
+        });
     }
 
 private:
@@ -175,27 +178,23 @@ private:
 
     template<class Index>
     static void SetDifference(Index piece, GLint const *from, GLint const *to) {
-        // Number by number: drivers write them so, and a wider load right behind would wait.
-        GLint difference = 0;
-        for (std::size_t i = PlaceOf(piece); i < PlaceOf(piece) + kPieces[piece].count; ++i)
-            difference |= from[i] ^ to[i];
-        if (difference != 0)
-            kPieces[piece].set(to + PlaceOf(piece));
+        constexpr std::size_t kPlace = PlaceOf(piece), kEnd = kPlace + kPieces[piece].count;
+        // One by one, as the driver wrote them: two at once would have to wait for both.
+        if (!std::equal(from + kPlace, from + kEnd, to + kPlace, std::equal_to<>()))
+            kPieces[piece].set(to + kPlace);
     }
 };
 
 /// The functions of a kind.
 struct Functions {
     void (*read)(GLint *values);
-    void (*change)(GLint *found, GLint const *wanted);
     void (*set)(GLint const *from, GLint const *to);
     void (*putBack)(GLint const *from, GLint const *to) noexcept;
 };
 
 template<StateKind... Kinds>
 constexpr std::array<Functions, sizeof...(Kinds)> FunctionsOf() {
-    return {Functions{Access<Kinds>::Read, Access<Kinds>::Change, Access<Kinds>::Set,
-                      Access<Kinds>::PutBack}...};
+    return {Functions{Access<Kinds>::Read, Access<Kinds>::Set, Access<Kinds>::PutBack}...};
 }
 
 constexpr auto kFunctions = FunctionsOf<STATEKIND_VIEWPORT, STATEKIND_SCISSOR, STATEKIND_DEPTH,
@@ -216,7 +215,8 @@ void StateAccess::Read(StateKind kind, void *state) {
 }
 
 void StateAccess::Change(StateKind kind, void *found, void const *wanted) {
-    FunctionsFor(kind).change(static_cast<GLint *>(found), Values(wanted));
+    Read(kind, found);
+    Set(kind, found, wanted);
 }
 
 void StateAccess::Set(StateKind kind, void const *from, void const *to) {

@@ -19,6 +19,7 @@
 
 #include <functional>
 #include <type_traits>
+#include <typeinfo>
 #include <utility>
 
 using namespace ORU::OGL;
@@ -235,94 +236,130 @@ struct Handling<TransformFeedback> {
         [](TransformFeedback &f) { f.setBuffer(0, Handling<Buffer>::Make()); }};
 };
 
-template<class Object>
-class Handles : public ObjectTest {
-protected:
-    static unsigned int NameOf(ORU::OGL::Object const &object) { return object.objectID(); }
-    static unsigned int NameOf(Shader const &shader) { return shader.shaderID(); }
-    static unsigned int NameOf(Program const &program) { return program.programID(); }
-    static GLsync NameOf(Fence const &fence) { return fence.sync(); }
+unsigned int NameOf(ORU::OGL::Object const &object) {
+    return object.objectID();
+}
+unsigned int NameOf(Shader const &shader) {
+    return shader.shaderID();
+}
+unsigned int NameOf(Program const &program) {
+    return program.programID();
+}
+GLsync NameOf(Fence const &fence) {
+    return fence.sync();
+}
 
-    static void ExpectEmpty(Object &object) {
-        for (auto const &use : Handling<Object>::kUses) {
-            Failure const failure = FailureOf([&] { use(object); });
-            EXPECT_NE(std::string::npos, (failure.text + failure.note).find("empty: it was moved"))
-                << "use " << &use - Handling<Object>::kUses << " says \"" << failure.text << '"';
-        }
+template<class Object>
+void ExpectEmpty(Object &object) {
+    for (auto const &use : Handling<Object>::kUses) {
+        Failure const failure = FailureOf([&] { use(object); });
+        EXPECT_NE(std::string::npos, (failure.text + failure.note).find("empty: it was moved"))
+            << "use " << &use - Handling<Object>::kUses << " says \"" << failure.text << '"';
+    }
+}
+
+template<class Object>
+struct Kind {
+    using Type = Object;
+};
+
+template<class... Objects>
+struct Kinds {
+    /// Runs a check of each class.
+    template<class Check>
+    static void ForEach(Check check) {
+        (One<Objects>(check), ...);
+    }
+
+private:
+    template<class Object, class Check>
+    static void One(Check check) {
+        SCOPED_TRACE(typeid(Object).name());
+        check(Kind<Object>());
     }
 };
 
-using Kinds =
-    testing::Types<Texture1D, Texture2D, TextureRECT, Texture1DArray, Texture3D, Texture2DArray,
-                   TextureCube, TextureCubeArray, BufferTexture, Texture2DMultisample, Sampler,
-                   Buffer, Fence, Framebuffer, Query, Renderbuffer, Shader, Program,
-                   ProgramPipeline, TransformFeedback, VertexArray>;
+using AllKinds = Kinds<Texture1D, Texture2D, TextureRECT, Texture1DArray, Texture3D, Texture2DArray,
+                       TextureCube, TextureCubeArray, BufferTexture, Texture2DMultisample, Sampler,
+                       Buffer, Fence, Framebuffer, Query, Renderbuffer, Shader, Program,
+                       ProgramPipeline, TransformFeedback, VertexArray>;
 
-} // namespace
-
-TYPED_TEST_SUITE(Handles, Kinds, ); // with the comma, as clang wants an argument there
-
-TYPED_TEST(Handles, Move) {
-    using It = Handling<TypeParam>;
-    TypeParam first = It::Make();
-    auto const name = this->NameOf(first);
+template<class Object>
+void ExpectMoves() {
+    using It = Handling<Object>;
+    Object first = It::Make();
+    auto const name = NameOf(first);
     std::string const told = It::Tell(first);
-    TypeParam second(std::move(first));
-    EXPECT_EQ(name, this->NameOf(second));
+    Object second(std::move(first));
+    EXPECT_EQ(name, NameOf(second));
     EXPECT_EQ(told, It::Tell(second));
-    this->ExpectEmpty(first);
+    ExpectEmpty(first);
 
-    TypeParam third = It::Make();
-    auto const replaced = this->NameOf(third);
+    Object third = It::Make();
+    auto const replaced = NameOf(third);
     third = std::move(second);
-    EXPECT_EQ(name, this->NameOf(third));
+    EXPECT_EQ(name, NameOf(third));
     EXPECT_EQ(told, It::Tell(third));
     EXPECT_FALSE(It::Lives(replaced)) << "the old object goes when another is assigned";
-    this->ExpectEmpty(second);
-    TypeParam &itself = third;
+    ExpectEmpty(second);
+    Object &itself = third;
     third = std::move(itself);
     EXPECT_EQ(told, It::Tell(third));
     second = It::Make();
     EXPECT_EQ(told, It::Tell(second)) << "an empty one can be assigned to";
 
-    std::vector<TypeParam> several;
+    std::vector<Object> several;
     for (int i = 0; i < 5; ++i)
         several.push_back(It::Make());
     several.erase(several.begin());
-    for (TypeParam const &object : several)
+    for (Object const &object : several)
         EXPECT_EQ(told, It::Tell(object));
 }
 
-TYPED_TEST(Handles, TakeOverAndGiveUpNames) {
-    using It = Handling<TypeParam>;
-    TypeParam owner = It::Make();
-    auto const name = this->NameOf(owner);
+template<class Object>
+void ExpectTakesOverAndGivesUpNames() {
+    using It = Handling<Object>;
+    Object owner = It::Make();
+    auto const name = NameOf(owner);
     std::string const told = It::Tell(owner);
     auto const made = [&](ownership_tag ownership) {
-        if constexpr (std::is_same_v<TypeParam, Buffer>)
+        if constexpr (std::is_same_v<Object, Buffer>)
             return Buffer(name, Buffer::TYPE_PIXEL_UNPACK_BUFFER, ownership);
-        else if constexpr (std::is_same_v<TypeParam, Query>)
+        else if constexpr (std::is_same_v<Object, Query>)
             return Query(name, Query::TYPE_SAMPLES, ownership);
         else
-            return TypeParam(name, ownership);
+            return Object(name, ownership);
     };
     {
-        TypeParam borrowed = made(borrow_name_tag());
-        EXPECT_EQ(name, this->NameOf(borrowed));
+        Object borrowed = made(borrow_name_tag());
+        EXPECT_EQ(name, NameOf(borrowed));
         EXPECT_EQ(told, It::Tell(borrowed));
-        TypeParam const moved(std::move(borrowed));
-        EXPECT_EQ(name, this->NameOf(moved));
+        Object const moved(std::move(borrowed));
+        EXPECT_EQ(name, NameOf(moved));
     }
     EXPECT_TRUE(It::Lives(name)) << "a borrowed name stays";
     EXPECT_EQ(name, owner.disown());
-    this->ExpectEmpty(owner);
+    ExpectEmpty(owner);
     EXPECT_TRUE(It::Lives(name)) << "a name that was given up stays";
-    { TypeParam const taken = made(take_name_tag()); }
+    { Object const taken = made(take_name_tag()); }
     EXPECT_FALSE(It::Lives(name)) << "a name that was taken goes with its object";
     EXPECT_NE("", MessageOf([&] { made(take_name_tag()); })) << "a name of nothing";
 }
 
-TEST_F(ObjectTest, TakesOverOnlyTexturesThatAFormatStandsFor) {
+} // namespace
+
+class HandlesTest : public ObjectTest {};
+
+TEST_F(HandlesTest, Move) {
+    AllKinds::ForEach([](auto kind) { ExpectMoves<typename decltype(kind)::Type>(); });
+}
+
+TEST_F(HandlesTest, TakeOverAndGiveUpNames) {
+    AllKinds::ForEach(
+        [](auto kind) { ExpectTakesOverAndGivesUpNames<typename decltype(kind)::Type>(); });
+}
+
+TEST_F(HandlesTest, TakesOverOnlyTexturesThatAFormatStandsFor) {
     std::pair<GLenum, std::string> const formats[] = {
         {GL_R8, TextOf(Texture::INTERNALFORMAT_RED)},
         {GL_RG8, TextOf(Texture::INTERNALFORMAT_RG)},

@@ -128,6 +128,42 @@ TEST_F(PixelStreamTest, FramesArriveInTheirOrder) {
     framebuffer.unbind();
 }
 
+// Frames of several megabytes, which go in bands: rows of 2-D textures, images of 3-D ones, with
+// gaps between rows and images, of a height that is no multiple of a band's.
+TEST_F(PixelStreamTest, LargeFramesArriveWhole) {
+    auto const send = [](auto &texture, PixelShape const &shape, auto... place) {
+        ORU_GL(BindTexture, texture.target(), texture.objectID());
+        Texels bytes(shape.bytes());
+        for (std::size_t i = 0; i < bytes.size(); ++i)
+            bytes[i] = static_cast<unsigned char>(i * 2654435761u >> 24);
+        PixelUploadStream uploads(shape, 2);
+        std::memcpy(uploads.begin().data(), bytes.data(), bytes.size());
+        uploads.upload(texture, 0, place...);
+        Texels sent(texture.width(0) * texture.height(0) * texture.depth(0) * 4), wanted(sent);
+        PixelShape const all = {kBytes.format, kBytes.type, texture.width(0), texture.height(0),
+                                texture.depth(0)};
+        texture.getPixelData(MutablePixelView(sent.data(), sent.size(), all), 0);
+        texture.subImage(0, place..., PixelView(bytes.data(), bytes.size(), shape));
+        texture.getPixelData(MutablePixelView(wanted.data(), wanted.size(), all), 0);
+        EXPECT_TRUE(sent == wanted);
+        return sent;
+    };
+    Texture3D images(kRGBA8, 120, 100, 70, false);
+    send(images, {kBytes.format, kBytes.type, 117, 99, 61, 121, 101, 8}, 2, 1, 5);
+    ORU_GL(BindTexture, GL_TEXTURE_3D, 0u);
+
+    Texture2D flat(kRGBA8, 640, 1100, false);
+    Texels const sent = send(flat, {kBytes.format, kBytes.type, 637, 1099, 1, 700, 0, 4}, 3, 1);
+    Framebuffer framebuffer;
+    ORU_GL(BindTexture, GL_TEXTURE_2D, 0u);
+    framebuffer.bind();
+    framebuffer.attach(&flat, 0, 0);
+    PixelReadStream read({kBytes.format, kBytes.type, 640, 1100}, 2);
+    read.read(0, 0);
+    EXPECT_TRUE(sent == Taken(read));
+    framebuffer.unbind();
+}
+
 // One buffer while OpenGL keeps up, which the caches have; all of them in turns while it does not.
 TEST_F(PixelStreamTest, TheHostWritesWhereOpenGLIsDone) {
     InterceptorScope<BusyDriver> driver;

@@ -4,6 +4,7 @@
 #include "oru/oru_ogl/ogl/internal/objects/ending.h"
 #include "oru/oru_ogl/ogl/internal/objects/pendingerror.h"
 #include "oru/oru_ogl/ogl/internal/objects/supported.h"
+#include "oru/oru_ogl/ogl/internal/textures/bands.h"
 #include "oru/oru_ogl/ogl/internal/textures/imagetransfer.h"
 #include "oru/oru_ogl/ogl/pixelview.h"
 
@@ -58,15 +59,25 @@ void KeepingUnpackState(PixelUnpackParameters const &parameters, Send send) {
 
 /// Uploads pixels, and puts the state back, also after a failure. `CheckPart` comes before it.
 /// @param format of the texture
-/// @param pixels an address, or an offset into the pixel unpack buffer
+/// @param pixels null for those that the pixel unpack buffer begins with, which go in bands
 template<std::size_t Sides>
 void Upload(SendPart<Sides> send, Part<Sides> const &part, Texture::InternalFormat format,
             PixelShape const &shape, void const *pixels) {
     CheckSides(shape, Sides);
     RequireSameKind(format, shape.format);
     PixelLayout const layout = LayoutOf(shape.format, shape.type);
-    KeepingUnpackState(shape.unpackParameters(),
-                       [&] { send(part, layout.format, layout.type, pixels); });
+    KeepingUnpackState(shape.unpackParameters(), [&] {
+        if (pixels || Sides == 1)
+            return send(part, layout.format, layout.type, pixels);
+        std::uint64_t const unit = Sides == 2 ? shape.rowBytes() : shape.imageBytes();
+        ForEachBand(static_cast<std::uint64_t>(part.sides[Sides - 1]), unit,
+                    [&](std::uint64_t first, std::uint64_t count) {
+                        Part<Sides> band = part;
+                        band.first[Sides - 1] += static_cast<GLint>(first);
+                        band.sides[Sides - 1] = static_cast<GLsizei>(count);
+                        send(band, layout.format, layout.type, BufferOffset(first * unit));
+                    });
+    });
 }
 
 /// Reads the compressed blocks of a level of the texture bound to a target.
