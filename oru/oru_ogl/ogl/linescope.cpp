@@ -2,8 +2,8 @@
 #include "oru/oru_ogl/ogl/linescope.h"
 
 #include "oru/core/exceptions/checks.h"
-#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/objects/release.h"
 #include "oru/oru_ogl/platformgl.h"
 

@@ -2,8 +2,8 @@
 #include "oru/oru_ogl/ogl/texture.h"
 
 #include "oru/core/utility/composetext.h"
-#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
 #include "oru/oru_ogl/ogl/internal/objects/adopting.h"
 #include "oru/oru_ogl/ogl/internal/objects/boundobjectscope.h"

@@ -36,11 +36,13 @@ public:
     /// @{
     static ExtensionManager *FindAtOnce(HGLRC context) {
         Slot const &slot = sIndex_[Hash(context)];
-        return ORU_LIKELY(Holds(slot, context)) ? slot.record.load(std::memory_order_relaxed) : nullptr;
+        return ORU_LIKELY(Holds(slot, context)) ? slot.record.load(std::memory_order_relaxed)
+                                                : nullptr;
     }
     static FunctionTable const *FindTable(HGLRC context) {
         Slot const &slot = sIndex_[Hash(context)];
-        return ORU_LIKELY(Holds(slot, context)) ? slot.table.load(std::memory_order_relaxed) : nullptr;
+        return ORU_LIKELY(Holds(slot, context)) ? slot.table.load(std::memory_order_relaxed)
+                                                : nullptr;
     }
     /// @}
 

@@ -5,8 +5,7 @@
 
 /// `ORU_GL(BindTexture, target, id)` calls glBindTexture through the chain with this source
 /// position.
-#define ORU_GL(Name, ...)                                                                          \
-    ::ORU::OGL::internal::Call##Name(__FILE__, __LINE__, __VA_ARGS__)
+#define ORU_GL(Name, ...) ::ORU::OGL::internal::Call##Name(__FILE__, __LINE__, __VA_ARGS__)
 
 /// `ORU_GL0(Flush)`: the same for the few functions without arguments.
 #define ORU_GL0(Name) ::ORU::OGL::internal::Call##Name(__FILE__, __LINE__)

@@ -1,7 +1,7 @@
 // Finds out by drawing whether an implementation filters floating-point textures linearly.
 #include "oru/core/utility/dropexceptions.h"
-#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/contextservices.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/contextoffscreen_win.h"
 #include "oru/oru_ogl/ogl/contextwrapped_win.h"
 #include "oru/oru_ogl/ogl/framebuffer.h"

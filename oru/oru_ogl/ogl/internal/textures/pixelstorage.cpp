@@ -2,8 +2,8 @@
 #include "oru/oru_ogl/ogl/internal/textures/pixelstorage.h"
 
 #include "oru/core/exceptions/checks.h"
-#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/extensionator/internal/contextprofile.h"
+#include "oru/oru_ogl/extensionator/internal/glcall.h"
 #include "oru/oru_ogl/ogl/internal/textures/texturetables.h"
 #include "oru/oru_ogl/platformgl.h"
 
