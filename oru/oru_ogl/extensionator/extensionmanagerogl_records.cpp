@@ -3,7 +3,6 @@
 #include "oru/oru_ogl/extensionator/extensionmanagerogl.h"
 #include "oru/oru_ogl/extensionator/internal/contextregistry.h"
 #include "oru/oru_ogl/extensionator/internal/contextservices.h"
-#include "oru/oru_ogl/extensionator/internal/currenttable.h"
 #include "oru/oru_ogl/extensionator/openglinterceptor.h"
 #include "oru/oru_ogl/extensionator/wgl/wglcall.h"
 
@@ -65,7 +64,7 @@ ExtensionManager *ExtensionManager::NullExtensionManager() {
 }
 
 ExtensionManager *ExtensionManager::Instance() {
-    return Instance(ORU_CURRENT_CONTEXT());
+    return Instance(ORU_WGL0(GetCurrentContext));
 }
 
 ExtensionManager *ExtensionManager::Instance(HGLRC const &rc) {
@@ -74,7 +73,11 @@ ExtensionManager *ExtensionManager::Instance(HGLRC const &rc) {
 }
 
 FunctionTable const &ExtensionManager::CurrentTable() {
-    return internal::CurrentTable();
+    // The look-up of the other form once more, so that the handle stays in a register.
+    HGLRC const rc = ORU_WGL0(GetCurrentContext);
+    if (FunctionTable const *table = ContextRegistry::FindTable(rc))
+        return *table;
+    return FindOrMakeTable(rc);
 }
 
 FunctionTable const &ExtensionManager::CurrentTable(HGLRC const &rc) {
