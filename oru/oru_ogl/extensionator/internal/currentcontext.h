@@ -4,10 +4,12 @@
 #include "oru/core/exceptions/checks.h"
 #include "oru/oru_ogl/platformgl.h"
 
+#include <atomic>
+
 namespace ORU::OGL::internal {
 
 /// Whether the WGL chain is its last link alone, which only calls the platform.
-extern bool gIsWGLChainPlain;
+extern std::atomic<bool> gIsWGLChainPlain;
 
 /// `wcgmGetCurrentContext` of the chain's first link.
 HGLRC AskChainForCurrentContext(char const *file, unsigned int line);
@@ -15,8 +17,9 @@ HGLRC AskChainForCurrentContext(char const *file, unsigned int line);
 /// The calling thread's current context, or null, asked through the WGL chain. Where nobody listens
 /// the platform is asked at once, which takes half the time.
 inline HGLRC CurrentContext(char const *file, unsigned int line) {
-    return ORU_LIKELY(gIsWGLChainPlain) ? ::wglGetCurrentContext()
-                                        : AskChainForCurrentContext(file, line);
+    return ORU_LIKELY(gIsWGLChainPlain.load(std::memory_order_relaxed))
+               ? ::wglGetCurrentContext()
+               : AskChainForCurrentContext(file, line);
 }
 
 } // namespace ORU::OGL::internal

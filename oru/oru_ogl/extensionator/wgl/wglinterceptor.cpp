@@ -9,7 +9,7 @@ namespace ORU::OGL {
 
 namespace internal {
 
-bool gIsWGLChainPlain = false;
+std::atomic<bool> gIsWGLChainPlain{false};
 
 HGLRC AskChainForCurrentContext(char const *file, unsigned int line) {
     return WGLInterceptor::Instance()->wcgmGetCurrentContext(file, line);
@@ -20,7 +20,8 @@ HGLRC AskChainForCurrentContext(char const *file, unsigned int line) {
 namespace {
 
 void NoteFirst(WGLInterceptor const *link) {
-    internal::gIsWGLChainPlain = dynamic_cast<WGLErrorChecker const *>(link) != nullptr;
+    internal::gIsWGLChainPlain.store(dynamic_cast<WGLErrorChecker const *>(link) != nullptr,
+                                     std::memory_order_relaxed);
 }
 
 } // namespace
