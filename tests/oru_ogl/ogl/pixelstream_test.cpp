@@ -128,8 +128,9 @@ TEST_F(PixelStreamTest, FramesArriveInTheirOrder) {
     framebuffer.unbind();
 }
 
-// Frames of several megabytes, which go in bands: rows of 2-D textures, images of 3-D ones, with
-// gaps between rows and images, of a height that is no multiple of a band's.
+// Frames of several megabytes, which go in bands: rows of 2-D textures, whole blocks of compressed
+// ones, images of 3-D ones, with gaps between rows and images, of a height that is no multiple of a
+// band's.
 TEST_F(PixelStreamTest, LargeFramesArriveWhole) {
     auto const send = [](auto &texture, PixelShape const &shape, auto... place) {
         ORU_GL(BindTexture, texture.target(), texture.objectID());
@@ -151,6 +152,8 @@ TEST_F(PixelStreamTest, LargeFramesArriveWhole) {
     Texture3D images(kRGBA8, 120, 100, 70, false);
     send(images, {kBytes.format, kBytes.type, 117, 99, 61, 121, 101, 8}, 2, 1, 5);
     ORU_GL(BindTexture, GL_TEXTURE_3D, 0u);
+    Texture2D blocks(Texture::INTERNALFORMAT_COMPRESSED_RG_RGTC2, 640, 1100, false);
+    send(blocks, {kBytes.format, kBytes.type, 640, 1100}, 0, 0);
 
     Texture2D flat(kRGBA8, 640, 1100, false);
     Texels const sent = send(flat, {kBytes.format, kBytes.type, 637, 1099, 1, 700, 0, 4}, 3, 1);
