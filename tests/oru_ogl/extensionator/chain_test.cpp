@@ -4,8 +4,6 @@
 
 #include "oru/oru_ogl/extensionator/openglerrorchecker.h"
 #include "oru/oru_ogl/extensionator/opengltokenname.h"
-#include "oru/oru_ogl/ogl/statescope.h"
-#include "oru/oru_ogl/ogl/switchscope.h"
 
 using namespace ORU::OGL;
 
@@ -73,17 +71,4 @@ TEST_F(ChainTest, BalancesBeginAndEnd) {
     EXPECT_NO_THROW(ORU_GL(Enable, 0x1234));
     EXPECT_EQ("GL_INVALID_OPERATION f:3", ErrorOf([] { First().cgmEnd("f", 3); }));
     EXPECT_EQ("Unbalanced glEnd()! f:4", ErrorOf([] { First().cgmEnd("f", 4); }));
-}
-
-// The library makes its calls in place while nobody listens, which may not show: where no query is
-// allowed it makes none, also when a decorator comes and goes there, and its failures have a place.
-TEST_F(ChainTest, LetsTheLibraryCallAsTheHostDoes) {
-    auto const misuse = [] { TemporarySwitchScope const scope(0x1234, true); };
-    EXPECT_EQ(0u, ErrorOf(misuse).find("GL_INVALID_ENUM oru/oru_ogl/ogl/switchscope.cpp:"));
-    ORU_GL(Begin, GL_POINTS);
-    EXPECT_NO_THROW(CurrentState<CullState>());
-    { InterceptorScope<OpenGLForwarder> const decorator; }
-    EXPECT_NO_THROW(CurrentState<CullState>());
-    EXPECT_EQ("GL_INVALID_OPERATION f:1", ErrorOf([] { First().cgmEnd("f", 1); }));
-    EXPECT_EQ(0u, ErrorOf(misuse).find("GL_INVALID_ENUM oru/oru_ogl/ogl/switchscope.cpp:"));
 }
