@@ -4,7 +4,7 @@
 
 #include "oru/oru_ogl/extensionator/internal/currentcontext.h"
 #include "oru/oru_ogl/extensionator/internal/openglerrorcheck.h"
-#include "oru/oru_ogl/extensionator/wgl/wglinterceptor.h"
+#include "oru/oru_ogl/extensionator/wgl/wglforwarder.h"
 #include "oru/oru_ogl/ogl/switchscope.h"
 
 using namespace ORU::OGL;
