@@ -14,7 +14,7 @@ namespace App {
 
 namespace {
 
-constexpr std::size_t kBufferBytes = 64 * 1024;
+constexpr std::size_t kBufferBytes = std::size_t{64} * 1024;
 
 /// Hands the library the bytes of a source.
 struct JpegSource {

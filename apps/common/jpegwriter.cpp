@@ -12,7 +12,7 @@ namespace App {
 
 namespace {
 
-constexpr std::size_t kBufferBytes = 64 * 1024;
+constexpr std::size_t kBufferBytes = std::size_t{64} * 1024;
 
 /// Takes the library's bytes to a sink.
 struct JpegTarget {

@@ -21,7 +21,7 @@ constexpr int kCompressionStrategy = Z_RLE;
 // and makes the sample photos 2 per cent smaller.
 constexpr int kFilter = PNG_FILTER_AVG;
 
-constexpr std::size_t kChunkBytes = 64 * 1024;
+constexpr std::size_t kChunkBytes = std::size_t{64} * 1024;
 
 void OnError(png_structp png, png_const_charp message) {
     static_cast<JumpGuard *>(png_get_error_ptr(png))->leave(message);

@@ -196,7 +196,9 @@ Bytes EncodeTiffTree(TiffTree const &tree, std::uint64_t position, TiffLayout co
     for (TiffEntry const &entry : entries) {
         append(entry.tag, 2);
         append(entry.type, 2);
-        append(entry.value.size() / TiffTypeBytes(entry.type), sizes.position);
+        // Only entries of known types are kept.
+        std::size_t const unit = std::max<std::size_t>(TiffTypeBytes(entry.type), 1);
+        append(entry.value.size() / unit, sizes.position);
         if (ValueBytes(entry, sizes) == 0) {
             directory.insert(directory.end(), entry.value.begin(), entry.value.end());
             directory.insert(directory.end(), sizes.position - entry.value.size(), 0);

@@ -17,7 +17,7 @@ namespace App {
 namespace {
 
 constexpr std::uint64_t kMostOfClassic = 0xF0000000;
-constexpr std::size_t kStripBytes = 256 * 1024;
+constexpr std::size_t kStripBytes = std::size_t{256} * 1024;
 
 /// Differences of neighbours, which compress better: TIFF's predictor 2.
 template<class Value>

@@ -17,13 +17,13 @@ bool IsOneOf(Orientation orientation, std::initializer_list<Orientation> set) {
 }
 
 /// Copies pixels of a fixed size, `from` and `to` being as many pixels apart as their steps say.
-template<std::size_t kBytes>
+template<std::size_t PixelBytes>
 void CopyPixels(unsigned char const *from, std::ptrdiff_t fromStep, unsigned char *to,
                 std::size_t count) {
     for (std::size_t i = 0; i < count; ++i) {
-        std::memcpy(to, from, kBytes);
+        std::memcpy(to, from, PixelBytes);
         from += fromStep;
-        to += kBytes;
+        to += PixelBytes;
     }
 }
 

@@ -158,8 +158,8 @@ TEST_F(PixelViewTest, RefusesWhatDoesNotFit) {
     // Levels that other code made are of the size that OpenGL tells.
     ::glTexImage2D(GL_TEXTURE_2D, 1, GL_RGBA8, 9, 9, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
     EXPECT_FAILURE(
-        "Level 1 has 9 x 9 x 1 texels and is read as a whole: the pixels are 2 x 2 x 1",
-        ReadView(*bound, MutablePixelView(memory.data(), 16, Shape(kBytes, {2, 2, 1})), 1));
+        "Level 1 has 9 x 9 x 1 texels and is read as a whole: the pixels are 9 x 1 x 1",
+        ReadView(*bound, MutablePixelView(memory.data(), 36, Shape(kBytes, {9, 1, 1})), 1));
     EXPECT_EQ((std::vector<GLint>{4, 0}), Get({GL_UNPACK_ALIGNMENT, GL_UNPACK_ROW_LENGTH}))
         << "put back after a failure";
 }
