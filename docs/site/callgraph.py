@@ -19,7 +19,8 @@ WORD = re.compile(r"\b[A-Za-z_]\w*")
 # The bodies of an implementation behind a pointer belong to the class in front of it.
 BEHIND_POINTER = re.compile(r"Impl(Core)?$")
 # The last links call every function and are no answer to "who calls it".
-LEFT_OUT = ("openglerrorchecker", "wglerrorchecker", "opengltracer", "forwarder.h", "wglcall.h", "glcall.h", "clcall.h")
+LEFT_OUT = ("openglerrorchecker", "wglerrorchecker", "opengltracer", "forwarder.h", "wglcall.h", "glcall.h",
+            "librarycalls.h", "clcall.h")
 # What nearly every operation asks by the way, or draws to find something out: the library's own business.
 OWN_BUSINESS = ("objects/supported.h", "objects/release.h", "contexts/filteringprobe.cpp", "extensionmanagerogl_records.cpp",
                 "internal/contextprofile.cpp", "internal/contextbootstrap_win.cpp", "contexts/temporarycontext_win.cpp")
