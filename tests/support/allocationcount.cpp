@@ -1,13 +1,12 @@
 // Counts what a program allocates with the plain operator new.
 #include "tests/support/allocationcount.h"
 
-#include <atomic>
 #include <cstdlib>
 #include <new>
 
 namespace {
 
-std::atomic<long> gCount{0};
+thread_local long gCount = 0;
 
 } // namespace
 

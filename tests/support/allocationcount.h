@@ -3,7 +3,7 @@
 
 namespace oru_test {
 
-/// Allocations since the program started.
+/// Allocations of the calling thread, as the system runs threads of its own.
 long AllocationCount();
 
 } // namespace oru_test

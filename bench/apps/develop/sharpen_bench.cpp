@@ -35,12 +35,12 @@ struct Work {
         return whole;
     }
     static Recipe const &RecipeOf() {
-        static Recipe const recipe = [] {
+        static Recipe const kRecipe = [] {
             Recipe sharpened;
             sharpened.sharpening = {0.8, 1.5};
             return sharpened;
         }();
-        return recipe;
+        return kRecipe;
     }
     static Tile MakeTile() {
         return {PixelRect(0, kReach, kShape.width, kShape.height),
