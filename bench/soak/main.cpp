@@ -24,9 +24,7 @@ bool Passes(char const *name, std::function<Soak::Verdict()> const &soak) {
     return verdict.passed;
 }
 
-} // namespace
-
-int main() {
+int Soaks() {
     double minutes = 1;
     bool quick = false;
     std::vector<std::string> names;
@@ -51,6 +49,7 @@ int main() {
     if (quick)
         minutes = 1.0 / 60;
     std::vector<std::filesystem::path> photos;
+    photos.reserve(names.size());
     for (std::string const &name : names)
         photos.push_back(App::ToPath(name));
     auto const times = [&](double perMinute) {
@@ -61,4 +60,15 @@ int main() {
     passed &=
         Passes("sharing", [&] { return Soak::ShareObjects(std::chrono::minutes(1) * minutes); });
     return passed ? 0 : 1;
+}
+
+} // namespace
+
+int main() {
+    try {
+        return Soaks();
+    } catch (std::exception const &failure) {
+        std::fprintf(stderr, "soak: %s\n", failure.what());
+        return 1;
+    }
 }

@@ -8,12 +8,14 @@
 
 #include <string>
 
+// NOLINTBEGIN(readability-identifier-naming): the drivers look for these names
 // [hybrid]
 extern "C" {
 __declspec(dllexport) DWORD NvOptimusEnablement = 1;
 __declspec(dllexport) int AmdPowerXpressRequestHighPerformance = 1;
 }
 // [hybrid]
+// NOLINTEND(readability-identifier-naming)
 
 namespace {
 
